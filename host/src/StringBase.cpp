@@ -1,0 +1,1 @@
+#include "Port/StringBase.h"
