@@ -14,6 +14,9 @@
     return id;                                                    \
   }
 #define QUILLON_INTERFACE_ID(text) QUILLON_XUID_FROM_TEXT(Iid, text)
+// Declares `Iid()` of an interface whose identifier is listed in Identifiers.h.
+#define QUILLON_INTERFACE_ID_OF(idFunction) \
+  static const ::Port::XUID& Iid() { return idFunction(); }
 
 namespace CitI {
 

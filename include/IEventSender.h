@@ -2,6 +2,7 @@
 #pragma once
 
 #include "CitI.h"
+#include "Identifiers.h"
 
 namespace Prjrep {
 
@@ -9,7 +10,7 @@ class IEventSender;
 
 class IEventReceiver : public CitI::IInterface {
  public:
-  QUILLON_INTERFACE_ID("{78AF817C-5874-438d-83B7-80A9A1956E24}")
+  QUILLON_INTERFACE_ID_OF(Vad::InterfaceIds::IEventReceiver)
   virtual CitI::Result OnEvent(CitI::IInterface* event) = 0;
   virtual CitI::Result OnAttach(IEventSender* sender) = 0;
   virtual CitI::Result OnDetach(IEventSender* sender) = 0;
@@ -17,7 +18,7 @@ class IEventReceiver : public CitI::IInterface {
 
 class IEventSender : public CitI::IInterface {
  public:
-  QUILLON_INTERFACE_ID("{82108F49-98A8-4f53-92A0-2669D1BA407E}")
+  QUILLON_INTERFACE_ID_OF(Vad::InterfaceIds::IEventSender)
   virtual CitI::Result AddReceiver(IEventReceiver* receiver) = 0;
   virtual CitI::Result RemoveReceiver(IEventReceiver* receiver) = 0;
   // Returns whether the event was non-null.

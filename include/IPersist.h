@@ -4,6 +4,7 @@
 #include <cstdint>
 
 #include "CitI.h"
+#include "Identifiers.h"
 #include "Port/StringBase.h"
 
 namespace Prjrep {
@@ -38,7 +39,7 @@ class IArchive : public CitI::IInterface {
 
 class IPersist : public CitI::IInterface {
  public:
-  QUILLON_INTERFACE_ID("{e01498e5-d7f8-41f9-ab72-45c28cefe8e0}")
+  QUILLON_INTERFACE_ID_OF(Vad::InterfaceIds::IPersist)
   virtual CitI::Result Load(IArchive* archive) = 0;
   virtual CitI::Result Save(IArchive* archive) = 0;
   virtual CitI::Result GetClassXUID(Port::XUID* id) = 0;

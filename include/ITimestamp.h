@@ -4,6 +4,7 @@
 #include <cstdint>
 
 #include "CitI.h"
+#include "Identifiers.h"
 #include "IPersist.h"
 #include "Port/StringBase.h"
 
@@ -11,7 +12,7 @@ namespace Prjrep {
 
 class ITimestamp : public CitI::IInterface {
  public:
-  QUILLON_INTERFACE_ID("{40930B37-B328-47ef-8C5B-3694519FCEDD}")
+  QUILLON_INTERFACE_ID_OF(Vad::InterfaceIds::ITimestamp)
   virtual CitI::Result SetToNow() = 0;
   virtual CitI::Result SetTime(std::int64_t seconds, std::int64_t microseconds) = 0;
   virtual CitI::Result GetTime(std::int64_t* seconds, std::int64_t* microseconds) = 0;

@@ -1,2 +1,54 @@
-// The module's only exported function.
-extern "C" __attribute__((visibility("default"))) void InstFactoryEntry() {}
+// The module's entry: registers the class factories with the host's registry.
+#include <array>
+#include <vector>
+
+#include "Identifiers.h"
+#include "Port/InitObjects.h"
+#include "Prjrep/AutoPtr.h"
+#include "RavA/Factory.h"
+#include "TFactory.h"
+
+namespace Vad {
+namespace {
+
+struct ClassEntry {
+  const Port::XUID& (*classId)();
+  CitI::IFactory* (*makeFactory)();
+};
+
+template <class Class, const Port::XUID& (*ClassId)()>
+CitI::IFactory* MakeFactory() {
+  return new Port::TFactory<Class, ClassId>();
+}
+
+// In registration order.
+constexpr std::array<ClassEntry, 0> kClasses{};
+
+// Factories registered by this module, unregistered when the module is unloaded so that the
+// registry never holds code that is gone.
+std::vector<Port::XUID>& RegisteredHere() {
+  static std::vector<Port::XUID> ids;
+  return ids;
+}
+
+struct UnregisterAtUnload {
+  UnregisterAtUnload() { RegisteredHere(); }
+  ~UnregisterAtUnload() {
+    for (const Port::XUID& id : RegisteredHere()) RavA::Factory::UnregisterFactory(id);
+  }
+} unregisterAtUnload;
+
+void RegisterClass(const ClassEntry& entry) {
+  // The registry takes its own reference; the entry's reference ends with this scope.
+  Prjrep::AutoRelease<CitI::IInterface> factory(entry.makeFactory());
+  auto* asFactory = Prjrep::QueryAs<CitI::IFactory>(factory.Get());
+  if (!asFactory) return;
+  if (RavA::Factory::RegisterFactory(entry.classId(), asFactory)) RegisteredHere().push_back(entry.classId());
+}
+
+}  // namespace
+}  // namespace Vad
+
+extern "C" __attribute__((visibility("default"))) void InstFactoryEntry() {
+  for (const Vad::ClassEntry& entry : Vad::kClasses) Vad::RegisterClass(entry);
+}
