@@ -1,0 +1,217 @@
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+#include "Port/SafeCount.h"
+#include "pep/PepExtractor.h"
+#include "pep/Pep_Exception.h"
+#include "rudiva/RudIva.h"
+#include "vci/Hx_Vci.h"
+#include "xdm/Xdm_Exception.h"
+#include "xdm/Xdm_Model.h"
+
+namespace {
+
+template <class Exception, class Call>
+std::string MessageThrownBy(Call call) {
+  try {
+    call();
+  } catch (const Exception& e) {
+    return e.what();
+  }
+  return "(nothing thrown)";
+}
+
+}  // namespace
+
+TEST(NetlistDatabase, NoFileOpensAndOpeningThrowsTheLibraryException) {
+  EXPECT_FALSE(Xdm_Model::CanOpen("design.tbx"));
+  EXPECT_FALSE(Xdm_Model::CanOpen(nullptr));
+
+  Xdm_Model model("SnxParser", "SnxParser", "1.1", false);
+  EXPECT_EQ(
+      MessageThrownBy<Xdm_Exception::Base>([&] { model.Open("design.tbx", Xdm_Model::kOpenForReading); }),
+      Xdm_Model::kUnavailableMessage);
+  EXPECT_EQ(MessageThrownBy<Xdm_Exception::Base>([&] { model.CreateTxn("txn", Xdm_Model::kTxnRead); }),
+            Xdm_Model::kNotOpenMessage);
+  ASSERT_NE(model.GetDesignMgr(), nullptr);
+  EXPECT_EQ(model.GetDesignMgr()->GetDesignItr().Next(), nullptr);
+}
+
+TEST(NetlistDatabase, BlocksKnowTheirParentsAndPropertiesMatchExactNames) {
+  Xdm_Model model("N", "A", "V", false);
+  Xdm_Design* design = model.GetDesignMgr()->AddDesign("chip");
+  design->SetProperty("PART", "k100");
+  design->SetProperty("PART", "k200");
+  Xdm_Block* top = design->AddView("SOURCE")->SetBlock("top");
+  Xdm_Block* first = top->AddBlock("u1");
+  Xdm_Block* second = top->AddBlock("u2");
+  first->AddBlock("gate");
+
+  ASSERT_NE(design->GetPropertyByName("PART"), nullptr);
+  EXPECT_EQ(design->GetPropertyByName("PART")->GetValue(), "k200");
+  EXPECT_EQ(design->GetPropertyByName("part"), nullptr);
+  EXPECT_EQ(design->GetPropertyByName(nullptr), nullptr);
+  EXPECT_EQ(design->GetViewByName("SOURCE")->GetBlock(), top);
+  EXPECT_EQ(design->GetViewByName("RTL"), nullptr);
+
+  EXPECT_EQ(top->GetParent(), nullptr);
+  EXPECT_EQ(top->GetNumBlocks(), 2);
+  Xdm_BlockItr children = top->GetBlockItr();
+  EXPECT_EQ(children.Next(), first);
+  EXPECT_EQ(children.Next(), second);
+  EXPECT_EQ(children.Next(), nullptr);
+  EXPECT_EQ(children.Next(), nullptr);
+  EXPECT_EQ(first->GetParent(), top);
+  EXPECT_EQ(first->GetNumBlocks(), 1);
+  EXPECT_EQ(second->GetNumBlocks(), 0);
+}
+
+TEST(PortExtractor, ParseThrowsAndTheUnitIsNeverFound) {
+  PepExtractor extractor;
+  extractor.addDesignFile("work", "/src/top.vhd", PepExtractor::kVhdl);
+  extractor.addDesignFile("work", "/src/sub.v", PepExtractor::kVerilog);
+
+  EXPECT_EQ(MessageThrownBy<Pep_Exception::Base>([&] { extractor.Parse(PepExtractor::kVerilog); }),
+            PepExtractor::kUnavailableMessage);
+  EXPECT_NE(extractor.findDesignUnit("work", "topmodule", PepExtractor::kSearchByName),
+            PepExtractor::kUnitFound);
+  EXPECT_FALSE(extractor.hasAllGenericsDefined());
+  EXPECT_TRUE(extractor.getPorts().empty());
+}
+
+TEST(PortExtractor, RejectsDesignFilesItCannotRead) {
+  PepExtractor extractor;
+  EXPECT_THROW(extractor.addDesignFile("work", "/src/top.vhd", 2), Pep_Exception::Base);
+  EXPECT_THROW(extractor.addDesignFile("work", nullptr, PepExtractor::kVhdl), Pep_Exception::Base);
+  EXPECT_THROW(extractor.addDesignFile(nullptr, "/src/top.vhd", PepExtractor::kVhdl), Pep_Exception::Base);
+}
+
+TEST(VhdlLibraryLoader, LoadsNothingYetAndReadsNullNodesSafely) {
+  RudIva* loader = RudIva::getPLI();
+  ASSERT_NE(loader, nullptr);
+  EXPECT_EQ(RudIva::getPLI(), loader);
+
+  EXPECT_EQ(
+      loader->loadLibUnit("basecell", "vcomponents", "", RudIva::kPackageObject, RudIva::kSynthesisLibraries),
+      nullptr);
+  EXPECT_EQ(loader->loadLibUnit("timecell", "vcomponents", "", RudIva::kPackageObject,
+                                RudIva::kSimulationLibraries),
+            nullptr);
+  EXPECT_TRUE(loader->getMembers(nullptr, RudIva::kDeclarationMembers).empty());
+  EXPECT_EQ(loader->getName(nullptr), "");
+  EXPECT_EQ(loader->getType(nullptr), RudIva::kNoObject);
+}
+
+TEST(VhdlLibraryLoader, MembersAreListedByKindInOrder) {
+  RudIva_Node package("vcomponents", RudIva::kPackageObject);
+  package.AddMember(RudIva::kDeclarationMembers, "and2", RudIva::kComponentDeclaration);
+  package.AddMember(RudIva::kDeclarationMembers + 1, "not_a_declaration", RudIva::kComponentDeclaration);
+  package.AddMember(RudIva::kDeclarationMembers, "tied_high", RudIva::kComponentDeclaration + 1);
+
+  RudIva* loader = RudIva::getPLI();
+  std::vector<RudIva_Node*> members = loader->getMembers(&package, RudIva::kDeclarationMembers);
+  ASSERT_EQ(members.size(), 2u);
+  EXPECT_EQ(loader->getName(members[0]), "and2");
+  EXPECT_EQ(loader->getType(members[0]), RudIva::kComponentDeclaration);
+  EXPECT_EQ(loader->getName(members[1]), "tied_high");
+  EXPECT_EQ(loader->getType(members[1]), RudIva::kComponentDeclaration + 1);
+}
+
+TEST(VerilogDataCompiler, CompileAnswersNoAccessObject) {
+  std::unique_ptr<Hx_Vci::DataCompiler> compiler = Hx_Vci::create_data_compiler();
+  ASSERT_NE(compiler, nullptr);
+  const char* argv[] = {"commandname", "/src/top.v", "+dora+dataparser+CR172701", "+define+A=1+B"};
+  EXPECT_EQ(compiler->compile(4, argv), nullptr);
+  EXPECT_EQ(compiler->compile(0, nullptr), nullptr);
+}
+
+TEST(VpiHandles, CopiesMovesAndResetsCountReferences) {
+  const long liveBefore = Port::LiveObjectCount();
+  Hx_VpiHandlePtr first = Hx_VpiHandlePtr::Make(vpiModule);
+  EXPECT_EQ(first.UseCount(), 1);
+  EXPECT_EQ(Port::LiveObjectCount(), liveBefore + 1);
+
+  Hx_VpiHandlePtr copy = first;
+  EXPECT_EQ(first.UseCount(), 2);
+  Hx_VpiHandlePtr moved = std::move(copy);
+  EXPECT_FALSE(copy);
+  EXPECT_EQ(copy.UseCount(), 0);
+  EXPECT_EQ(moved.UseCount(), 2);
+  EXPECT_TRUE(moved == first);
+
+  Hx_VpiHandlePtr& alias = moved;
+  moved = alias;
+  EXPECT_EQ(first.UseCount(), 2);
+
+  Hx_VpiHandlePtr rewrapped(first.get());
+  EXPECT_EQ(first.UseCount(), 3);
+  rewrapped.reset();
+  moved.reset();
+  EXPECT_EQ(first.UseCount(), 1);
+
+  first = Hx_VpiHandlePtr::Make(vpiPort);
+  EXPECT_EQ(Port::LiveObjectCount(), liveBefore + 1) << "replacing the last reference frees the object";
+  EXPECT_EQ(first->GetType(), vpiPort);
+  first = nullptr;
+  EXPECT_EQ(Port::LiveObjectCount(), liveBefore);
+}
+
+TEST(VpiHandles, ObjectsLiveWhileAnyHandleOrContainerHoldsThem) {
+  const long liveBefore = Port::LiveObjectCount();
+  Hx_VpiHandlePtr net = Hx_VpiHandlePtr::Make(vpiLowConn);
+  {
+    Hx_VpiHandlePtr port = Hx_VpiHandlePtr::Make(vpiPort);
+    port->SetRelated(vpiLowConn, net);
+    EXPECT_EQ(net.UseCount(), 2);
+    Hx_VpiIteratorPtr iterator = Hx_VpiIteratorPtr::Make(std::vector<Hx_VpiHandlePtr>{port});
+    port.reset();
+    EXPECT_EQ(Port::LiveObjectCount(), liveBefore + 3) << "the iterator keeps the port";
+  }
+  EXPECT_EQ(net.UseCount(), 1);
+  EXPECT_EQ(Port::LiveObjectCount(), liveBefore + 1);
+}
+
+TEST(VpiAccess, AnswersTheQueriesOfAModuleWalk) {
+  Hx_VpiHandlePtr design = Hx_VpiHandlePtr::Make(0);
+  Hx_VpiHandlePtr top = Hx_VpiHandlePtr::Make(vpiModule);
+  top->SetStr(vpiName, "top");
+  top->SetInt(vpiLineNo, 3);
+  Hx_VpiHandlePtr port = Hx_VpiHandlePtr::Make(vpiPort);
+  Hx_VpiHandlePtr net = Hx_VpiHandlePtr::Make(vpiLowConn);
+  net->SetStr(vpiName, "clk");
+  port->SetRelated(vpiLowConn, net);
+  top->AddChild(port);
+  Hx_VpiHandlePtr instance = Hx_VpiHandlePtr::Make(vpiModule);
+  instance->SetStr(vpiName, "u1");
+  instance->SetStr(vpiDefName, "sub");
+  top->AddChild(instance);
+  Hx_VpiHandlePtr sub = Hx_VpiHandlePtr::Make(vpiModule);
+  design->AddChild(top);
+  design->AddChild(sub);
+  Hx_VpiAccess access(design);
+
+  Hx_VpiIteratorPtr modules = access.iterate(vpiModule, nullptr);
+  EXPECT_EQ(access.scan(modules), top);
+  EXPECT_EQ(access.scan(modules), sub);
+  EXPECT_FALSE(access.scan(modules));
+  EXPECT_FALSE(access.scan(modules));
+
+  EXPECT_EQ(access.get(vpiLineNo, top), 3);
+  EXPECT_EQ(access.get(vpiLineNo, sub), vpiUndefined);
+  EXPECT_EQ(access.get_str(vpiName, access.handle(vpiLowConn, access.scan(access.iterate(vpiPort, top)))),
+            "clk");
+  Hx_VpiIteratorPtr instances = access.iterate(vpiModule, top);
+  Hx_VpiHandlePtr found = access.scan(instances);
+  EXPECT_EQ(access.get_str(vpiDefName, found), "sub");
+  EXPECT_EQ(access.get_str(vpiName, found), "u1");
+  EXPECT_FALSE(access.scan(instances));
+
+  EXPECT_FALSE(access.iterate(vpiPort, sub)) << "nothing to iterate gives no iterator";
+  EXPECT_FALSE(access.scan(nullptr));
+  EXPECT_FALSE(access.handle(vpiLowConn, nullptr));
+  EXPECT_EQ(access.get(vpiLineNo, nullptr), vpiUndefined);
+  EXPECT_EQ(access.get_str(vpiName, nullptr), "");
+  EXPECT_FALSE(Hx_VpiAccess(nullptr).iterate(vpiModule, nullptr));
+}
