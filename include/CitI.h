@@ -6,14 +6,19 @@
 
 #include "Port/XUID.h"
 
-// Declares `static const Port::XUID& Iid()` for an interface identified by GUID text. The
+// Declares `name()`, at namespace scope, returning the identifier of a GUID text. The
 // identifier is a function-local static, built on first use and kept until unload.
-#define QUILLON_XUID_FROM_TEXT(name, text)                        \
-  static const ::Port::XUID& name() {                             \
-    static const ::Port::XUID id{std::string_view(text)};         \
-    return id;                                                    \
+#define QUILLON_XUID_FROM_TEXT(name, text)                \
+  inline const ::Port::XUID& name() {                     \
+    static const ::Port::XUID id{std::string_view(text)}; \
+    return id;                                            \
   }
-#define QUILLON_INTERFACE_ID(text) QUILLON_XUID_FROM_TEXT(Iid, text)
+// Declares the static `Iid()` of an interface identified by GUID text.
+#define QUILLON_INTERFACE_ID(text)                        \
+  static const ::Port::XUID& Iid() {                      \
+    static const ::Port::XUID id{std::string_view(text)}; \
+    return id;                                            \
+  }
 // Declares `Iid()` of an interface whose identifier is listed in Identifiers.h.
 #define QUILLON_INTERFACE_ID_OF(idFunction) \
   static const ::Port::XUID& Iid() { return idFunction(); }
