@@ -5,6 +5,7 @@
 #include <cstddef>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 namespace Port {
@@ -36,6 +37,7 @@ class StringBase {
 
   StringBase& operator=(std::string_view text) { text_.assign(text); return *this; }
   StringBase& operator=(const char* text) { text_.assign(text ? text : ""); return *this; }
+  StringBase& operator=(std::string text) { text_ = std::move(text); return *this; }
   StringBase& operator+=(std::string_view text) { text_.append(text); return *this; }
   StringBase& operator+=(char c) { text_.push_back(c); return *this; }
   StringBase& Append(std::string_view text) { text_.append(text); return *this; }
@@ -100,6 +102,7 @@ class StringBase {
   friend bool operator==(const StringBase& a, const StringBase& b) { return a.text_ == b.text_; }
   friend bool operator==(const StringBase& a, std::string_view b) { return a.text_ == b; }
   friend bool operator==(const StringBase& a, const char* b) { return b && a.text_ == b; }
+  friend bool operator==(const StringBase& a, const std::string& b) { return a.text_ == b; }
   friend auto operator<=>(const StringBase& a, const StringBase& b) { return a.text_ <=> b.text_; }
   friend StringBase operator+(StringBase a, std::string_view b) { a += b; return a; }
 

@@ -1,0 +1,133 @@
+#include <gtest/gtest.h>
+#include <stdlib.h>
+
+#include <filesystem>
+#include <fstream>
+#include <optional>
+#include <string>
+
+#include "Port/Env.h"
+
+namespace fs = std::filesystem;
+
+namespace {
+
+// Sets an environment variable for one test and restores the earlier state afterwards.
+class ScopedEnv {
+ public:
+  ScopedEnv(const char* name, const char* value) : name_(name) {
+    if (const char* old = Port_Env::GetEnv(name)) saved_ = old;
+    if (value)
+      Port_Env::SetEnv(name, value);
+    else
+      Port_Env::UnsetEnv(name);
+  }
+  ~ScopedEnv() {
+    if (saved_)
+      Port_Env::SetEnv(name_.c_str(), saved_->c_str());
+    else
+      Port_Env::UnsetEnv(name_.c_str());
+  }
+
+ private:
+  std::string name_;
+  std::optional<std::string> saved_;
+};
+
+// A fresh directory tree: <root>/data/kestrel/arch.vho and <root>/other/cells.vho.
+class DataDir : public testing::Test {
+ protected:
+  void SetUp() override {
+    std::string pattern = (fs::temp_directory_path() / "quillon-env-XXXXXX").string();
+    ASSERT_NE(mkdtemp(pattern.data()), nullptr);
+    root_ = pattern;
+    fs::create_directories(root_ / "data" / "kestrel");
+    fs::create_directories(root_ / "other");
+    std::ofstream(root_ / "data" / "kestrel" / "arch.vho") << "-- cells\n";
+    std::ofstream(root_ / "other" / "cells.vho") << "-- cells\n";
+    dataDir_.emplace("QUILLON_DATA_DIR", (root_ / "data").c_str());
+  }
+  void TearDown() override {
+    dataDir_.reset();
+    std::error_code ignored;
+    fs::remove_all(root_, ignored);
+  }
+
+  std::string Under(const char* relative) const { return (root_ / relative).string(); }
+
+  fs::path root_;
+  std::optional<ScopedEnv> dataDir_;
+};
+
+}  // namespace
+
+TEST(PortEnv, GetEnvSeesSetAndUnset) {
+  ScopedEnv clean("QUILLON_TEST_VARIABLE", nullptr);
+  EXPECT_EQ(Port_Env::GetEnv("QUILLON_TEST_VARIABLE"), nullptr);
+  ASSERT_TRUE(Port_Env::SetEnv("QUILLON_TEST_VARIABLE", "a value"));
+  EXPECT_STREQ(Port_Env::GetEnv("QUILLON_TEST_VARIABLE"), "a value");
+  ASSERT_TRUE(Port_Env::SetEnv("QUILLON_TEST_VARIABLE", ""));
+  EXPECT_STREQ(Port_Env::GetEnv("QUILLON_TEST_VARIABLE"), "");
+  ASSERT_TRUE(Port_Env::UnsetEnv("QUILLON_TEST_VARIABLE"));
+  EXPECT_EQ(Port_Env::GetEnv("QUILLON_TEST_VARIABLE"), nullptr);
+  EXPECT_TRUE(Port_Env::UnsetEnv("QUILLON_TEST_VARIABLE"));
+}
+
+TEST(PortEnv, RejectsBadNames) {
+  EXPECT_EQ(Port_Env::GetEnv(nullptr), nullptr);
+  EXPECT_EQ(Port_Env::GetEnv(""), nullptr);
+  EXPECT_FALSE(Port_Env::SetEnv(nullptr, "x"));
+  EXPECT_FALSE(Port_Env::SetEnv("", "x"));
+  EXPECT_FALSE(Port_Env::SetEnv("A=B", "x"));
+  EXPECT_FALSE(Port_Env::SetEnv("QUILLON_TEST_VARIABLE", nullptr));
+  EXPECT_FALSE(Port_Env::UnsetEnv("A=B"));
+  EXPECT_FALSE(Port_Env::UnsetEnv(nullptr));
+}
+
+TEST(PortEnv, DataDirFallsBackToTheBuiltInFolder) {
+  ScopedEnv unset("QUILLON_DATA_DIR", nullptr);
+  Port::StringBase builtIn = Port_Env::GetDataDir();
+  EXPECT_TRUE(builtIn.EndsWith("/data")) << builtIn.str();
+  ScopedEnv empty("QUILLON_DATA_DIR", "");
+  EXPECT_EQ(Port_Env::GetDataDir(), builtIn);
+}
+
+TEST_F(DataDir, FindsAnExistingDataFile) {
+  Port::StringBase path("stale");
+  EXPECT_TRUE(Port_Env::GetDataFileName("kestrel/arch.vho", 1, &path));
+  EXPECT_EQ(path, Under("data/kestrel/arch.vho"));
+  EXPECT_TRUE(Port_Env::GetDataFileName("../other/cells.vho", 1, &path));
+  EXPECT_EQ(path, Under("other/cells.vho"));
+  EXPECT_TRUE(Port_Env::GetDataFileName("kestrel/arch.vho", 1, nullptr));
+}
+
+TEST_F(DataDir, MissingFileFailsOnlyWhenItMustExist) {
+  Port::StringBase path;
+  EXPECT_FALSE(Port_Env::GetDataFileName("falcon/arch.vho", 1, &path));
+  EXPECT_EQ(path, Under("data/falcon/arch.vho"));
+  EXPECT_FALSE(Port_Env::GetDataFileName("kestrel", 1, &path)) << "a folder is not a data file";
+  EXPECT_TRUE(Port_Env::GetDataFileName("falcon/arch.vho", 0, &path));
+  EXPECT_EQ(path, Under("data/falcon/arch.vho"));
+}
+
+TEST_F(DataDir, ExpandsEnvironmentReferences) {
+  ScopedEnv cells("QUILLON_TEST_CELLS", root_.c_str());
+  ScopedEnv unset("QUILLON_TEST_UNSET", nullptr);
+  Port::StringBase path;
+  EXPECT_TRUE(Port_Env::GetDataFileName("$QUILLON_TEST_CELLS/other/cells.vho", 1, &path));
+  EXPECT_EQ(path, Under("other/cells.vho"));
+  EXPECT_TRUE(Port_Env::GetDataFileName("${QUILLON_TEST_CELLS}/data/kestrel/arch.vho", 1, &path));
+  EXPECT_EQ(path, Under("data/kestrel/arch.vho"));
+  EXPECT_FALSE(Port_Env::GetDataFileName("$QUILLON_TEST_UNSET/other/cells.vho", 1, &path));
+  EXPECT_EQ(path, Under("data/$QUILLON_TEST_UNSET/other/cells.vho"));
+  EXPECT_FALSE(Port_Env::GetDataFileName("${QUILLON_TEST_CELLS/other/cells.vho", 1, &path));
+}
+
+TEST_F(DataDir, EmptyNameGivesNoPath) {
+  Port::StringBase path("stale");
+  EXPECT_FALSE(Port_Env::GetDataFileName("", 0, &path));
+  EXPECT_TRUE(path.IsEmpty());
+  path = "stale";
+  EXPECT_FALSE(Port_Env::GetDataFileName(nullptr, 1, &path));
+  EXPECT_TRUE(path.IsEmpty());
+}
