@@ -1,0 +1,194 @@
+#include "Port/Process.h"
+
+#include <fcntl.h>
+#include <signal.h>
+#include <spawn.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstdio>
+#include <cstring>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "Port/CommandLine.h"
+
+extern char** environ;
+
+namespace Port {
+
+namespace {
+
+// Owns one descriptor.
+class Descriptor {
+ public:
+  Descriptor() = default;
+  explicit Descriptor(int fd) : fd_(fd) {}
+  Descriptor(const Descriptor&) = delete;
+  Descriptor& operator=(const Descriptor&) = delete;
+  ~Descriptor() { Close(); }
+
+  int get() const { return fd_; }
+  void Reset(int fd) {
+    Close();
+    fd_ = fd;
+  }
+  void Close() {
+    if (fd_ >= 0) ::close(fd_);
+    fd_ = -1;
+  }
+
+ private:
+  int fd_ = -1;
+};
+
+struct OutputPipe {
+  Descriptor readEnd;
+  Descriptor writeEnd;
+
+  bool Open() {
+    int ends[2];
+    if (::pipe2(ends, O_CLOEXEC) != 0) return false;
+    readEnd.Reset(ends[0]);
+    writeEnd.Reset(ends[1]);
+    return true;
+  }
+};
+
+// posix_spawn's attribute and file-action objects, released on every path.
+class SpawnSetup {
+ public:
+  SpawnSetup() {
+    attributesReady_ = ::posix_spawnattr_init(&attributes_) == 0;
+    actionsReady_ = ::posix_spawn_file_actions_init(&actions_) == 0;
+  }
+  SpawnSetup(const SpawnSetup&) = delete;
+  SpawnSetup& operator=(const SpawnSetup&) = delete;
+  ~SpawnSetup() {
+    if (attributesReady_) ::posix_spawnattr_destroy(&attributes_);
+    if (actionsReady_) ::posix_spawn_file_actions_destroy(&actions_);
+  }
+
+  // The child starts with default signal handling and an empty signal mask (an ignored SIGPIPE
+  // of the caller would otherwise be inherited), /dev/null as input, `outputFd` (when not
+  // negative) as output and error, and no other descriptor of the caller.
+  int Prepare(int outputFd) {
+    if (!attributesReady_ || !actionsReady_) return ENOMEM;
+    int error = ResetSignals();
+    return error ? error : RedirectDescriptors(outputFd);
+  }
+
+  int Spawn(const std::vector<std::string>& arguments, pid_t* pid) {
+    std::vector<char*> argv;
+    for (const std::string& argument : arguments) argv.push_back(const_cast<char*>(argument.c_str()));
+    argv.push_back(nullptr);
+    return ::posix_spawnp(pid, argv[0], &actions_, &attributes_, argv.data(), environ);
+  }
+
+ private:
+  int ResetSignals() {
+    sigset_t defaults;
+    sigset_t noMask;
+    ::sigemptyset(&defaults);
+    ::sigaddset(&defaults, SIGPIPE);
+    ::sigemptyset(&noMask);
+    int error = ::posix_spawnattr_setsigdefault(&attributes_, &defaults);
+    if (!error) error = ::posix_spawnattr_setsigmask(&attributes_, &noMask);
+    return error ? error
+                 : ::posix_spawnattr_setflags(&attributes_, POSIX_SPAWN_SETSIGDEF | POSIX_SPAWN_SETSIGMASK);
+  }
+
+  int RedirectDescriptors(int outputFd) {
+    int error = ::posix_spawn_file_actions_addopen(&actions_, STDIN_FILENO, "/dev/null", O_RDONLY, 0);
+    for (int target : {STDOUT_FILENO, STDERR_FILENO}) {
+      if (!error && outputFd >= 0) error = ::posix_spawn_file_actions_adddup2(&actions_, outputFd, target);
+    }
+    return error ? error : ::posix_spawn_file_actions_addclosefrom_np(&actions_, STDERR_FILENO + 1);
+  }
+
+  posix_spawnattr_t attributes_;
+  posix_spawn_file_actions_t actions_;
+  bool attributesReady_ = false;
+  bool actionsReady_ = false;
+};
+
+void Tell(ChildOutput* sink, const char* text) {
+  if (sink) sink->output(text);
+}
+
+void TellCannotStart(ChildOutput* sink, const std::string& program, int error) {
+  const char* reason = ::strerrordesc_np(error);  // unlike strerror, safe beside other threads
+  if (!reason) reason = "unknown error";
+  int length = std::snprintf(nullptr, 0, Process::kCannotStart, program.c_str(), reason);
+  if (length < 0) {
+    Tell(sink, "cannot start a program\n");
+    return;
+  }
+  std::string message(static_cast<std::size_t>(length), '\0');
+  std::snprintf(message.data(), message.size() + 1, Process::kCannotStart, program.c_str(), reason);
+  Tell(sink, message.c_str());
+}
+
+// Reads to the end of the child's output; stops forwarding once the sink declines more.
+void Forward(int readFd, ChildOutput* sink) {
+  constexpr std::size_t kChunk = 4096;
+  char chunk[kChunk + 1];
+  bool forwarding = sink != nullptr;
+  for (;;) {
+    ssize_t count = ::read(readFd, chunk, kChunk);
+    if (count < 0 && errno == EINTR) continue;
+    if (count <= 0) return;
+    if (!forwarding) continue;
+    chunk[count] = '\0';
+    forwarding = sink->output(chunk);
+  }
+}
+
+int WaitForExit(pid_t pid) {
+  int status = 0;
+  while (::waitpid(pid, &status, 0) < 0) {
+    if (errno != EINTR) return Process::kNotStarted;
+  }
+  if (WIFEXITED(status)) return WEXITSTATUS(status);
+  if (WIFSIGNALED(status)) return Process::kSignalBase + WTERMSIG(status);
+  return Process::kNotStarted;
+}
+
+int Run(const StringBase& commandLine, bool captureOutput, ChildOutput* sink) {
+  std::vector<std::string> arguments;
+  if (CommandLine::Split(commandLine.view(), &arguments) == 0) {
+    Tell(sink, Process::kEmptyCommand);
+    return Process::kNotStarted;
+  }
+  OutputPipe output;
+  if (captureOutput && !output.Open()) {
+    TellCannotStart(sink, arguments[0], errno);
+    return Process::kNotStarted;
+  }
+  SpawnSetup setup;
+  pid_t pid = 0;
+  int error = setup.Prepare(captureOutput ? output.writeEnd.get() : -1);
+  if (!error) error = setup.Spawn(arguments, &pid);
+  // Our copy of the write end must go, or the read below would never see the end of the output.
+  output.writeEnd.Close();
+  if (error) {
+    TellCannotStart(sink, arguments[0], error);
+    return Process::kNotStarted;
+  }
+  if (captureOutput) Forward(output.readEnd.get(), sink);
+  return WaitForExit(pid);
+}
+
+}  // namespace
+
+int Process::RunNoWindow(const StringBase& commandLine, bool /*wait*/, bool captureOutput,
+                         ChildOutput* sink) {
+  std::unique_ptr<ChildOutput> owned(sink);
+  int status = Run(commandLine, captureOutput, owned.get());
+  if (owned) owned->done();
+  return status;
+}
+
+}  // namespace Port
