@@ -6,6 +6,7 @@
 #include "CitI.h"
 #include "IPersist.h"
 #include "Prjrep/AutoPtr.h"
+#include "Prjrep/ISet.h"
 #include "Prjrep/RefCounting.h"
 #include "Prjrep/TRefCountHelper.h"
 
