@@ -1,0 +1,31 @@
+#include "ModuleLoader.h"
+
+#include <dlfcn.h>
+
+#include <cstdlib>
+
+namespace quillon {
+
+ModuleLoader::~ModuleLoader() {
+  // The module stays loaded until the process ends: objects it made may outlive this loader.
+}
+
+bool ModuleLoader::Load(std::string& error) {
+  const char* fromEnvironment = std::getenv("QUILLON_MODULE");
+  path_ = fromEnvironment && *fromEnvironment ? fromEnvironment : QUILLON_DEFAULT_MODULE;
+  handle_ = dlopen(path_.c_str(), RTLD_NOW | RTLD_LOCAL);
+  if (!handle_) {
+    const char* reason = dlerror();
+    error = "cannot load the module " + path_ + ": " + (reason ? reason : "unknown reason");
+    return false;
+  }
+  auto entry = reinterpret_cast<void (*)()>(dlsym(handle_, "InstFactoryEntry"));
+  if (!entry) {
+    error = "the module " + path_ + " has no InstFactoryEntry";
+    return false;
+  }
+  entry();
+  return true;
+}
+
+}  // namespace quillon

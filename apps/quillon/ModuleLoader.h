@@ -1,0 +1,25 @@
+// Loads the Quillon module the way any host does.
+#pragma once
+
+#include <string>
+
+namespace quillon {
+
+class ModuleLoader {
+ public:
+  ModuleLoader() = default;
+  ~ModuleLoader();
+  ModuleLoader(const ModuleLoader&) = delete;
+  ModuleLoader& operator=(const ModuleLoader&) = delete;
+
+  // Opens the module named by QUILLON_MODULE, else the one built with this program, and calls
+  // its InstFactoryEntry. False with a one-line reason in `error`.
+  bool Load(std::string& error);
+  const std::string& path() const { return path_; }
+
+ private:
+  void* handle_ = nullptr;
+  std::string path_;
+};
+
+}  // namespace quillon
