@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <new>
 
 #include "Prjrep/RefCounting.h"
@@ -27,10 +28,10 @@ class TFactory final : public RavA::TFactory {
   // The new object starts with the caller's one reference and is handed out as its IInterface.
   CitI::IInterface* CreateInstance(const Port::XUID& classId) override {
     if (classId != ClassId()) return nullptr;
-    auto* object = new (std::nothrow) Class();
+    std::unique_ptr<Class> object(new (std::nothrow) Class());
     if (!object) return nullptr;
     CitI::IInterface* answer = object->QueryInterface(CitI::IInterface::Iid());
-    if (!answer) Prjrep::ReleaseOf(object);
+    if (answer) object.release();  // from here on its own count governs it
     return answer;
   }
 
