@@ -7,8 +7,8 @@
 #include <string_view>
 #include <system_error>
 
-#ifndef QUILLON_DATA_DIR
-#define QUILLON_DATA_DIR "data"
+#ifndef QUILLON_INSTALL_ROOT
+#define QUILLON_INSTALL_ROOT "data"
 #endif
 
 namespace {
@@ -77,8 +77,11 @@ bool Port_Env::UnsetEnv(const char* name) {
 
 Port::StringBase Port_Env::GetDataDir() {
   const char* configured = GetEnv("QUILLON_DATA_DIR");
-  return Port::StringBase(configured && *configured ? configured : QUILLON_DATA_DIR);
+  if (configured && *configured) return Port::StringBase(configured);
+  return GetInstallRoot() + "/share";
 }
+
+Port::StringBase Port_Env::GetInstallRoot() { return Port::StringBase(QUILLON_INSTALL_ROOT); }
 
 bool Port_Env::GetDataFileName(const char* name, int flag, Port::StringBase* fullPath) {
   if (fullPath) fullPath->Empty();

@@ -87,7 +87,8 @@ TEST(PortEnv, RejectsBadNames) {
 TEST(PortEnv, DataDirFallsBackToTheBuiltInFolder) {
   ScopedEnv unset("QUILLON_DATA_DIR", nullptr);
   Port::StringBase builtIn = Port_Env::GetDataDir();
-  EXPECT_TRUE(builtIn.EndsWith("/data")) << builtIn.str();
+  EXPECT_TRUE(builtIn.EndsWith("/data/share")) << builtIn.str();
+  EXPECT_TRUE(Port_Env::GetInstallRoot().EndsWith("/data")) << Port_Env::GetInstallRoot().str();
   ScopedEnv empty("QUILLON_DATA_DIR", "");
   EXPECT_EQ(Port_Env::GetDataDir(), builtIn);
 }

@@ -6,7 +6,6 @@
 #include "Port/SafeCount.h"
 #include "pep/PepExtractor.h"
 #include "pep/Pep_Exception.h"
-#include "rudiva/RudIva.h"
 #include "vci/Hx_Vci.h"
 #include "xdm/Xdm_Exception.h"
 #include "xdm/Xdm_Model.h"
@@ -86,37 +85,6 @@ TEST(PortExtractor, RejectsDesignFilesItCannotRead) {
   EXPECT_THROW(extractor.addDesignFile("work", "/src/top.vhd", 2), Pep_Exception::Base);
   EXPECT_THROW(extractor.addDesignFile("work", nullptr, PepExtractor::kVhdl), Pep_Exception::Base);
   EXPECT_THROW(extractor.addDesignFile(nullptr, "/src/top.vhd", PepExtractor::kVhdl), Pep_Exception::Base);
-}
-
-TEST(VhdlLibraryLoader, LoadsNothingYetAndReadsNullNodesSafely) {
-  RudIva* loader = RudIva::getPLI();
-  ASSERT_NE(loader, nullptr);
-  EXPECT_EQ(RudIva::getPLI(), loader);
-
-  EXPECT_EQ(
-      loader->loadLibUnit("basecell", "vcomponents", "", RudIva::kPackageObject, RudIva::kSynthesisLibraries),
-      nullptr);
-  EXPECT_EQ(loader->loadLibUnit("timecell", "vcomponents", "", RudIva::kPackageObject,
-                                RudIva::kSimulationLibraries),
-            nullptr);
-  EXPECT_TRUE(loader->getMembers(nullptr, RudIva::kDeclarationMembers).empty());
-  EXPECT_EQ(loader->getName(nullptr), "");
-  EXPECT_EQ(loader->getType(nullptr), RudIva::kNoObject);
-}
-
-TEST(VhdlLibraryLoader, MembersAreListedByKindInOrder) {
-  RudIva_Node package("vcomponents", RudIva::kPackageObject);
-  package.AddMember(RudIva::kDeclarationMembers, "and2", RudIva::kComponentDeclaration);
-  package.AddMember(RudIva::kDeclarationMembers + 1, "not_a_declaration", RudIva::kComponentDeclaration);
-  package.AddMember(RudIva::kDeclarationMembers, "tied_high", RudIva::kComponentDeclaration + 1);
-
-  RudIva* loader = RudIva::getPLI();
-  std::vector<RudIva_Node*> members = loader->getMembers(&package, RudIva::kDeclarationMembers);
-  ASSERT_EQ(members.size(), 2u);
-  EXPECT_EQ(loader->getName(members[0]), "and2");
-  EXPECT_EQ(loader->getType(members[0]), RudIva::kComponentDeclaration);
-  EXPECT_EQ(loader->getName(members[1]), "tied_high");
-  EXPECT_EQ(loader->getType(members[1]), RudIva::kComponentDeclaration + 1);
 }
 
 TEST(VerilogDataCompiler, CompileAnswersNoAccessObject) {

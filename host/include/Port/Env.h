@@ -23,8 +23,14 @@ class Port_Env {
   // exists at that path. A null or empty name gives false and an empty path.
   static bool GetDataFileName(const char* name, int flag, Port::StringBase* fullPath);
 
-  // The data folder that GetDataFileName uses.
+  // The data folder that GetDataFileName uses: QUILLON_DATA_DIR when set, else the "share" folder
+  // of the installation root. Cell libraries lie beside it, so names such as
+  // "../<family>/vhdl/syn/..." reach them.
   static Port::StringBase GetDataDir();
+
+  // The installation root holding the cell libraries (what CORVANE names): the built-in data
+  // folder of this build.
+  static Port::StringBase GetInstallRoot();
 
   // The platform's directory name: "lin64" on 64-bit Linux, "lin" on 32-bit Linux.
   static const char* GetPlatformPath();
