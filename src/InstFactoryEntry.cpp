@@ -1,8 +1,17 @@
 // The module's entry: registers the class factories with the host's registry.
-#include <array>
 #include <vector>
 
+#include "Arch.h"
+#include "CompInst.h"
+#include "EntityDecl.h"
+#include "EntityInst.h"
 #include "Identifiers.h"
+#include "Library.h"
+#include "PackageBody.h"
+#include "PackageDecl.h"
+#include "Use.h"
+#include "generic.h"
+#include "module.h"
 #include "Port/InitObjects.h"
 #include "Prjrep/AutoPtr.h"
 #include "RavA/Factory.h"
@@ -21,8 +30,25 @@ CitI::IFactory* MakeFactory() {
   return new Port::TFactory<Class, ClassId>();
 }
 
-// In registration order.
-constexpr std::array<ClassEntry, 0> kClasses{};
+template <class Class, const Port::XUID& (*ClassId)()>
+constexpr ClassEntry EntryOf() {
+  return ClassEntry{ClassId, &MakeFactory<Class, ClassId>};
+}
+
+// In registration order: CHdlProject, CHdlFile, CParserConfigHolder and CParserConfigBase come
+// before the records; CNetListNode and CElaborator before generic; CLibRefs last.
+constexpr ClassEntry kClasses[] = {
+    EntryOf<Arch, &ClassIds::Arch>(),
+    EntryOf<CompInst, &ClassIds::CompInst>(),
+    EntryOf<EntityDecl, &ClassIds::EntityDecl>(),
+    EntryOf<EntityInst, &ClassIds::EntityInst>(),
+    EntryOf<Library, &ClassIds::Library>(),
+    EntryOf<PackageBody, &ClassIds::PackageBody>(),
+    EntryOf<PackageDecl, &ClassIds::PackageDecl>(),
+    EntryOf<Use, &ClassIds::Use>(),
+    EntryOf<module, &ClassIds::module>(),
+    EntryOf<generic, &ClassIds::generic>(),
+};
 
 // Factories registered by this module, unregistered when the module is unloaded so that the
 // registry never holds code that is gone.

@@ -1,0 +1,26 @@
+#include "CVhdlDU.h"
+
+#include "Port/InitObjects.h"
+
+namespace Vad {
+
+CVhdlDU::CVhdlDU(std::string_view name, DbObject* parent) : CHdlElement(name, parent) {}
+
+CitI::Result CVhdlDU::Load(Prjrep::IArchive* archive) {
+  CitI::Result result = CHdlElement::Load(archive);
+  if (result != CitI::kOk) return result;
+  std::int32_t count = 0;
+  result = archive->ReadInt(&count);
+  for (std::int32_t i = 0; result == CitI::kOk && i < count; ++i) {
+    CitI::IInterface* ignoredUse = nullptr;
+    result = archive->ReadObjectRef(&ignoredUse);
+  }
+  return result;
+}
+
+CitI::Result CVhdlDU::Save(Prjrep::IArchive* archive) {
+  CitI::Result result = CHdlElement::Save(archive);
+  return result == CitI::kOk ? archive->WriteInt(0) : result;
+}
+
+}  // namespace Vad

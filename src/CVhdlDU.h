@@ -1,0 +1,31 @@
+// The base of the VHDL design units that carry a context clause (entity, architecture, package,
+// package body): the use clauses in effect for the unit.
+#pragma once
+
+#include <string_view>
+#include <vector>
+
+#include "CHdlElement.h"
+
+namespace Vad {
+
+class CVhdlDU : public CHdlElement {
+ public:
+  CVhdlDU(std::string_view name, DbObject* parent);
+  // Empties the use list only: the use records are owned elsewhere.
+  ~CVhdlDU() override = default;
+
+  // Replaces `out` with the use records in source order (no references).
+  void GetUses(std::vector<DbObject*>& out) const { out = uses_; }
+  void SetUses(const std::vector<DbObject*>& uses) { uses_ = uses; }
+
+  // The use list is never persisted: Save writes a count of 0, and Load reads the references it
+  // finds and drops them, leaving the list empty.
+  CitI::Result Load(Prjrep::IArchive* archive) override;
+  CitI::Result Save(Prjrep::IArchive* archive) override;
+
+ private:
+  std::vector<DbObject*> uses_;  // owned by the parse results, no references
+};
+
+}  // namespace Vad

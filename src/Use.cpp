@@ -1,0 +1,50 @@
+#include "Use.h"
+
+#include <vector>
+
+#include "Port/InitObjects.h"
+
+namespace Vad {
+
+Use::Use() : CHdlElement({}, nullptr) {}
+
+Use::Use(std::string_view name, DbObject* parent) : CHdlElement(name, parent) {
+  SetType(DbType::kUse);
+  std::vector<Port::StringBase> pieces;
+  Port::StringBase(name).Split(pieces, ".", false, "\"", "\"");
+  Port::StringBase* parts[] = {&library_, &package_, &item_};
+  for (std::size_t i = 0; i < pieces.size() && i < std::size(parts); ++i) *parts[i] = std::move(pieces[i]);
+}
+
+CitI::IInterface* Use::QueryInterface(const Port::XUID& id) {
+  if (id == Prjrep::IPersist::Iid()) return &persist_;
+  return CHdlElement::QueryInterface(id);
+}
+
+CitI::Result Use::Load(Prjrep::IArchive* archive) {
+  CitI::Result result = CHdlElement::Load(archive);
+  return result == CitI::kOk ? PersistParts(archive, false) : result;
+}
+
+CitI::Result Use::Save(Prjrep::IArchive* archive) {
+  CitI::Result result = CHdlElement::Save(archive);
+  return result == CitI::kOk ? PersistParts(archive, true) : result;
+}
+
+CitI::Result Use::PersistParts(Prjrep::IArchive* archive, bool saving) {
+  for (Port::StringBase* part : {&library_, &package_, &item_}) PersistStrings(archive, saving, {part});
+  return CitI::kOk;
+}
+
+void Use::SetParts(std::string_view library, std::string_view package, std::string_view item) {
+  library_ = library;
+  package_ = package;
+  item_ = item;
+}
+
+void Use::ComposeStoreKey(Port::StringBase& key) {
+  key.Format("|%s|%s|%s|%s|%s|", "", GetTypeName(), library_.c_str(), package_.c_str(), item_.c_str());
+  SetKey(key.view());
+}
+
+}  // namespace Vad
