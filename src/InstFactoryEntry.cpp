@@ -2,6 +2,10 @@
 #include <vector>
 
 #include "Arch.h"
+#include "CHdlFile.h"
+#include "CHdlProject.h"
+#include "CParserConfigBase.h"
+#include "CParserConfigHolder.h"
 #include "CompInst.h"
 #include "EntityDecl.h"
 #include "EntityInst.h"
@@ -38,6 +42,10 @@ constexpr ClassEntry EntryOf() {
 // In registration order: CHdlProject, CHdlFile, CParserConfigHolder and CParserConfigBase come
 // before the records; CNetListNode and CElaborator before generic; CLibRefs last.
 constexpr ClassEntry kClasses[] = {
+    EntryOf<CHdlProject, &ClassIds::CHdlProject>(),
+    EntryOf<CHdlFile, &ClassIds::CHdlFile>(),
+    EntryOf<CParserConfigHolder, &ClassIds::CParserConfigHolder>(),
+    EntryOf<CParserConfigBase, &ClassIds::CParserConfigBase>(),
     EntryOf<Arch, &ClassIds::Arch>(),
     EntryOf<CompInst, &ClassIds::CompInst>(),
     EntryOf<EntityDecl, &ClassIds::EntityDecl>(),

@@ -8,6 +8,7 @@
 #include "Host/FileComponent.h"
 #include "Host/FileNameHelper.h"
 #include "Host/FileType.h"
+#include "Host/PropertyInstance.h"
 #include "Host/SourceLibrary.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/TRefCountHelper.h"
@@ -53,6 +54,7 @@ const HostClass kHostClasses[] = {
     {ClassIds::SourceLibrary, []() -> CitI::IInterface* { return SourceLibrary::Create().Detach(); }},
     {ClassIds::DataStore, []() -> CitI::IInterface* { return DataStore::Shared().Detach(); }},
     {ClassIds::EventReceiver, []() -> CitI::IInterface* { return EventReceiver::Create().Detach(); }},
+    {ClassIds::PropertyInstance, []() -> CitI::IInterface* { return PropertyInstance::Create().Detach(); }},
 };
 
 bool RegisterFactory(const HostClass& hostClass) {

@@ -1,0 +1,167 @@
+// The parse-result holder of one source file: runs the file's parse, receives what the parser
+// finds through the recording operations, and remembers what the parse depended on.
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <map>
+#include <vector>
+
+#include "CitI.h"
+#include "HdlSets.h"
+#include "Port/StringBase.h"
+#include "Prjrep/AutoPtr.h"
+#include "Prjrep/TRefCountHelper.h"
+
+namespace Vad {
+
+class CHdlFile;
+class CLibRefs;
+class CHdlElement;
+class DbObject;
+class Library;
+class Use;
+class EntityDecl;
+class Arch;
+class module;
+class PackageBody;
+class PackageDecl;
+class generic;
+class CompInst;
+class EntityInst;
+class IHdlFileIterator;
+
+class CParserConfigHolder final : public CitI::IInterface {
+ public:
+  // The seven type slots: the identifier that records of each kind get, and whether the kind is
+  // recorded at all.
+  enum TypeSlot : int {
+    kEntitySlot = 0,
+    kArchitectureSlot = 1,
+    kModuleSlot = 2,
+    kPackageBodySlot = 3,
+    kPackageDeclSlot = 4,
+    kInstanceLabelSlot = 5,
+    kTestVectorSlot = 6,
+  };
+  static constexpr int kTypeSlotCount = 7;
+  using TypeIds = std::array<Port::XUID, kTypeSlotCount>;
+  // A slot holding this identifier disables its kind.
+  static const Port::XUID& NoneTypeId();
+  static const TypeIds& DefaultTypeIds();
+
+  CParserConfigHolder();
+  ~CParserConfigHolder() override;
+
+  CitI::IInterface* QueryInterface(const Port::XUID& id) override;
+  virtual const char* TypeName() const { return "CParserConfigHolder"; }
+
+  // The owning source file (no reference held).
+  void SetFile(CHdlFile* file) { file_ = file; }
+  CHdlFile* GetFile() const { return file_; }
+
+  // File and configuration queries. Each empties `out` first and leaves it empty when no file
+  // is set.
+  void GetFullPath(Port::StringBase& out) const;
+  void GetBaseName(Port::StringBase& out) const;
+  void GetExtension(Port::StringBase& out) const;
+  void GetFileName(Port::StringBase& out) const;
+  void GetPluginName(Port::StringBase& out) const;
+  void GetLibraryName(Port::StringBase& out) const;  // "work" without a source library
+  // 1 with the property's text (empty when absent); 0 with empty text without a configuration.
+  CitI::Result GetProperty(const Port::StringBase& name, Port::StringBase& value) const;
+  CLibRefs* GetLibRefs() const;
+  void SetTypeIds(const TypeIds& ids);
+  const Port::XUID& GetTypeId(TypeSlot slot) const { return typeIds_[slot]; }
+  // Full paths of the project's files with this file's plug-in name, as the last parse began.
+  const std::vector<Port::StringBase>& GetSiblingPaths() const { return siblingPaths_; }
+  // The device part named by the last EDIF netlist parsed.
+  void SetPart(const Port::StringBase& part) { part_ = part; }
+  const Port::StringBase& GetPart() const { return part_; }
+
+  // Recording. Lines are 1-based; `type` is the identifier the new record keeps. Each returns
+  // the record (owned by the holder; no reference for the caller) or null when nothing was
+  // recorded.
+  Library* AddLibrary(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
+  Use* AddUse(const Port::StringBase& dottedName, std::uint32_t line, const Port::XUID& type, bool inBody);
+  EntityDecl* AddEntityDecl(const Port::StringBase& name, std::uint32_t line, bool portFlag,
+                            const Port::XUID& type);
+  Arch* AddArch(const Port::StringBase& archName, const Port::StringBase& entityName, std::uint32_t line,
+                const Port::XUID& type);
+  module* AddModule(const Port::StringBase& name, std::uint32_t line, bool flag, const Port::XUID& type,
+                    const Port::StringBase& partition);
+  PackageBody* AddPackageBody(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
+  PackageDecl* AddPackageDecl(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
+  generic* AddGeneric(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
+  CompInst* AddCompInst(const Port::StringBase& label, const Port::StringBase& component, std::uint32_t line,
+                        const Port::XUID& type, const Port::StringBase& partition);
+  EntityInst* AddEntityInst(const Port::StringBase& label, const Port::StringBase& entity,
+                            const Port::StringBase& architecture, std::uint32_t line, const Port::XUID& type);
+  void AddInstanceLabel(const Port::StringBase& label);
+  void AddTestVector(const Port::StringBase& name);
+  void AddConfigBinding(const Port::StringBase& instances, const Port::StringBase& component,
+                        const Port::StringBase& entity, const Port::StringBase& architecture);
+  void EnterGenerate();
+  void LeaveGenerate(bool reset);
+  void SetEntityPortFlag(bool flag);
+
+  // Enters `record` under `key`, or under "key-Instance(n)" with the first free n when the key
+  // is taken. The holder takes a reference. False (nothing stored) for an empty key.
+  bool RegisterUnit(const Port::StringBase& key, CHdlElement* record);
+  // The record entered under exactly `key` during the running parse, or null.
+  CHdlElement* FindRecorded(const Port::StringBase& key) const;
+
+  // The parse run: BeginParse, the file's parser, EndParse. `projectFiles` may be null.
+  CitI::Result Parse(IHdlFileIterator* projectFiles);
+  void BeginParse(IHdlFileIterator* projectFiles);
+  void EndParse();
+  // Whether the last parse is still valid for this project file list (null: none).
+  CitI::Result IsUpToDate(bool* valid, IHdlFileIterator* projectFiles) const;
+
+  // The units of the last parse, in key order.
+  IHdlDesignUnitSet* GetUnitSet() const { return unitSet_.Get(); }
+  std::uint32_t GetUnitCount() const;
+  // The result text (no operation of this system fills it).
+  const Port::StringBase& GetResultText() const { return resultText_; }
+
+ private:
+  // What every unit-level recording resets: generate depth, component bindings, instance state.
+  void ResetForNextUnit();
+  void ResetInstanceState();
+  // Clears every plain pointer into the recorded units.
+  void ForgetParseState();
+  bool IsEnabled(TypeSlot slot) const { return typeEnabled_[slot]; }
+  // Gives the new `record` (whose creation reference this call ends) its file, line and type and
+  // registers it under `key`. False, with the record gone unless a parent keeps it, when refused.
+  bool Enter(CHdlElement* record, const Port::StringBase& key, std::uint32_t line, const Port::XUID& type);
+  // The new unit's use list becomes the pending context, which is emptied.
+  void TakePendingContext(CHdlElement* unit);
+  void AttachUse(Use* use, bool inBody);
+  bool IsLibraryCell(const Port::StringBase& component) const;
+  // Paths of the listed files whose plug-in name is this file's, ignoring case, in list order.
+  std::vector<Port::StringBase> SiblingPathsOf(IHdlFileIterator* projectFiles) const;
+  // Re-registers an instance under its first label.
+  void RenameInstance(CHdlElement* instance, const Port::StringBase& label);
+  void CopyInstance(const Port::StringBase& label);
+
+  CHdlFile* file_ = nullptr;
+  Port::StringBase signature_;
+  Port::StringBase library_;
+  std::vector<Port::StringBase> siblingPaths_;
+  Port::StringBase part_;
+  std::map<Port::StringBase, Port::StringBase> componentBindings_;
+  TypeIds typeIds_;
+  std::array<bool, kTypeSlotCount> typeEnabled_{};
+  std::int32_t generateDepth_ = 0;
+  std::map<Port::StringBase, Prjrep::AutoPtr<CitI::IInterface>> recordedUnits_;
+  Prjrep::AutoPtr<IHdlDesignUnitSet> unitSet_;
+  std::vector<Use*> pendingContext_;
+  CHdlElement* currentUnit_ = nullptr;
+  CompInst* lastCompInst_ = nullptr;
+  EntityInst* lastEntityInst_ = nullptr;
+  std::uint32_t labelCount_ = 0;
+  Port::StringBase resultText_;
+  Prjrep::TRefCountHelper<> refs_{this};
+};
+
+}  // namespace Vad

@@ -1,0 +1,9 @@
+#include "EdifParser.h"
+
+#include "Port/InitObjects.h"
+
+namespace Vad {
+
+int EdifParser::Parse(CParserConfigHolder& holder) { return RecordNothing("EdifParser", holder); }
+
+}  // namespace Vad

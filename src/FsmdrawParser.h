@@ -1,0 +1,14 @@
+// A state-diagram source, which stands for one module named after the file's base name.
+#pragma once
+
+#include "Parser.h"
+
+namespace Vad {
+
+class FsmdrawParser : public Parser {
+ public:
+  // Records the module; 1.
+  int Parse(CParserConfigHolder& holder) override;
+};
+
+}  // namespace Vad

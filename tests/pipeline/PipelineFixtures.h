@@ -1,0 +1,111 @@
+// Shared set-up of the parse-pipeline tests: host components and module factories in the
+// registry, and projects and files made the way a host makes them.
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "CHdlFile.h"
+#include "CParserConfigHolder.h"
+#include "DbObject.h"
+#include "HdlSets.h"
+#include "Host/FileType.h"
+#include "Host/HostComponents.h"
+#include "Host/PropertyInstance.h"
+#include "Host/SourceLibrary.h"
+#include "ICompAdmin.h"
+#include "IHdlDesignUnit.h"
+#include "IHdlFile.h"
+#include "IHdlProject.h"
+#include "ISourceLibraryMember.h"
+#include "Identifiers.h"
+#include "Prjrep/AutoPtr.h"
+#include "Prjrep/Casts.h"
+
+extern "C" void InstFactoryEntry();
+
+namespace pipeline_test {
+
+class PipelineTest : public testing::Test {
+ protected:
+  static void SetUpTestSuite() {
+    ASSERT_TRUE(Host::RegisterHostComponents());
+    InstFactoryEntry();
+  }
+
+  static Prjrep::AutoPtr<Vad::IHdlProject> NewProject() {
+    auto project = Prjrep::CreateInstanceAs<Vad::IHdlProject>(Vad::ClassIds::CHdlProject());
+    EXPECT_TRUE(project);
+    return project;
+  }
+
+  // A file as a host makes one: created by the project, initialised with a file type, given its
+  // path and plug-in name; not yet added.
+  static Prjrep::AutoPtr<Vad::IHdlFile> NewFile(Vad::IHdlProject* project, std::string_view path,
+                                                std::string_view plugin) {
+    Prjrep::AutoPtr<Vad::IHdlFile> file;
+    EXPECT_EQ(project->createNewFile(file.Out()), CitI::kOk);
+    auto fileType = Host::FileType::Create("HDL", {"vhd", "v"});
+    auto* admin = Prjrep::QueryAs<Vad::ICompAdmin>(file.Get());
+    EXPECT_EQ(admin->InitializeAfterCreate(nullptr, fileType.Get()), CitI::kOk);
+    EXPECT_EQ(file->setFilePath(Port::StringBase(path), Port::StringBase()), CitI::kOk);
+    file->setPluginName(Port::StringBase(plugin));
+    return file;
+  }
+
+  static Prjrep::AutoPtr<Vad::IHdlFile> AddNewFile(Vad::IHdlProject* project, std::string_view path,
+                                                   std::string_view plugin) {
+    auto file = NewFile(project, path, plugin);
+    EXPECT_EQ(FileSetOf(project)->Add(file.Get()), CitI::kOk);
+    return file;
+  }
+
+  static Vad::IHdlFileSet* FileSetOf(Vad::IHdlProject* project) {
+    return Prjrep::QueryAs<Vad::IHdlFileSet>(project);
+  }
+  static Vad::CHdlFile* FileObject(Vad::IHdlFile* file) { return Prjrep::ObjectCast<Vad::CHdlFile>(file); }
+  static Vad::CParserConfigHolder* HolderOf(Vad::IHdlFile* file) { return FileObject(file)->GetHolder(); }
+
+  static void SetProperty(Vad::IHdlProject* project, std::string_view name, std::string_view value) {
+    Prjrep::AutoRelease<Vad::IHdlParserConfig> config;
+    ASSERT_EQ(project->getParserConfig(config.Out()), CitI::kOk);
+    auto* properties = Prjrep::QueryAs<Vad::IPropertyInstanceSet>(config.Get());
+    ASSERT_NE(properties, nullptr);
+    ASSERT_EQ(properties->Add(Host::PropertyInstance::Create(name, value).Get()), CitI::kOk);
+  }
+
+  static void SetLibrary(Vad::IHdlFile* file, std::string_view name) {
+    auto* member = Prjrep::QueryAs<Vad::ISourceLibraryMember>(file);
+    ASSERT_NE(member, nullptr);
+    ASSERT_EQ(member->setSourceLibrary(Host::SourceLibrary::Create(name).Get()), CitI::kOk);
+  }
+
+  static std::string StoreKeyOf(CitI::IInterface* unit) {
+    auto* object = Prjrep::ImplementationCast<Vad::DbObject>(unit);
+    return object ? object->GetKey().str() : "<foreign>";
+  }
+
+  static std::vector<CitI::IInterface*> UnitsOf(Vad::IHdlDesignUnitSet* set) {
+    std::vector<CitI::IInterface*> units;
+    Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> it;
+    if (!set || set->CreateIterator(it.Out()) != CitI::kOk) return units;
+    for (; !it->IsDone(); it->Next()) units.push_back(it->Current());
+    return units;
+  }
+
+  static std::vector<std::string> StoreKeys(Vad::IHdlDesignUnitSet* set) {
+    std::vector<std::string> keys;
+    for (CitI::IInterface* unit : UnitsOf(set)) keys.push_back(StoreKeyOf(unit));
+    return keys;
+  }
+
+  // The units of a file's last parse.
+  static std::vector<std::string> FileUnitKeys(Vad::IHdlFile* file) {
+    return StoreKeys(FileObject(file)->GetUnitSet());
+  }
+};
+
+}  // namespace pipeline_test
