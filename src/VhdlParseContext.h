@@ -1,0 +1,102 @@
+// What the VHDL scanner and grammar share during one parse of one file: the holder they record
+// into, the line counter, the scanner's flags and the texts of the grammar's symbols.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <initializer_list>
+#include <string>
+#include <string_view>
+
+#include "Port/StringBase.h"
+
+namespace Port {
+class Stream;
+}
+
+namespace Vad {
+
+class CParserConfigHolder;
+
+// The semantic value of every grammar symbol: a text in the parse's VhdlTextStore.
+struct VhdlText {
+  std::uint32_t offset;
+  std::uint32_t length;
+};
+
+// The texts that grammar symbols carry. A symbol's value is an offset into one growing buffer,
+// so shifting a token copies eight bytes rather than a string.
+class VhdlTextStore {
+ public:
+  static constexpr std::size_t kMaxLength = 1999;
+
+  // Stores the text, cut to kMaxLength characters.
+  VhdlText Add(std::string_view text) {
+    text = text.substr(0, kMaxLength);
+    VhdlText stored{static_cast<std::uint32_t>(buffer_.size()), static_cast<std::uint32_t>(text.size())};
+    buffer_.append(text);
+    return stored;
+  }
+
+  // Stores the concatenation of the pieces, cut to kMaxLength characters. Pieces may be texts of
+  // this store.
+  VhdlText Join(std::initializer_list<std::string_view> pieces) {
+    std::string joined;
+    for (std::string_view piece : pieces) joined.append(piece);
+    return Add(joined);
+  }
+
+  std::string_view View(VhdlText text) const {
+    return std::string_view(buffer_).substr(text.offset, text.length);
+  }
+  Port::StringBase String(VhdlText text) const { return Port::StringBase(View(text)); }
+
+  // Drops every text but `kept`, which moves to the start of the store. The grammar calls this
+  // once a construct is complete, when no other text is still referenced.
+  void KeepOnly(VhdlText& kept) {
+    if (kept.length != 0 && kept.offset + kept.length <= buffer_.size()) {
+      buffer_.erase(0, kept.offset);
+      buffer_.resize(kept.length);
+    } else {
+      buffer_.clear();
+      kept.length = 0;
+    }
+    kept.offset = 0;
+  }
+  void Clear() { buffer_.clear(); }
+
+  std::size_t Size() const { return buffer_.size(); }
+
+ private:
+  std::string buffer_;
+};
+
+struct VhdlParseContext {
+  VhdlParseContext(CParserConfigHolder& recorder, Port::Stream& source, bool synthesisTarget)
+      : holder(recorder), input(source), synthesis(synthesisTarget) {}
+
+  CParserConfigHolder& holder;
+  Port::Stream& input;
+  // Counts every newline the scanner consumes, in any state.
+  std::uint32_t line = 1;
+  // Translate pragmas are honoured only when the parse target is synthesis.
+  bool synthesis = false;
+  // True after "begin", false after an architecture header: a use clause in a body waits for the
+  // next unit.
+  bool begin = true;
+  // True while nothing but blanks followed "--" on this comment (or, in switched-off code, since
+  // the line began).
+  bool pragma = false;
+  std::uint32_t commentCount = 0;
+  // True while the grammar waits for the first token of a construct (see
+  // VhdlTokenBeginsConstruct).
+  bool betweenConstructs = false;
+  VhdlTextStore texts;
+};
+
+// Runs the scanner and grammar over the context's input until the end of input, a parse-stack
+// overflow, or the scanner running out of memory. False only in that last case. What was
+// recorded before stays recorded.
+bool RunVhdlGrammar(VhdlParseContext& context);
+
+}  // namespace Vad

@@ -1,0 +1,270 @@
+/* Partial VHDL grammar: recognises only the constructs that place design units in a project
+   (library and use clauses, unit headers, instantiations, configuration specifications,
+   generate statements, port clauses) and lets error recovery swallow everything else. */
+
+%code top {
+/* The stack never grows: an overflow ends the parse of the file. */
+#define YYINITDEPTH 200
+#define YYMAXDEPTH 200
+}
+
+%code requires {
+#include "VhdlParseContext.h"
+}
+
+%code provides {
+namespace Vad {
+// Whether `token` can begin a construct when the grammar stands between two constructs. Any
+// other token there is a syntax error whose recovery only discards it, so the scanner may drop
+// it at once; the answer comes from the grammar's own tables.
+bool VhdlTokenBeginsConstruct(int token);
+}
+}
+
+%code {
+#include <array>
+
+#include "CParserConfigHolder.h"
+#include "VhdlParser.h"
+
+int vhdl_lex(VHDL_STYPE* value, void* scanner);
+
+/* Syntax errors are expected (most of VHDL is not in this grammar) and never reported. */
+static void vhdl_error(void*, Vad::VhdlParseContext&, const char*) {}
+
+namespace {
+
+std::string_view TextOf(const Vad::VhdlParseContext& ctx, Vad::VhdlText text) { return ctx.texts.View(text); }
+Port::StringBase StringOf(const Vad::VhdlParseContext& ctx, Vad::VhdlText text) { return ctx.texts.String(text); }
+
+Vad::VhdlText Join(Vad::VhdlParseContext& ctx, std::initializer_list<std::string_view> pieces) {
+  return ctx.texts.Join(pieces);
+}
+
+void RecordArchitecture(Vad::VhdlParseContext& ctx, Vad::VhdlText archName, Vad::VhdlText entityName) {
+  ctx.begin = false;
+  ctx.holder.AddArch(StringOf(ctx, archName), StringOf(ctx, entityName), ctx.line, Vad::VhdlTypeIds::Architecture());
+}
+
+void RecordEntity(Vad::VhdlParseContext& ctx, Vad::VhdlText name, bool portFlag) {
+  ctx.holder.AddEntityDecl(StringOf(ctx, name), ctx.line, portFlag, Vad::VhdlTypeIds::Entity());
+}
+
+void RecordComponentInstance(Vad::VhdlParseContext& ctx, Vad::VhdlText label, Vad::VhdlText component) {
+  ctx.holder.AddCompInst(StringOf(ctx, label), StringOf(ctx, component), ctx.line, Vad::VhdlTypeIds::Instance(),
+                         Port::StringBase());
+}
+
+void RecordEntityInstance(Vad::VhdlParseContext& ctx, Vad::VhdlText label, Vad::VhdlText entity,
+                          std::string_view architecture) {
+  ctx.holder.AddEntityInst(StringOf(ctx, label), StringOf(ctx, entity), Port::StringBase(architecture), ctx.line,
+                           Vad::VhdlTypeIds::Instance());
+}
+
+void RecordConfigBinding(Vad::VhdlParseContext& ctx, Vad::VhdlText instances, Vad::VhdlText component,
+                         Vad::VhdlText entity, std::string_view architecture) {
+  ctx.holder.AddConfigBinding(StringOf(ctx, instances), StringOf(ctx, component), StringOf(ctx, entity),
+                              Port::StringBase(architecture));
+}
+
+}  // namespace
+}
+
+%define api.pure full
+%define api.prefix {vhdl_}
+%define api.token.prefix {VHDL_}
+%define api.value.type {Vad::VhdlText}
+%define parse.error simple
+%expect 0
+%lex-param {void* scanner}
+%parse-param {void* scanner} {Vad::VhdlParseContext& ctx}
+
+%token ARCHITECTURE IS ENTITY COMPONENT GENERIC MAP PORT TOK_BEGIN TOK_END ATTRIBUTE OF PACKAGE BODY
+%token USE CONFIGURATION FOR ALL GENERATE LIBRARY IDENT STRING
+%token COLON PERIOD BSLASH OPEN_PAREN CLOSE_PAREN COMMA SEMICOLON EQUAL SLASH
+/* Known to the grammar but never produced by the scanner. */
+%token INT_NUM INTEGER OTHERS CR
+
+%start input
+
+%%
+
+input
+  : %empty { ctx.betweenConstructs = true; }
+  | input all
+      {
+        /* Nothing of the completed construct is referenced any more; only a lookahead token
+           already read keeps its text. Without one, the next token is read between constructs. */
+        if (yychar == VHDL_VHDL_EMPTY) {
+          ctx.texts.Clear();
+          ctx.betweenConstructs = true;
+        } else {
+          ctx.texts.KeepOnly(yylval);
+        }
+      }
+  ;
+
+all
+  : library
+  | arch
+  | instantiation
+  | entity
+  | package
+  | idents
+  | attribute
+  | use
+  | configuration
+  | generate
+  | compdecl
+  | port
+  | begin
+  | error { yyclearin; yyerrok; }
+  ;
+
+begin
+  : TOK_BEGIN { ctx.begin = true; }
+  ;
+
+use
+  : USE ext_ident SEMICOLON
+      { ctx.holder.AddUse(StringOf(ctx, $2), ctx.line, Vad::VhdlTypeIds::Use(), ctx.begin); }
+  ;
+
+package
+  : PACKAGE ident IS
+      { ctx.holder.AddPackageDecl(StringOf(ctx, $2), ctx.line, Vad::VhdlTypeIds::Package()); }
+  | PACKAGE BODY ident IS
+      { ctx.holder.AddPackageBody(StringOf(ctx, $3), ctx.line, Vad::VhdlTypeIds::PackageBody()); }
+  ;
+
+library
+  : LIBRARY lib_ident SEMICOLON
+  | LIBRARY error { yyclearin; yyerrok; }
+  ;
+
+/* Right recursive: a list is recorded from its last name back to its first. */
+lib_ident
+  : ident
+      { ctx.holder.AddLibrary(StringOf(ctx, $1), ctx.line, Vad::VhdlTypeIds::Library()); }
+  | ident COMMA lib_ident
+      { ctx.holder.AddLibrary(StringOf(ctx, $1), ctx.line, Vad::VhdlTypeIds::Library()); }
+  ;
+
+arch
+  : ARCHITECTURE ident OF ident IS { RecordArchitecture(ctx, $2, $4); }
+  | ARCHITECTURE ident OF ident { RecordArchitecture(ctx, $2, $4); }
+  | ARCHITECTURE error { yyclearin; yyerrok; }
+  ;
+
+/* A port list is not part of the grammar: CLOSE_PAREN follows only for an empty list, so an
+   entity whose header reaches its port clause normally keeps the port flag true. */
+entity
+  : ENTITY ident IS PORT OPEN_PAREN { RecordEntity(ctx, $2, true); } CLOSE_PAREN
+      { ctx.holder.SetEntityPortFlag(false); }
+  | ENTITY ident IS GENERIC { RecordEntity(ctx, $2, false); }
+  | ENTITY ident IS TOK_END { RecordEntity(ctx, $2, false); }
+  | ENTITY ident IS TOK_BEGIN { RecordEntity(ctx, $2, false); }
+  | ENTITY ident IS idents { RecordEntity(ctx, $2, false); }
+  | ENTITY error { yyclearin; yyerrok; }
+  ;
+
+instantiation
+  : ident COLON ext_ident map { RecordComponentInstance(ctx, $1, $3); }
+  | ident COLON COMPONENT ext_ident map { RecordComponentInstance(ctx, $1, $4); }
+  | ident COLON ENTITY ext_ident map { RecordEntityInstance(ctx, $1, $4, {}); }
+  | ident COLON ENTITY ext_ident OPEN_PAREN ext_ident CLOSE_PAREN map
+      { RecordEntityInstance(ctx, $1, $4, TextOf(ctx, $6)); }
+  | ident COLON error { yyclearin; yyerrok; }
+  ;
+
+port
+  : PORT OPEN_PAREN { ctx.holder.SetEntityPortFlag(true); } CLOSE_PAREN
+      { ctx.holder.SetEntityPortFlag(false); }
+  ;
+
+idents
+  : ident
+  ;
+
+map
+  : PORT MAP
+  | GENERIC MAP
+  ;
+
+ext_ident
+  : ident PERIOD ident PERIOD ALL { $$ = Join(ctx, {TextOf(ctx, $1), ".", TextOf(ctx, $3), ".all"}); }
+  | ident PERIOD ident PERIOD ident
+      { $$ = Join(ctx, {TextOf(ctx, $1), ".", TextOf(ctx, $3), ".", TextOf(ctx, $5)}); }
+  | ident PERIOD ident { $$ = Join(ctx, {TextOf(ctx, $1), ".", TextOf(ctx, $3)}); }
+  | ident PERIOD ALL { $$ = Join(ctx, {TextOf(ctx, $1), ".all"}); }
+  | ident
+  ;
+
+ident
+  : IDENT
+  | BSLASH IDENT BSLASH { $$ = $2; }
+  ;
+
+compdecl
+  : COMPONENT ident
+  ;
+
+attribute
+  : ATTRIBUTE ident OF ident COLON COMPONENT IS STRING
+  ;
+
+configuration
+  : CONFIGURATION ident OF ident IS
+  | FOR ident
+  | FOR inst_list COLON ident USE CONFIGURATION ext_ident
+  | FOR inst_list COLON ident USE ENTITY ext_ident { RecordConfigBinding(ctx, $2, $4, $7, {}); }
+  | FOR inst_list COLON ident USE ENTITY ext_ident OPEN_PAREN ident CLOSE_PAREN
+      { RecordConfigBinding(ctx, $2, $4, $7, TextOf(ctx, $9)); }
+  ;
+
+inst_list
+  : ident
+  | ident COMMA inst_list { $$ = Join(ctx, {TextOf(ctx, $1), ",", TextOf(ctx, $3)}); }
+  | OTHERS { $$ = ctx.texts.Add("OTHERS"); }
+  | ALL { $$ = ctx.texts.Add("ALL"); }
+  ;
+
+generate
+  : GENERATE { ctx.holder.EnterGenerate(); }
+  | TOK_END GENERATE { ctx.holder.LeaveGenerate(false); }
+  ;
+
+%%
+
+namespace Vad {
+namespace {
+
+// The state the parser is in between two constructs: the one reached from the start state
+// after reducing `input`.
+int StateBetweenConstructs() {
+  const int lhs = YYSYMBOL_input - YYNTOKENS;
+  const int index = yypgoto[lhs];
+  return (0 <= index && index <= YYLAST && yycheck[index] == 0) ? yytable[index] : yydefgoto[lhs];
+}
+
+std::array<bool, YYNTOKENS> TokensBeginningConstructs() {
+  std::array<bool, YYNTOKENS> begins{};
+  const int state = StateBetweenConstructs();
+  const int base = yypact[state];
+  for (int symbol = 0; symbol < YYNTOKENS; ++symbol) {
+    const int index = base + symbol;
+    // A default reduction or an entry for the token means the token is not simply discarded.
+    begins[symbol] = yypact_value_is_default(base) || yydefact[state] != 0 ||
+                     (0 <= index && index <= YYLAST && yycheck[index] == symbol);
+  }
+  return begins;
+}
+
+}  // namespace
+
+bool VhdlTokenBeginsConstruct(int token) {
+  static const std::array<bool, YYNTOKENS> begins = TokensBeginningConstructs();
+  return begins[YYTRANSLATE(token)];
+}
+
+}  // namespace Vad
