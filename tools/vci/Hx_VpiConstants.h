@@ -8,5 +8,6 @@ inline constexpr int vpiName = 2;
 inline constexpr int vpiLineNo = 6;
 inline constexpr int vpiDefName = 9;
 inline constexpr int vpiModule = 32;
+inline constexpr int vpiNet = 36;
 inline constexpr int vpiPort = 44;
 inline constexpr int vpiLowConn = 80;

@@ -1,0 +1,274 @@
+#include "vci/VerilogFileCache.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "vci/VerilogSourceFile.h"
+
+namespace Hx_Vci {
+
+VerilogFileCache::VerilogFileCache(Limits limits) : limits_(limits) {
+  if (limits_.watchFiles) {
+    watch_ = std::make_unique<VerilogFileWatch>();
+    if (!watch_->Available()) {
+      watch_.reset();
+    }
+  }
+}
+
+VerilogFileCache::~VerilogFileCache() = default;
+
+std::shared_ptr<VerilogFileCache> VerilogFileCache::Shared() {
+  static const std::shared_ptr<VerilogFileCache> shared = std::make_shared<VerilogFileCache>();
+  return shared;
+}
+
+std::shared_ptr<const VerilogFileResult> VerilogFileCache::CompileChain(
+    const std::vector<std::string_view>& files, std::shared_ptr<const VerilogMacroTable> macros,
+    std::uint64_t includeDirs, const CompileFile& compile) {
+  std::unique_lock<std::mutex> lock(mutex_);
+  TakeWatchedChanges();
+  const std::uint64_t generationAtStart = generation_;
+  const Context start{macros->fingerprint(), includeDirs};
+  Context context = start;
+  std::shared_ptr<const VerilogFileResult> last;
+  const std::size_t matched = MatchRememberedChain(files, start);
+  if (matched > 0) {
+    last = chain_.links[matched - 1].result;
+    macros = last->macrosAfter;
+    context.macros = macros->fingerprint();
+  }
+  const std::uint64_t chainVersion = chain_.version;
+  std::vector<ChainLink> links;
+  bool remember = watch_ != nullptr;
+  for (std::size_t i = matched; i < files.size(); ++i) {
+    Found found = Find(files[i], context, i + 1 == files.size());
+    if (!found.result) {
+      const std::string path(files[i]);
+      lock.unlock();
+      VerilogFileCompiler::Compiled compiled = compile(i, path, macros);
+      lock.lock();
+      found = Store(files[i], compiled.stamp, context, std::move(compiled.result));
+    }
+    last = std::move(found.result);
+    macros = last->macrosAfter;
+    context.macros = macros->fingerprint();
+    remember = remember && found.trusted;
+    if (remember) {
+      links.push_back({std::string(files[i]), last});
+    }
+  }
+  // Another compile may have remembered a chain of its own meanwhile; ours then extends nothing.
+  const bool sameChain = matched == 0 || chain_.version == chainVersion;
+  if (remember && generation_ == generationAtStart && sameChain) {
+    RememberChain(start, matched, std::move(links));
+  } else if (!chain_.valid || chain_.generation != generation_) {
+    chain_.valid = false;
+    chain_.links.clear();  // lets go of results that may be dropped from the cache
+  }
+  return last;
+}
+
+std::uint64_t VerilogFileCache::ScannedFileCount() const {
+  std::lock_guard<std::mutex> lock(mutex_);
+  return scanned_;
+}
+
+void VerilogFileCache::TakeWatchedChanges() {
+  if (!watch_) {
+    return;
+  }
+  const VerilogFileWatch::Changes changes = watch_->Collect();
+  if (changes.all) {
+    for (auto& [path, node] : nodes_) node.trusted = false;
+    ++generation_;
+  }
+  for (const std::string& path : changes.paths) {
+    auto found = nodes_.find(path);
+    if (found != nodes_.end()) {
+      found->second.trusted = false;
+      ++generation_;
+    }
+  }
+}
+
+// How many files at the start of `files` the remembered chain covers; never the last file, whose
+// stamp a compile always reads.
+std::size_t VerilogFileCache::MatchRememberedChain(const std::vector<std::string_view>& files,
+                                                   const Context& start) const {
+  if (!chain_.valid || chain_.generation != generation_ || !(chain_.start == start)) {
+    return 0;
+  }
+  const std::size_t limit = std::min(chain_.links.size(), files.size() - 1);
+  std::size_t matched = 0;
+  while (matched < limit && chain_.links[matched].path == files[matched]) ++matched;
+  return matched;
+}
+
+void VerilogFileCache::RememberChain(const Context& start, std::size_t matched,
+                                     std::vector<ChainLink> links) {
+  if (matched == 0) {
+    chain_.links.clear();
+  } else {
+    chain_.links.erase(chain_.links.begin() + static_cast<std::ptrdiff_t>(matched), chain_.links.end());
+  }
+  for (ChainLink& link : links) chain_.links.push_back(std::move(link));
+  chain_.start = start;
+  chain_.generation = generation_;
+  chain_.valid = true;
+  ++chain_.version;
+}
+
+VerilogFileCache::Found VerilogFileCache::Find(std::string_view path, const Context& context,
+                                               bool checkDisk) {
+  auto found = nodes_.find(path);
+  if (found == nodes_.end()) {
+    return {};
+  }
+  Node& node = found->second;
+  if (checkDisk || !node.trusted) {
+    Refresh(path, node);
+  }
+  auto matches = [&](const Entry& entry) { return entry.context == context; };
+  auto entry = std::find_if(node.entries.begin(), node.entries.end(), matches);
+  if (entry == node.entries.end()) {
+    return {};
+  }
+  // Checking the includes may read stamps and drop entries, this one too: hold on to the result.
+  std::shared_ptr<const VerilogFileResult> result = entry->result;
+  bool trusted = node.trusted;
+  if (!DependenciesCurrent(*result, &trusted)) {
+    std::erase_if(node.entries, [&](const Entry& stale) {
+      if (!matches(stale)) return false;
+      bytes_ -= stale.bytes;
+      return true;
+    });
+    ++generation_;
+    return {};
+  }
+  entry = std::find_if(node.entries.begin(), node.entries.end(), matches);
+  if (entry == node.entries.end()) {
+    return {};
+  }
+  entry->lastUse = ++tick_;
+  return {std::move(result), trusted};
+}
+
+// Keeps the result of a scan that read the file with `stamp`, unless the file or an include
+// changed meanwhile. Reading the stamp again now that the file is watched closes the window
+// between the read and the start of the watch, in which a change would go unnoticed.
+VerilogFileCache::Found VerilogFileCache::Store(std::string_view path, const VerilogFileStamp& stamp,
+                                                const Context& context,
+                                                std::shared_ptr<const VerilogFileResult> result) {
+  ++scanned_;
+  Node& node = NodeFor(path);
+  Refresh(path, node);
+  bool trusted = node.trusted;
+  if (node.stamp != stamp || !DependenciesCurrent(*result, &trusted)) {
+    return {std::move(result), false};
+  }
+  Entry fresh{context, result, ++tick_, result->ApproximateBytes()};
+  const std::size_t before = node.entries.size();
+  std::erase_if(node.entries, [&](const Entry& entry) {
+    if (!(entry.context == context)) return false;
+    bytes_ -= entry.bytes;
+    return true;
+  });
+  if (node.entries.size() >= limits_.contextsPerFile && !node.entries.empty()) {
+    auto oldest = std::min_element(node.entries.begin(), node.entries.end(),
+                                   [](const Entry& a, const Entry& b) { return a.lastUse < b.lastUse; });
+    bytes_ -= oldest->bytes;
+    node.entries.erase(oldest);
+  }
+  if (node.entries.size() < before) {
+    ++generation_;
+  }
+  bytes_ += fresh.bytes;
+  node.entries.push_back(std::move(fresh));
+  EvictIfNeeded();
+  return {std::move(result), trusted};
+}
+
+VerilogFileCache::Node& VerilogFileCache::NodeFor(std::string_view path) {
+  auto found = nodes_.find(path);
+  return found != nodes_.end() ? found->second : nodes_.try_emplace(std::string(path)).first->second;
+}
+
+// The watch starts before the stamp is read, so a change after the read is always reported.
+void VerilogFileCache::Refresh(std::string_view path, Node& node) {
+  const std::string text(path);
+  const bool watched = watch_ && watch_->Watch(text);
+  bool isLink = false;
+  const VerilogFileStamp now = VerilogSourceFile::Stat(text, &isLink);
+  if (now != node.stamp) {
+    if (node.known) {
+      ++generation_;
+    }
+    DropEntries(node);
+    node.stamp = now;
+  }
+  node.known = true;
+  // A symbolic link's target may change where no watch sees it.
+  node.trusted = watched && !isLink;
+}
+
+bool VerilogFileCache::DependenciesCurrent(const VerilogFileResult& result, bool* trusted) {
+  for (const VerilogDependency& dependency : result.dependencies) {
+    Node& node = NodeFor(dependency.path);
+    if (!node.trusted) {
+      Refresh(dependency.path, node);
+    }
+    *trusted = *trusted && node.trusted;
+    if (node.stamp != dependency.stamp) {
+      return false;
+    }
+  }
+  return true;
+}
+
+void VerilogFileCache::DropEntries(Node& node) {
+  if (node.entries.empty()) {
+    return;
+  }
+  for (const Entry& entry : node.entries) bytes_ -= entry.bytes;
+  node.entries.clear();
+  ++generation_;
+}
+
+// Drops the least recently used quarter of the results, more if memory is still short, and then
+// every file without results; a pass frees enough that passes stay rare.
+void VerilogFileCache::EvictIfNeeded() {
+  if (bytes_ <= limits_.maxBytes && nodes_.size() <= limits_.maxFiles) {
+    return;
+  }
+  ++generation_;
+  std::vector<std::pair<std::uint64_t, std::size_t>> uses;  // last use, bytes
+  for (const auto& [path, node] : nodes_) {
+    for (const Entry& entry : node.entries) uses.emplace_back(entry.lastUse, entry.bytes);
+  }
+  std::sort(uses.begin(), uses.end());
+  std::size_t freed = 0;
+  std::size_t dropped = 0;
+  std::uint64_t newestDropped = 0;
+  for (const auto& [lastUse, bytes] : uses) {
+    if (dropped >= uses.size() / 4 && bytes_ - freed <= limits_.maxBytes / 4 * 3) break;
+    freed += bytes;
+    ++dropped;
+    newestDropped = lastUse;
+  }
+  for (auto it = nodes_.begin(); it != nodes_.end();) {
+    std::erase_if(it->second.entries, [&](const Entry& entry) {
+      if (entry.lastUse > newestDropped) return false;
+      bytes_ -= entry.bytes;
+      return true;
+    });
+    if (!it->second.entries.empty()) {
+      ++it;
+      continue;
+    }
+    if (watch_) watch_->Forget(it->first);
+    it = nodes_.erase(it);
+  }
+}
+
+}  // namespace Hx_Vci
