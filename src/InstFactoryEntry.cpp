@@ -4,6 +4,7 @@
 #include "Arch.h"
 #include "CHdlFile.h"
 #include "CHdlProject.h"
+#include "CLibRefs.h"
 #include "CParserConfigBase.h"
 #include "CParserConfigHolder.h"
 #include "CompInst.h"
@@ -56,6 +57,7 @@ constexpr ClassEntry kClasses[] = {
     EntryOf<Use, &ClassIds::Use>(),
     EntryOf<module, &ClassIds::module>(),
     EntryOf<generic, &ClassIds::generic>(),
+    EntryOf<CLibRefs, &ClassIds::CLibRefs>(),
 };
 
 // Factories registered by this module, unregistered when the module is unloaded so that the

@@ -1,0 +1,174 @@
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <string>
+#include <vector>
+
+#include "CBasecellLoader.h"
+#include "CBlockcellLoader.h"
+#include "CTimecellLoader.h"
+#include "LibRefTestSupport.h"
+#include "Port/MsgCollector.h"
+#include "Port/MsgDispatcher.h"
+#include "ScopedTempDir.h"
+
+using namespace libref_test;
+
+namespace {
+
+std::vector<std::string> Entries(const std::string& dir) {
+  std::vector<std::string> names;
+  for (const auto& entry : std::filesystem::directory_iterator(dir)) names.push_back(entry.path().filename());
+  return names;
+}
+
+std::string Platform() { return Port_Env::GetPlatformPath(); }
+
+TEST(MappingFiles, TheTimingLibraryIsReadThroughTheSimulationMappingUnderTheFixedFolder) {
+  Vad::CTimecellLoader loader;
+  EXPECT_STREQ(loader.MappingFileName(), "corvanesim.ini");
+  const std::string expected =
+      "std=$CORVANE/vhdl/hdp/nt/std\n"
+      "ieee=$CORVANE/vhdl/hdp/nt/ieee\n"
+      "synopsys=$CORVANE/vhdl/hdp/nt/synopsys\n"
+      "timecell=$CORVANE/vhdl/hdp/nt/timecell\n"
+      "basecell=$CORVANE/vhdl/hdp/nt/basecell\n"
+      "qlprim=$CORVANE/vhdl/hdp/nt/qlprim\n"
+      "qlmacro=$CORVANE/vhdl/hdp/nt/qlmacro\n"
+      "qlio=$CORVANE/vhdl/hdp/nt/qlio\n"
+      "corvanecorelib=$CORVANE/vhdl/hdp/nt/corvanecorelib\n"
+      "timecell_ver=$CORVANE/verilog/hdp/nt/timecell_ver\n"
+      "basecell_ver=$CORVANE/verilog/hdp/nt/basecell_ver\n"
+      "qlprim_ver=$CORVANE/verilog/hdp/nt/qlprim_ver\n"
+      "qlmacro_ver=$CORVANE/verilog/hdp/nt/qlmacro_ver\n"
+      "qlio_ver=$CORVANE/verilog/hdp/nt/qlio_ver\n";
+  EXPECT_EQ(loader.MappingText(), expected);
+
+  ScopedCellLibraries corvane;
+  loader.SetFamily("lumen");  // lumen ships a timing test file but no library of its own
+  EXPECT_EQ(loader.LibraryDirectory(), "$CORVANE/vhdl/hdp/" + Platform() + "/timecell");
+  EXPECT_EQ(loader.MappingText(), expected);
+}
+
+TEST(MappingFiles, TheUnifiedLibraryMapsTheFamilysDirectoryOrTheDefaultOne) {
+  Vad::CBasecellLoader loader;
+  EXPECT_STREQ(loader.MappingFileName(), "chdp.ini");
+  const std::string furtherLibraries =
+      "qlprim=$CORVANE/vhdl/syn/qlprim\n"
+      "qlmacro=$CORVANE/vhdl/syn/qlmacro\n"
+      "qlio=$CORVANE/vhdl/syn/qlio\n"
+      "basecell_ver=$CORVANE/verilog/syn/basecell_ver\n"
+      "blockcell_ver=$CORVANE/verilog/syn/blockcell_ver\n";
+  const std::string head = "std=$CORVANE/vhdl/syn/std\nieee=$CORVANE/vhdl/syn/ieee\n";
+  EXPECT_EQ(loader.MappingText(), head + "basecell=$CORVANE/vhdl/syn/basecell\n" + furtherLibraries);
+
+  loader.SetFamily("lumen");
+  EXPECT_EQ(loader.LibraryDirectory(), "$CORVANE/lumen/vhdl/syn/basecell");
+  EXPECT_EQ(loader.MappingText(), head + "basecell=$CORVANE/lumen/vhdl/syn/basecell\n" + furtherLibraries);
+
+  loader.SetFamily("kestrel");  // no test file: back to the default directory
+  EXPECT_EQ(loader.LibraryDirectory(), "");
+  EXPECT_EQ(loader.MappingText(), head + "basecell=$CORVANE/vhdl/syn/basecell\n" + furtherLibraries);
+}
+
+TEST(MappingFiles, TheMacroLibraryMapsItsDirectoryAndTheDefaultUnifiedLibrary) {
+  Vad::CBlockcellLoader loader;
+  EXPECT_STREQ(loader.MappingFileName(), "chdp.ini");
+  const std::string tail =
+      "basecell=$CORVANE/vhdl/syn/basecell\n"
+      "qlprim=$CORVANE/vhdl/syn/qlprim\n"
+      "qlmacro=$CORVANE/vhdl/syn/qlmacro\n"
+      "qlio=$CORVANE/vhdl/syn/qlio\n"
+      "basecell_ver=$CORVANE/verilog/syn/basecell_ver\n"
+      "blockcell_ver=$CORVANE/verilog/syn/blockcell_ver\n";
+  const std::string head = "std=$CORVANE/vhdl/syn/std\nieee=$CORVANE/vhdl/syn/ieee\n";
+  EXPECT_EQ(loader.MappingText(), head + "blockcell=$CORVANE/vhdl/syn/blockcell\n" + tail);
+  loader.SetFamily("lumen");
+  EXPECT_EQ(loader.MappingText(), head + "blockcell=$CORVANE/lumen/vhdl/syn/blockcell\n" + tail);
+}
+
+// Each test loads from a working directory of its own, with temporary directories made in a
+// folder of its own, so that anything left behind shows.
+class Loading : public testing::Test {
+ protected:
+  ScopedTempDir work_;
+  ScopedTempDir temporaries_;
+  ScopedWorkingDirectory inWork_{work_.path()};
+  ScopedEnv tmpdir_{"TMPDIR", temporaries_.path().c_str()};
+};
+
+TEST_F(Loading, ALoadRestoresTheWorkingDirectoryAndRemovesItsTemporaryDirectory) {
+  ScopedCellLibraries corvane;
+  Vad::CLibRefs references;  // three loads
+  Vad::CBasecellLoader loader;
+  EXPECT_TRUE(loader.Load(&references));
+  EXPECT_TRUE(IsCell(references, "basecell", "QL_DFF"));
+  EXPECT_EQ(CurrentDirectory(), work_.path());
+  EXPECT_TRUE(Entries(work_.path()).empty());  // the mapping file was written elsewhere
+  EXPECT_TRUE(Entries(temporaries_.path()).empty());
+}
+
+TEST_F(Loading, ALibraryThatCannotBeLoadedContributesNothingAndLeavesNothingBehind) {
+  Vad::CLibRefs references;
+  references.AddLibraryUnit("blockcell", "vcomponents", "STALE_CELL");
+  {
+    ScopedEnv noCellLibraries("CORVANE", nullptr);
+    Vad::CBlockcellLoader loader;
+    EXPECT_FALSE(loader.Load(&references));
+  }
+  {
+    ScopedTempDir empty;
+    ScopedEnv emptyCellLibraries("CORVANE", empty.path().c_str());
+    Vad::CTimecellLoader loader;
+    EXPECT_FALSE(loader.Load(&references));
+  }
+  EXPECT_FALSE(IsCell(references, "blockcell", "STALE_CELL"));
+  EXPECT_FALSE(IsCell(references, "timecell", "QT_FF"));
+  EXPECT_EQ(CurrentDirectory(), work_.path());
+  EXPECT_TRUE(Entries(work_.path()).empty());
+  EXPECT_TRUE(Entries(temporaries_.path()).empty());
+  EXPECT_FALSE(Vad::CBasecellLoader().Load(nullptr));
+}
+
+TEST_F(Loading, AFamilyChangeReloadsALoaderThatHasReferencesAlready) {
+  ScopedCellLibraries corvane;
+  Vad::CLibRefs references;
+  references.RemoveLibrary("blockcell");
+  Vad::CBlockcellLoader loader;
+  loader.SetFamily("lumen");  // no references yet: nothing is loaded
+  EXPECT_FALSE(IsCell(references, "blockcell", "LM_RAM9K"));
+  EXPECT_TRUE(loader.Load(&references));
+  EXPECT_TRUE(IsCell(references, "blockcell", "LM_RAM9K"));
+  loader.SetFamily("kestrel");
+  EXPECT_TRUE(IsCell(references, "blockcell", "QB_RAM4K"));
+  EXPECT_FALSE(IsCell(references, "blockcell", "LM_RAM9K"));
+}
+
+TEST_F(Loading, TheMessageManagersComeBackInTheirEarlierStates) {
+  Port_MsgCollector enabled, disabled;
+  Port_MsgDispatcher::addMsgMan(&enabled);
+  Port_MsgDispatcher::addMsgMan(&disabled);
+  disabled.disable();
+  Port_MsgManDefault* standard = Port_MsgDispatcher::getDefaultMsgMan();
+  standard->disable();
+  {
+    ScopedCellLibraries corvane;
+    Vad::CLibRefs references;
+    EXPECT_TRUE(Vad::CTimecellLoader().Load(&references));
+    ScopedEnv noCellLibraries("CORVANE", nullptr);
+    EXPECT_FALSE(Vad::CTimecellLoader().Load(&references));
+  }
+  EXPECT_TRUE(Port_MsgDispatcher::isRegistered(&enabled));
+  EXPECT_TRUE(Port_MsgDispatcher::isRegistered(&disabled));
+  EXPECT_TRUE(Port_MsgDispatcher::isRegistered(standard));
+  EXPECT_TRUE(enabled.isEnabled());
+  EXPECT_FALSE(disabled.isEnabled());
+  EXPECT_TRUE(standard->isEnabled());
+  std::vector<Port_MsgMan*> managers;
+  Port_MsgDispatcher::getAllMsgMans(managers);
+  EXPECT_EQ(managers.size(), 3u);  // no capture left registered
+  Port_MsgDispatcher::removeMsgMan(&enabled);
+  Port_MsgDispatcher::removeMsgMan(&disabled);
+}
+
+}  // namespace
