@@ -21,6 +21,8 @@ class VhdlCorpus {
     text_.clear();
     text_.reserve(minimumBytes + 16384);
     unitNames_.clear();
+    packageName_.clear();
+    unitCount_ = 0;
     while (text_.size() < minimumBytes) AppendFile();
     return text_;
   }
@@ -41,6 +43,11 @@ class VhdlCorpus {
   }
 
   std::string Name(std::string_view stem) { return std::string(stem) + "_" + std::to_string(Below(1000)); }
+  // Design units and the labels inside one architecture have distinct names, as in real designs.
+  std::string UnitName(std::string_view stem) {
+    return std::string(stem) + "_" + std::to_string(++unitCount_);
+  }
+  std::string Label(std::string_view stem) { return std::string(stem) + std::to_string(++labelCount_); }
 
   void Line(std::string_view indent, std::string_view text) {
     text_.append(indent);
@@ -52,7 +59,7 @@ class VhdlCorpus {
     AppendHeaderComment();
     if (Chance(30)) AppendPackage();
     AppendContext();
-    std::string entity = Name(Pick(kUnitStems));
+    std::string entity = UnitName(Pick(kUnitStems));
     std::vector<std::string> ports = AppendEntity(entity);
     AppendArchitecture(entity, ports);
     unitNames_.push_back(entity);
@@ -72,15 +79,16 @@ class VhdlCorpus {
     Line("", "library ieee;");
     Line("", "use ieee.std_logic_1164.all;");
     Line("", "use ieee.numeric_std.all;");
-    if (Chance(40)) {
+    if (Chance(40) && !packageName_.empty()) {
       Line("", "library work;");
-      Line("", "use work." + Name("types") + "_pkg.all;");
+      Line("", "use work." + packageName_ + ".all;");
     }
     Line("", "");
   }
 
   void AppendPackage() {
-    std::string package = Name("types") + "_pkg";
+    std::string package = UnitName("types") + "_pkg";
+    packageName_ = package;
     Line("", "package " + package + " is");
     Line("  ", "constant DATA_WIDTH : natural := " + std::to_string(8 << Below(4)) + ";");
     Line("  ", "subtype word_t is std_logic_vector(DATA_WIDTH - 1 downto 0);");
@@ -129,6 +137,7 @@ class VhdlCorpus {
 
   void AppendArchitecture(const std::string& entity, const std::vector<std::string>& ports) {
     std::string arch = std::string(Pick(kArchNames));
+    labelCount_ = 0;
     Line("", "architecture " + arch + " of " + entity + " is");
     std::vector<std::string> signals;
     int count = 3 + Below(10);
@@ -183,7 +192,7 @@ class VhdlCorpus {
   }
 
   void AppendComponentInstance(const std::string& component, const std::vector<std::string>& signals) {
-    Line("  ", Name("u") + " : " + (Chance(30) ? "component " : "") + component);
+    Line("  ", Label("u") + " : " + (Chance(30) ? "component " : "") + component);
     AppendPortMap("    ", signals);
   }
 
@@ -191,14 +200,14 @@ class VhdlCorpus {
     std::string entity =
         unitNames_.empty() ? Name(Pick(kUnitStems)) : unitNames_[Below(static_cast<int>(unitNames_.size()))];
     std::string architecture = Chance(50) ? "(" + std::string(Pick(kArchNames)) + ")" : "";
-    Line("  ", Name("i") + " : entity work." + entity + architecture);
+    Line("  ", Label("i") + " : entity work." + entity + architecture);
     AppendPortMap("    ", signals);
   }
 
   void AppendGenerate(const std::string& component, const std::vector<std::string>& signals) {
-    std::string label = Name("gen");
+    std::string label = Label("gen");
     Line("  ", label + " : for i in 0 to DEPTH - 1 generate");
-    Line("    ", Name("u") + " : " + component);
+    Line("    ", Label("u") + " : " + component);
     AppendPortMap("      ", signals);
     Line("  ", "end generate " + label + ";");
   }
@@ -206,7 +215,7 @@ class VhdlCorpus {
   void AppendProcess(const std::vector<std::string>& signals, const std::vector<std::string>& ports) {
     const std::string& target = signals[Below(static_cast<int>(signals.size()))];
     const std::string& source = signals[Below(static_cast<int>(signals.size()))];
-    Line("  ", Name("p") + " : process (clk, rst_n)");
+    Line("  ", Label("p") + " : process (clk, rst_n)");
     Line("    ", "variable count : unsigned(WIDTH - 1 downto 0);");
     Line("  ", "begin");
     Line("    ", "if rst_n = '0' then");
@@ -234,6 +243,9 @@ class VhdlCorpus {
                                                    "one word per cycle at most", "see the block diagram"};
 
   std::uint64_t state_;
+  int unitCount_ = 0;
+  int labelCount_ = 0;
+  std::string packageName_;
   std::string text_;
   std::vector<std::string> unitNames_;
 };

@@ -88,15 +88,19 @@ struct VhdlParseContext {
   // the line began).
   bool pragma = false;
   std::uint32_t commentCount = 0;
-  // True while the grammar waits for the first token of a construct (see
-  // VhdlTokenBeginsConstruct).
+  // True while the grammar waits for the first token of a construct; the table tells, by token
+  // code, which tokens can begin one (see VhdlTokensBeginningConstructs).
   bool betweenConstructs = false;
+  const bool* tokenBeginsConstruct = nullptr;
+  // A name read between constructs that goes to the grammar only if a colon follows.
+  bool holdsName = false;
+  VhdlText heldName{0, 0};
   VhdlTextStore texts;
 };
 
 // Runs the scanner and grammar over the context's input until the end of input, a parse-stack
-// overflow, or the scanner running out of memory. False only in that last case. What was
-// recorded before stays recorded.
+// overflow, or memory running out. False only in that last case. What was recorded before stays
+// recorded.
 bool RunVhdlGrammar(VhdlParseContext& context);
 
 }  // namespace Vad

@@ -14,10 +14,10 @@
 
 %code provides {
 namespace Vad {
-// Whether `token` can begin a construct when the grammar stands between two constructs. Any
-// other token there is a syntax error whose recovery only discards it, so the scanner may drop
-// it at once; the answer comes from the grammar's own tables.
-bool VhdlTokenBeginsConstruct(int token);
+// For every token code, whether the token can begin a construct when the grammar stands between
+// two constructs. Any other token there is a syntax error whose recovery only discards it, so
+// the scanner may drop it at once. Taken from the grammar's own tables.
+const bool* VhdlTokensBeginningConstructs();
 }
 }
 
@@ -34,35 +34,35 @@ static void vhdl_error(void*, Vad::VhdlParseContext&, const char*) {}
 
 namespace {
 
-std::string_view TextOf(const Vad::VhdlParseContext& ctx, Vad::VhdlText text) { return ctx.texts.View(text); }
-Port::StringBase StringOf(const Vad::VhdlParseContext& ctx, Vad::VhdlText text) { return ctx.texts.String(text); }
+using Vad::VhdlParseContext;
+using Vad::VhdlText;
+namespace TypeIds = Vad::VhdlTypeIds;
 
-Vad::VhdlText Join(Vad::VhdlParseContext& ctx, std::initializer_list<std::string_view> pieces) {
-  return ctx.texts.Join(pieces);
-}
+std::string_view TextOf(const VhdlParseContext& ctx, VhdlText text) { return ctx.texts.View(text); }
+Port::StringBase StringOf(const VhdlParseContext& ctx, VhdlText text) { return ctx.texts.String(text); }
 
-void RecordArchitecture(Vad::VhdlParseContext& ctx, Vad::VhdlText archName, Vad::VhdlText entityName) {
+void RecordArchitecture(VhdlParseContext& ctx, VhdlText archName, VhdlText entityName) {
   ctx.begin = false;
-  ctx.holder.AddArch(StringOf(ctx, archName), StringOf(ctx, entityName), ctx.line, Vad::VhdlTypeIds::Architecture());
+  ctx.holder.AddArch(StringOf(ctx, archName), StringOf(ctx, entityName), ctx.line, TypeIds::Architecture());
 }
 
-void RecordEntity(Vad::VhdlParseContext& ctx, Vad::VhdlText name, bool portFlag) {
-  ctx.holder.AddEntityDecl(StringOf(ctx, name), ctx.line, portFlag, Vad::VhdlTypeIds::Entity());
+void RecordEntity(VhdlParseContext& ctx, VhdlText name, bool portFlag) {
+  ctx.holder.AddEntityDecl(StringOf(ctx, name), ctx.line, portFlag, TypeIds::Entity());
 }
 
-void RecordComponentInstance(Vad::VhdlParseContext& ctx, Vad::VhdlText label, Vad::VhdlText component) {
-  ctx.holder.AddCompInst(StringOf(ctx, label), StringOf(ctx, component), ctx.line, Vad::VhdlTypeIds::Instance(),
+void RecordComponentInstance(VhdlParseContext& ctx, VhdlText label, VhdlText component) {
+  ctx.holder.AddCompInst(StringOf(ctx, label), StringOf(ctx, component), ctx.line, TypeIds::Instance(),
                          Port::StringBase());
 }
 
-void RecordEntityInstance(Vad::VhdlParseContext& ctx, Vad::VhdlText label, Vad::VhdlText entity,
+void RecordEntityInstance(VhdlParseContext& ctx, VhdlText label, VhdlText entity,
                           std::string_view architecture) {
-  ctx.holder.AddEntityInst(StringOf(ctx, label), StringOf(ctx, entity), Port::StringBase(architecture), ctx.line,
-                           Vad::VhdlTypeIds::Instance());
+  ctx.holder.AddEntityInst(StringOf(ctx, label), StringOf(ctx, entity), Port::StringBase(architecture),
+                           ctx.line, TypeIds::Instance());
 }
 
-void RecordConfigBinding(Vad::VhdlParseContext& ctx, Vad::VhdlText instances, Vad::VhdlText component,
-                         Vad::VhdlText entity, std::string_view architecture) {
+void RecordConfigBinding(VhdlParseContext& ctx, VhdlText instances, VhdlText component, VhdlText entity,
+                         std::string_view architecture) {
   ctx.holder.AddConfigBinding(StringOf(ctx, instances), StringOf(ctx, component), StringOf(ctx, entity),
                               Port::StringBase(architecture));
 }
@@ -127,14 +127,14 @@ begin
 
 use
   : USE ext_ident SEMICOLON
-      { ctx.holder.AddUse(StringOf(ctx, $2), ctx.line, Vad::VhdlTypeIds::Use(), ctx.begin); }
+      { ctx.holder.AddUse(StringOf(ctx, $2), ctx.line, TypeIds::Use(), ctx.begin); }
   ;
 
 package
   : PACKAGE ident IS
-      { ctx.holder.AddPackageDecl(StringOf(ctx, $2), ctx.line, Vad::VhdlTypeIds::Package()); }
+      { ctx.holder.AddPackageDecl(StringOf(ctx, $2), ctx.line, TypeIds::Package()); }
   | PACKAGE BODY ident IS
-      { ctx.holder.AddPackageBody(StringOf(ctx, $3), ctx.line, Vad::VhdlTypeIds::PackageBody()); }
+      { ctx.holder.AddPackageBody(StringOf(ctx, $3), ctx.line, TypeIds::PackageBody()); }
   ;
 
 library
@@ -145,9 +145,9 @@ library
 /* Right recursive: a list is recorded from its last name back to its first. */
 lib_ident
   : ident
-      { ctx.holder.AddLibrary(StringOf(ctx, $1), ctx.line, Vad::VhdlTypeIds::Library()); }
+      { ctx.holder.AddLibrary(StringOf(ctx, $1), ctx.line, TypeIds::Library()); }
   | ident COMMA lib_ident
-      { ctx.holder.AddLibrary(StringOf(ctx, $1), ctx.line, Vad::VhdlTypeIds::Library()); }
+      { ctx.holder.AddLibrary(StringOf(ctx, $1), ctx.line, TypeIds::Library()); }
   ;
 
 arch
@@ -192,11 +192,11 @@ map
   ;
 
 ext_ident
-  : ident PERIOD ident PERIOD ALL { $$ = Join(ctx, {TextOf(ctx, $1), ".", TextOf(ctx, $3), ".all"}); }
+  : ident PERIOD ident PERIOD ALL { $$ = ctx.texts.Join({TextOf(ctx, $1), ".", TextOf(ctx, $3), ".all"}); }
   | ident PERIOD ident PERIOD ident
-      { $$ = Join(ctx, {TextOf(ctx, $1), ".", TextOf(ctx, $3), ".", TextOf(ctx, $5)}); }
-  | ident PERIOD ident { $$ = Join(ctx, {TextOf(ctx, $1), ".", TextOf(ctx, $3)}); }
-  | ident PERIOD ALL { $$ = Join(ctx, {TextOf(ctx, $1), ".all"}); }
+      { $$ = ctx.texts.Join({TextOf(ctx, $1), ".", TextOf(ctx, $3), ".", TextOf(ctx, $5)}); }
+  | ident PERIOD ident { $$ = ctx.texts.Join({TextOf(ctx, $1), ".", TextOf(ctx, $3)}); }
+  | ident PERIOD ALL { $$ = ctx.texts.Join({TextOf(ctx, $1), ".all"}); }
   | ident
   ;
 
@@ -224,7 +224,7 @@ configuration
 
 inst_list
   : ident
-  | ident COMMA inst_list { $$ = Join(ctx, {TextOf(ctx, $1), ",", TextOf(ctx, $3)}); }
+  | ident COMMA inst_list { $$ = ctx.texts.Join({TextOf(ctx, $1), ",", TextOf(ctx, $3)}); }
   | OTHERS { $$ = ctx.texts.Add("OTHERS"); }
   | ALL { $$ = ctx.texts.Add("ALL"); }
   ;
@@ -247,24 +247,28 @@ int StateBetweenConstructs() {
   return (0 <= index && index <= YYLAST && yycheck[index] == 0) ? yytable[index] : yydefgoto[lhs];
 }
 
-std::array<bool, YYNTOKENS> TokensBeginningConstructs() {
-  std::array<bool, YYNTOKENS> begins{};
-  const int state = StateBetweenConstructs();
+bool SymbolBeginsConstruct(int state, int symbol) {
   const int base = yypact[state];
-  for (int symbol = 0; symbol < YYNTOKENS; ++symbol) {
-    const int index = base + symbol;
-    // A default reduction or an entry for the token means the token is not simply discarded.
-    begins[symbol] = yypact_value_is_default(base) || yydefact[state] != 0 ||
-                     (0 <= index && index <= YYLAST && yycheck[index] == symbol);
+  const int index = base + symbol;
+  // A default reduction or an entry for the token means the token is not simply discarded.
+  return yypact_value_is_default(base) || yydefact[state] != 0 ||
+         (0 <= index && index <= YYLAST && yycheck[index] == symbol);
+}
+
+std::array<bool, YYMAXUTOK + 1> TokensBeginningConstructs() {
+  std::array<bool, YYMAXUTOK + 1> begins{};
+  const int state = StateBetweenConstructs();
+  for (int token = 0; token <= YYMAXUTOK; ++token) {
+    begins[token] = SymbolBeginsConstruct(state, YYTRANSLATE(token));
   }
   return begins;
 }
 
 }  // namespace
 
-bool VhdlTokenBeginsConstruct(int token) {
-  static const std::array<bool, YYNTOKENS> begins = TokensBeginningConstructs();
-  return begins[YYTRANSLATE(token)];
+const bool* VhdlTokensBeginningConstructs() {
+  static const std::array<bool, YYMAXUTOK + 1> begins = TokensBeginningConstructs();
+  return begins.data();
 }
 
 }  // namespace Vad

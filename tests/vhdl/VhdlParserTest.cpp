@@ -198,6 +198,25 @@ TEST_F(VhdlParse, TranslatePragmasAreIgnoredUnderAnyOtherTarget) {
   }
 }
 
+TEST_F(VhdlParse, TranslateOnCountsInTheFirstCommentOfALineAndPragmaWordsMayRunOn) {
+  SetParseTarget("synthesis");
+  EXPECT_THAT(Parse("-- synthesis translate_off\n"
+                    "synthesis translate_on -- pragma translate_on\n"  // code words, then the first comment
+                    "entity kept_a is end;\n"
+                    "--synthesis translate_off\n"
+                    "entity hidden_a is end;\n"
+                    "-- -- synthesis translate_on\n"  // in the second comment of the line
+                    "entity hidden_b is end;\n"
+                    "-- synthesis translate_on and more words\n"
+                    "entity kept_b is end;\n"
+                    "--synthesis translate_offset\n"
+                    "entity hidden_c is end;\n"
+                    "-- synthesis translate_on\n"
+                    "entity kept_d is end;\n"),
+              ElementsAre("|Entity||kept_a line 3 entity uses []", "|Entity||kept_b line 9 entity uses []",
+                          "|Entity||kept_d line 13 entity uses []"));
+}
+
 TEST_F(VhdlParse, ConfigurationForAllInstancesBindsTheComponentForTheRestOfTheUnit) {
   EXPECT_THAT(
       Parse("entity top is end;\n"
