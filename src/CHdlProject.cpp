@@ -3,11 +3,14 @@
 #include <algorithm>
 #include <new>
 
+#include "CElaborator.h"
 #include "CHdlElement.h"
 #include "CHdlFile.h"
 #include "CLibRefs.h"
 #include "CParserConfigBase.h"
 #include "DbObject.h"
+#include "IHdlNetListNode.h"
+#include "NetListWalk.h"
 #include "Port/InitObjects.h"
 #include "Port/MsgManData.h"
 #include "Prjrep/Casts.h"
@@ -29,6 +32,18 @@ constexpr const char* kNoNewFileText = "Error: CHdlProject::createNewFile - Unab
 
 constexpr const char* kVerilogPlugin = "PLUGIN_Verilog";
 
+// Set while a hierarchy rebuild runs anywhere in the process, so that a request made from inside
+// it does not start another.
+bool hierarchyRebuildInProgress = false;
+
+class RebuildScope {
+ public:
+  RebuildScope() { hierarchyRebuildInProgress = true; }
+  ~RebuildScope() { hierarchyRebuildInProgress = false; }
+  RebuildScope(const RebuildScope&) = delete;
+  RebuildScope& operator=(const RebuildScope&) = delete;
+};
+
 bool IsVerilogPlugin(const Port::StringBase& pluginName) {
   return pluginName.Equals(kVerilogPlugin, Port::kCompareNoCase);
 }
@@ -43,6 +58,47 @@ void ForEachUnit(IHdlDesignUnitSet* units, Visit visit) {
 bool IsDesignUnitKind(IHdlDesignUnit* unit) {
   auto* object = Prjrep::ImplementationCast<DbObject>(unit);
   return object && (object->GetType() & DbType::kDesignUnitKinds);
+}
+
+constexpr const char* kNoElementText =
+    "Error: CHdlView::getCompileOrderByDU() - Unable to obtain the CHdlElement pointer.\n";
+// getCompileOrderByDU's answers besides 1 and 0.
+constexpr CitI::Result kNotOrderedByKind = 4;
+constexpr CitI::Result kUnitNotInTree = 5;
+
+// The node of `unit` in the tree: the root itself, else the first match among the children of
+// the nodes taken from a stack (the most recently added node first, its children in order).
+IHdlNetListNode* FindUnitNode(IHdlNetListNode* root, CitI::IInterface* unit) {
+  CitI::IInterface* wanted = NetListWalk::Identity(unit);
+  if (!root || !wanted) return nullptr;
+  if (NetListWalk::Identity(root->GetElement()) == wanted) return root;
+  std::vector<IHdlNetListNode*> pending{root};
+  while (!pending.empty()) {
+    IHdlNetListNode* node = pending.back();
+    pending.pop_back();
+    for (IHdlNetListNode* child : NetListWalk::ChildrenOf(node)) {
+      if (NetListWalk::Identity(child->GetElement()) == wanted) return child;
+      pending.push_back(child);
+    }
+  }
+  return nullptr;
+}
+
+IHdlNetListNode* FirstEntityChild(IHdlNetListNode* node) {
+  for (IHdlNetListNode* child : NetListWalk::ChildrenOf(node)) {
+    auto* object = Prjrep::ImplementationCast<DbObject>(child->GetElement());
+    if (object && object->GetType() == DbType::kEntity) return child;
+  }
+  return nullptr;
+}
+
+// An iterator over the one source file of `unit` (none when the unit has no file).
+Prjrep::AutoRelease<IHdlFileIterator> IterateOwnFile(CHdlElement* unit) {
+  Prjrep::AutoPtr<IHdlFile> file;
+  if (auto* element = Prjrep::QueryAs<IHdlElement>(unit)) element->GetSourceFile(file.Out());
+  std::vector<IHdlFile*> files;
+  if (file) files.push_back(file.Get());
+  return Prjrep::TInterfaceListIter<IHdlFileIterator>::New(files);
 }
 
 }  // namespace
@@ -69,7 +125,12 @@ CitI::IInterface* CHdlProject::QueryInterface(const Port::XUID& id) {
 CitI::Result CHdlProject::getElaborator(CElaborator** out) {
   if (!out) return CitI::kInvalidArg;
   *out = nullptr;
-  return CitI::kFail;
+  if (!elaborator_) elaborator_.Attach(new (std::nothrow) CElaborator());
+  auto* elaborator = Prjrep::ObjectCast<CElaborator>(elaborator_.Get());
+  if (!elaborator) return CitI::kFail;
+  Prjrep::AddRefOf(elaborator);
+  *out = elaborator;
+  return CitI::kOk;
 }
 
 CLibRefs* CHdlProject::getLibraryReferences() {
@@ -246,16 +307,51 @@ CitI::Result CHdlProject::getUndefinedInstances() {
   return CitI::kFail;
 }
 
-CitI::Result CHdlProject::getCompileOrder(IHdlNetListNode*, IHdlFileIterator** out) {
+CitI::Result CHdlProject::getCompileOrder(IHdlNetListNode* top, IHdlFileIterator** out) {
   if (!out) return CitI::kInvalidArg;
   *out = nullptr;
-  return CitI::kFail;
+  Prjrep::AutoRelease<IHdlNetListNode> root;
+  CitI::Result status = getHierarchyRoot(root.Out());
+  if (status != CitI::kOk) return status;
+  Prjrep::AutoRelease<CElaborator> elaborator;
+  status = getElaborator(elaborator.Out());
+  if (status != CitI::kOk) return status;
+  return elaborator->GetCompileOrder(&projectFace_, root.Get(), top, parserConfig_.Get(), true, out);
 }
 
-CitI::Result CHdlProject::getCompileOrderByDU(IHdlDesignUnit* unit, bool, IHdlFileIterator** out) {
+CitI::Result CHdlProject::getCompileOrderByDU(IHdlDesignUnit* unit, bool byUnit, IHdlFileIterator** out) {
   if (!unit || !out) return CitI::kFail;
   *out = nullptr;
-  return CitI::kFail;
+  Prjrep::AutoRelease<CElaborator> elaborator;
+  if (getElaborator(elaborator.Out()) != CitI::kOk || !elaborator) return CitI::kFail;
+  auto* element = Prjrep::ImplementationCast<CHdlElement>(unit);
+  if (!element) {
+    Port_MsgManData::debugStub("%s", kNoElementText);
+    return CitI::kFail;
+  }
+  Prjrep::AutoRelease<IHdlNetListNode> root;
+  CitI::Result status = getHierarchyRoot(root.Out());
+  if (status != CitI::kOk) return status;
+  IHdlNetListNode* node = FindUnitNode(root.Get(), element);
+  if (!node) return kUnitNotInTree;
+
+  IHdlProject* project = &projectFace_;
+  IHdlParserConfig* config = parserConfig_.Get();
+  if (!byUnit) return elaborator->GetCompileOrder(project, root.Get(), node, config, true, out);
+  switch (element->GetType()) {
+    case DbType::kModule:
+      *out = IterateOwnFile(element).Detach();
+      return CitI::kOk;
+    case DbType::kEntity:
+      return elaborator->GetCompileOrder(project, root.Get(), root.Get(), config, false, out);
+    case DbType::kArchitecture: {
+      IHdlNetListNode* entity = FirstEntityChild(node);
+      if (!entity) return kUnitNotInTree;
+      return elaborator->GetCompileOrder(project, root.Get(), entity, config, false, out);
+    }
+    default:
+      return kNotOrderedByKind;
+  }
 }
 
 CitI::Result CHdlProject::getDesignUnitPorts(IHdlDesignUnit* unit, IHdlPortIterator** out) {
@@ -264,10 +360,65 @@ CitI::Result CHdlProject::getDesignUnitPorts(IHdlDesignUnit* unit, IHdlPortItera
   return element->GetPorts(out);
 }
 
+bool CHdlProject::IsHierarchyUpToDate() {
+  if (!cachedRoot_) return false;
+  VerilogSurvey survey = SurveyVerilogFiles();
+  if (survey.changed) return false;
+  auto projectFiles = Prjrep::TInterfaceListIter<IHdlFileIterator>::New(survey.files);
+  for (const auto& [key, file] : files_.Elements()) {
+    auto* hdlFile = Prjrep::ObjectCast<CHdlFile>(file);
+    bool upToDate = false;
+    if (!hdlFile || hdlFile->isUpToDate(&upToDate, projectFiles.Get()) != CitI::kOk) return false;
+    if (!upToDate) return false;
+  }
+  return true;
+}
+
+CitI::Result CHdlProject::RebuildHierarchy() {
+  Prjrep::AutoRelease<IHdlDesignUnitSet> units;
+  CitI::Result result = getAllDesignUnits(units.Out());
+  if (result != CitI::kOk) return result;
+  Prjrep::AutoRelease<CElaborator> elaborator;
+  result = getElaborator(elaborator.Out());
+  if (result != CitI::kOk) return result;
+  Prjrep::AutoRelease<IHdlDesignUnitIterator> unit;
+  result = units->CreateIterator(unit.Out());
+  if (result != CitI::kOk) return result;
+  Prjrep::AutoPtr<IHdlNetListNode> root;
+  result = elaborator->Elaborate(&projectFace_, unit.Get(), root.Out());
+  if (result != CitI::kOk) return result;
+  Prjrep::AutoRelease<IHdlFileIterator> files;
+  if (files_.CreateIterator(files.Out()) == CitI::kOk)
+    elaborator->AddMissingFileNodes(root.Get(), files.Get());
+  cachedRoot_ = std::move(root);
+  return CitI::kOk;
+}
+
 CitI::Result CHdlProject::getHierarchyRoot(IHdlNetListNode** out) {
-  if (!out) return CitI::kInvalidArg;
-  *out = nullptr;
-  return CitI::kFail;
+  Prjrep::AutoOut<IHdlNetListNode> root(out);
+  if (root.IsMissing()) return CitI::kInvalidArg;
+  if (cachedRoot_ && IsHierarchyUpToDate()) {
+    root.Set(cachedRoot_.Get());
+    return CitI::kOk;
+  }
+  if (!interimRoot_) interimRoot_ = Prjrep::CreateInstanceAs<IHdlNetListNode>(ClassIds::CNetListNode());
+  if (hierarchyRebuildInProgress) {
+    root.Set(interimRoot_.Get());
+    return interimRoot_ ? CitI::kOk : CitI::kFail;
+  }
+
+  CitI::Result result;
+  {
+    RebuildScope rebuilding;
+    if (cachedRoot_) interimRoot_ = std::move(cachedRoot_);
+    cachedRoot_ = nullptr;
+    result = RebuildHierarchy();
+    interimRoot_ = nullptr;
+  }
+  if (result != CitI::kOk) return result;
+  if (!cachedRoot_) return CitI::kFail;
+  root.Set(cachedRoot_.Get());
+  return CitI::kOk;
 }
 
 }  // namespace Vad

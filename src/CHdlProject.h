@@ -10,6 +10,7 @@
 #include "HdlSets.h"
 #include "IHdlElaborationData.h"
 #include "IHdlFile.h"
+#include "IHdlNetListNode.h"
 #include "IHdlParserConfig.h"
 #include "IHdlProject.h"
 #include "Port/StringBase.h"
@@ -27,10 +28,6 @@ class CParserConfigBase;
 
 // QueryInterface answers, in this order, IHdlFileSet, IHdlProject, Prjrep::IRefCount,
 // IHdlElaborationData and IInterface (the object itself).
-//
-// The instance hierarchy, the compile orders and the elaborator are not built yet:
-// getHierarchyRoot, getCompileOrder, getCompileOrderByDU and getElaborator answer 0 with an
-// empty out-parameter.
 class CHdlProject final : public CitI::IInterface {
  public:
   CHdlProject();
@@ -41,6 +38,7 @@ class CHdlProject final : public CitI::IInterface {
 
   // ---- for the rest of the module ----
   // The elaborator with one reference for the caller; kInvalidArg for a null out-parameter.
+  // The elaborator is made on first use and kept for the project's life.
   CitI::Result getElaborator(CElaborator** out);
   // The library references (no reference added), made on first use and brought to the
   // configuration's device family on every call.
@@ -60,9 +58,17 @@ class CHdlProject final : public CitI::IInterface {
 
   // ---- IHdlElaborationData ----
   CitI::Result getUndefinedInstances();
+  // The order of the whole project, or (for a `top` other than the root) of top's tree widened
+  // by the units that share its files.
   CitI::Result getCompileOrder(IHdlNetListNode* top, IHdlFileIterator** out);
+  // With `byUnit` clear, the order of the unit's widened tree; set: a module's own file, an
+  // entity's whole project, an architecture's entity tree. 4 for other kinds with `byUnit` set;
+  // 5 for a unit that is not in the tree and an architecture without its entity; 0 for a null
+  // unit or out-parameter.
   CitI::Result getCompileOrderByDU(IHdlDesignUnit* unit, bool byUnit, IHdlFileIterator** out);
   CitI::Result getDesignUnitPorts(IHdlDesignUnit* unit, IHdlPortIterator** out);
+  // The cached tree while it is up to date, else a new one. A request made while a rebuild runs
+  // gets the previous tree (or an empty node) instead of a second rebuild.
   CitI::Result getHierarchyRoot(IHdlNetListNode** out);
 
  private:
@@ -121,6 +127,11 @@ class CHdlProject final : public CitI::IInterface {
   void UnlinkAll();
   VerilogSurvey SurveyVerilogFiles() const;
   void ForgetHierarchy() { cachedRoot_ = nullptr; }
+  // Whether the cached tree still stands for the files: it exists, no Verilog file changed and
+  // every file is up to date.
+  bool IsHierarchyUpToDate();
+  // Collects the design units, elaborates them and caches the tree with its placeholder nodes.
+  CitI::Result RebuildHierarchy();
 
   Prjrep::TAssociativeSetHelper<IHdlFileSet> files_;
   Prjrep::AutoPtr<IHdlParserConfig> parserConfig_;
@@ -128,8 +139,12 @@ class CHdlProject final : public CitI::IInterface {
   Prjrep::TRefCountHelper<CHdlProject> refs_{this};
   XIHdlFileSet fileSetFace_{this};
   XIHdlProject projectFace_{this};
-  // The tree built at the last elaboration; stays empty until the hierarchy is built.
-  Prjrep::AutoPtr<CitI::IInterface> cachedRoot_;
+  // The tree built at the last elaboration; empty until the hierarchy is built and after a file
+  // is added or removed.
+  Prjrep::AutoPtr<IHdlNetListNode> cachedRoot_;
+  // What nested requests see while a rebuild runs.
+  Prjrep::AutoPtr<IHdlNetListNode> interimRoot_;
+  Prjrep::AutoPtr<CitI::IInterface> elaborator_;
   XIHdlElaborationData elaborationDataFace_{this};
 };
 

@@ -2,9 +2,11 @@
 #include <vector>
 
 #include "Arch.h"
+#include "CElaborator.h"
 #include "CHdlFile.h"
 #include "CHdlProject.h"
 #include "CLibRefs.h"
+#include "CNetListNode.h"
 #include "CParserConfigBase.h"
 #include "CParserConfigHolder.h"
 #include "CompInst.h"
@@ -56,6 +58,8 @@ constexpr ClassEntry kClasses[] = {
     EntryOf<PackageDecl, &ClassIds::PackageDecl>(),
     EntryOf<Use, &ClassIds::Use>(),
     EntryOf<module, &ClassIds::module>(),
+    EntryOf<CNetListNode, &ClassIds::CNetListNode>(),
+    EntryOf<CElaborator, &ClassIds::CElaborator>(),
     EntryOf<generic, &ClassIds::generic>(),
     EntryOf<CLibRefs, &ClassIds::CLibRefs>(),
 };

@@ -1,0 +1,881 @@
+#include "CElaborator.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <utility>
+
+#include "Arch.h"
+#include "CHdlElement.h"
+#include "CHdlFile.h"
+#include "CHdlProject.h"
+#include "CLibRefs.h"
+#include "CNetListNode.h"
+#include "CVhdlDU.h"
+#include "CompInst.h"
+#include "EntityDecl.h"
+#include "EntityInst.h"
+#include "IHdlDUProperties.h"
+#include "Identifiers.h"
+#include "PackageBody.h"
+#include "PackageDecl.h"
+#include "Port/InitObjects.h"
+#include "Port/MsgManData.h"
+#include "Prjrep/Casts.h"
+#include "Use.h"
+
+namespace Vad {
+namespace {
+
+constexpr const char* kMessageCategory = "ProjectMgmt";
+constexpr const char* kMessageSource = "../src/CElaborator";
+constexpr const char* kRevision = "1.1";
+
+// The creator identifier of module instances recorded by the Verilog parser.
+const Port::XUID& VerilogInstanceTypeId() {
+  static const Port::XUID id{std::string_view("{4767A2DD-D3AE-4b52-9042-59EAAF25C023}")};
+  return id;
+}
+
+// Libraries whose units the project does not hold: use clauses of these are not followed.
+constexpr const char* kUntrackedUseLibraries[] = {"ieee",     "basecell",       "blockcell",
+                                                  "timecell", "corvanecorelib", "std"};
+// Libraries whose entities are not tracked when an instance names them.
+constexpr const char* kUntrackedEntityLibraries[] = {"basecell", "ieee", "blockcell", "timecell"};
+// The cell libraries asked about units that are not in the project, in this order.
+constexpr const char* kCellLibraries[] = {"basecell", "blockcell", "timecell"};
+
+bool ModeOneEqual(const Port::StringBase& a, std::string_view b) { return a.Equals(b, Port::kCompareNoCase); }
+
+template <std::size_t N>
+bool IsOneOf(const Port::StringBase& text, const char* const (&list)[N]) {
+  return std::any_of(std::begin(list), std::end(list),
+                     [&](const char* entry) { return ModeOneEqual(text, entry); });
+}
+
+DbObject* DesignObjectOf(CitI::IInterface* element) { return Prjrep::ImplementationCast<DbObject>(element); }
+
+Port::StringBase LibraryOf(CitI::IInterface* element) {
+  Port::StringBase library;
+  if (auto* hdlElement = Prjrep::ImplementationCast<CHdlElement>(element))
+    hdlElement->GetLibraryName(&library);
+  return library;
+}
+
+Port::StringBase Formatted(const char* format, const Port::StringBase& a) {
+  Port::StringBase text;
+  text.Format(format, a.c_str());
+  return text;
+}
+
+Port::StringBase Formatted(const char* format, const Port::StringBase& a, const Port::StringBase& b) {
+  Port::StringBase text;
+  text.Format(format, a.c_str(), b.c_str());
+  return text;
+}
+
+// Splits at `separator`, keeping empty pieces, so that "A||B" keeps B in third place.
+std::vector<Port::StringBase> SplitKeepingEmpty(const Port::StringBase& text, char separator) {
+  std::vector<Port::StringBase> pieces;
+  std::size_t start = 0;
+  while (true) {
+    std::size_t end = text.Find(separator, start);
+    pieces.push_back(text.Mid(start, end == Port::StringBase::npos ? Port::StringBase::npos : end - start));
+    if (end == Port::StringBase::npos) break;
+    start = end + 1;
+  }
+  return pieces;
+}
+
+// The last two `separator`-separated pieces of `text`: the one before the last, and the last.
+void SplitLastTwo(const Port::StringBase& text, char separator, Port::StringBase& before,
+                  Port::StringBase& last) {
+  before.Empty();
+  last.Empty();
+  std::vector<Port::StringBase> pieces = SplitKeepingEmpty(text, separator);
+  last = pieces.back();
+  if (pieces.size() >= 2) before = pieces[pieces.size() - 2];
+}
+
+std::unique_ptr<Port_MsgManData> Messages(int line) {
+  return Port_MsgManData::createObject(kMessageCategory, kMessageSource, line, kRevision);
+}
+
+bool SameObject(CitI::IInterface* a, CitI::IInterface* b) {
+  return a && b && a->QueryInterface(CitI::IInterface::Iid()) == b->QueryInterface(CitI::IInterface::Iid());
+}
+
+// The library, package and item a use clause names, with the shorthand forms spelled out.
+struct UseParts {
+  Port::StringBase library;
+  Port::StringBase package;
+  Port::StringBase item;
+};
+
+}  // namespace
+
+// ---- the object ----------------------------------------------------------------------------------
+
+CitI::IInterface* CElaborator::QueryInterface(const Port::XUID& id) {
+  if (id == Prjrep::IRefCount::Iid() || id == Prjrep::IRefCountV1::Iid()) return &refs_;
+  // The factory and the project reach the object through IInterface.
+  if (id == CitI::IInterface::Iid()) return this;
+  return nullptr;
+}
+
+CElaborator::CMissingFileDU::CMissingFileDU(IHdlFile* file) : module(std::string_view(), nullptr) {
+  SetUnitFlag(false);
+  SetFile(file);
+  Port::StringBase key;
+  key.Format("%s|%s", GetTypeName(), GetModuleName().c_str());
+  SetKey(key.view());
+}
+
+// ---- name forms ----------------------------------------------------------------------------------
+
+Port::StringBase CElaborator::Qualify(const Port::StringBase& library, const Port::StringBase& name) {
+  if (library.IsEmpty()) return name;
+  return Formatted("%s:%s", library, name);
+}
+
+void CElaborator::SplitQualifiedName(const Port::StringBase& qualified, Port::StringBase& library,
+                                     Port::StringBase& key) {
+  SplitLastTwo(qualified, ':', library, key);
+}
+
+void CElaborator::SplitDottedName(const Port::StringBase& dotted, Port::StringBase& library,
+                                  Port::StringBase& name) {
+  SplitLastTwo(dotted, '.', library, name);
+}
+
+CitI::Result CElaborator::MakeUnitKeys(IHdlElement* element, Port::StringBase& shortKey,
+                                       Port::StringBase& fullKey) {
+  shortKey.Empty();
+  fullKey.Empty();
+  if (!element) return CitI::kInvalidArg;
+  DbObject* unit = DesignObjectOf(element);
+  if (!unit) return CitI::kFail;
+  switch (unit->GetType()) {
+    case DbType::kArchitecture:
+      if (auto* arch = dynamic_cast<Arch*>(unit)) {
+        fullKey = Formatted("Architecture|%s|%s", arch->GetEntityName(), arch->GetArchitectureName());
+        shortKey = Formatted("Architecture|%s", arch->GetEntityName());
+      }
+      break;
+    case DbType::kModule:
+      if (auto* mod = dynamic_cast<module*>(unit))
+        fullKey = shortKey = Formatted("Module|%s", mod->GetModuleName());
+      break;
+    case DbType::kPackageDecl:
+      if (auto* package = dynamic_cast<PackageDecl*>(unit))
+        fullKey = shortKey = Formatted("PackageDecl|%s", package->GetPackageName());
+      break;
+    case DbType::kPackageBody:
+      if (auto* body = dynamic_cast<PackageBody*>(unit))
+        fullKey = shortKey = Formatted("PackageBody|%s", body->GetPackageName());
+      break;
+    case DbType::kEntity:
+      if (auto* entity = dynamic_cast<EntityDecl*>(unit))
+        fullKey = shortKey = Formatted("Entity|%s", entity->GetEntityName());
+      break;
+    default:
+      break;
+  }
+  return CitI::kOk;
+}
+
+// ---- table look-ups ------------------------------------------------------------------------------
+
+const std::vector<Port::StringBase>* CElaborator::FindRegisteredKey(const CElabTables& tables,
+                                                                    const Port::StringBase& shortKey,
+                                                                    const Port::StringBase& library,
+                                                                    bool exact) const {
+  const CElabTables::RegisteredUnit* chosen = nullptr;
+  auto [first, last] = tables.m_sArchitectureMultiMapList.equal_range(shortKey);
+  for (auto entry = first; entry != last; ++entry) {
+    if (exact && entry->first != shortKey) continue;
+    chosen = &entry->second;
+    if (ModeOneEqual(entry->second.library, library)) break;
+  }
+  return chosen ? &chosen->keys : nullptr;
+}
+
+IHdlElement* CElaborator::FindRegisteredElement(const CElabTables& tables, const Port::StringBase& name,
+                                                const Port::StringBase& library, bool exact) const {
+  IHdlElement* chosen = nullptr;
+  auto [first, last] = tables.m_piHdlElementMultiMapNames.equal_range(name);
+  for (auto entry = first; entry != last; ++entry) {
+    if (exact && entry->first != name) continue;
+    chosen = entry->second;
+    if (ModeOneEqual(LibraryOf(chosen), library)) break;
+  }
+  return chosen;
+}
+
+const std::vector<Port::StringBase>* CElaborator::FindDepends(const CElabTables& tables,
+                                                              const Port::StringBase& name) const {
+  auto found = tables.m_DependsTable.find(name);
+  return found == tables.m_DependsTable.end() ? nullptr : &found->second;
+}
+
+const std::vector<Port::StringBase>* CElaborator::FindInstanceLabels(const CElabTables& tables,
+                                                                     const Port::StringBase& name) const {
+  auto found = tables.m_sElementNameInstanceList.find(name);
+  return found == tables.m_sElementNameInstanceList.end() ? nullptr : &found->second;
+}
+
+// ---- table updates -------------------------------------------------------------------------------
+
+CitI::Result CElaborator::AddDependencyCountName(CElabTables& tables, const Port::StringBase& name) {
+  if (name.IsEmpty()) return CitI::kInvalidArg;
+  if (!tables.m_ElementNameDependencyCountMap.try_emplace(name, 0).second)
+    Port_MsgManData::debugStub("%s", ElabText::kNameExists);
+  return CitI::kOk;
+}
+
+void CElaborator::CountReference(CElabTables& tables, const Port::StringBase& target) {
+  auto [entry, inserted] = tables.m_ElementNameDependencyCountMap.try_emplace(target, 0);
+  if (!inserted) ++entry->second;
+}
+
+CitI::Result CElaborator::AddDepends(CElabTables& tables, const Port::StringBase& name,
+                                     const Port::StringBase& target) {
+  if (name.IsEmpty()) return CitI::kInvalidArg;
+  tables.m_DependsTable[name].push_back(target);
+  return CitI::kOk;
+}
+
+CitI::Result CElaborator::AddInstanceLabel(CElabTables& tables, const Port::StringBase& name,
+                                           const Port::StringBase& label) {
+  if (name.IsEmpty()) return CitI::kInvalidArg;
+  tables.m_sElementNameInstanceList[name].push_back(label);
+  return CitI::kOk;
+}
+
+CitI::Result CElaborator::RegisterShortKey(CElabTables& tables, const Port::StringBase& shortKey,
+                                           const Port::StringBase& fullKey, const Port::StringBase& library) {
+  if (shortKey.IsEmpty() || library.IsEmpty()) return CitI::kInvalidArg;
+  auto [first, last] = tables.m_sArchitectureMultiMapList.equal_range(shortKey);
+  for (auto entry = first; entry != last; ++entry) {
+    if (entry->first == shortKey && ModeOneEqual(entry->second.library, library)) return CitI::kOk;
+  }
+  tables.m_sArchitectureMultiMapList.emplace(
+      shortKey, CElabTables::RegisteredUnit{{Qualify(library, fullKey)}, library});
+  return CitI::kOk;
+}
+
+// ---- registration --------------------------------------------------------------------------------
+
+CitI::Result CElaborator::RegisterDesignUnits(CElabTables& tables, IHdlDesignUnitIterator* elements,
+                                              DuplicateList& duplicates) {
+  if (!elements) return CitI::kInvalidArg;
+  int duplicateCount = 0;
+  for (elements->First(); !elements->IsDone(); elements->Next()) {
+    auto* element = Prjrep::QueryAs<IHdlElement>(elements->Current());
+    DbObject* unit = DesignObjectOf(element);
+    // A unit of another module cannot be resolved by name; it is left out rather than ending the run.
+    if (!unit || unit->GetType() == DbType::kGeneric) continue;
+
+    Port::StringBase library = LibraryOf(element);
+    Port::StringBase name;
+    unit->GetDesignUnitKey(name);
+    Port::StringBase shortKey;
+    Port::StringBase fullKey;
+    MakeUnitKeys(element, shortKey, fullKey);
+
+    bool exact = (unit->GetType() & ElabMask::kVhdlUnit) == 0;
+    IHdlElement* registered = FindRegisteredElement(tables, name, library, exact);
+    if (registered && ModeOneEqual(LibraryOf(registered), library)) {
+      Port::StringBase suffix;
+      suffix.Format(ElabText::kDuplicateSuffix, ++duplicateCount);
+      name.Append(suffix.view());
+      shortKey.Append(suffix.view());
+      fullKey.Append(suffix.view());
+      duplicates.push_back(element);
+    }
+
+    RegisterShortKey(tables, shortKey, fullKey, library);
+    tables.m_piHdlElementMultiMapNames.emplace(name, element);
+    CitI::Result result = AddDependencyCountName(tables, Qualify(library, name));
+    if (result != CitI::kOk) return result;
+  }
+  return CitI::kOk;
+}
+
+// ---- resolution ----------------------------------------------------------------------------------
+
+namespace {
+
+const Port::StringBase& FirstOf(const std::vector<Port::StringBase>* keys) {
+  static const Port::StringBase kEmpty;
+  return keys && !keys->empty() ? keys->front() : kEmpty;
+}
+
+}  // namespace
+
+Port::StringBase CElaborator::ResolvePackage(const CElabTables& tables, const Port::StringBase& package,
+                                             const Port::StringBase& library) const {
+  return FirstOf(FindRegisteredKey(tables, Formatted("PackageDecl|%s", package), library, true));
+}
+
+Port::StringBase CElaborator::ResolvePrimaryEntity(const CElabTables& tables, const Port::StringBase& entity,
+                                                   const Port::StringBase& library) const {
+  return FirstOf(FindRegisteredKey(tables, Formatted("Entity|%s", entity), library, true));
+}
+
+Port::StringBase CElaborator::ResolveModuleRef(const CElabTables& tables, const Port::StringBase& name,
+                                               const Port::StringBase& library) const {
+  Port::StringBase target = FirstOf(FindRegisteredKey(tables, Formatted("Module|%s", name), library, true));
+  if (target.IsEmpty())
+    target = FirstOf(FindRegisteredKey(tables, Formatted("Architecture|%s", name), library, true));
+  if (target.IsEmpty())
+    target = FirstOf(FindRegisteredKey(tables, Formatted("Architecture|%s", name), library, false));
+  return target;
+}
+
+Port::StringBase CElaborator::ResolveEntityRef(const CElabTables& tables, const Port::StringBase& dottedName,
+                                               const Port::StringBase& architecture,
+                                               const Port::StringBase& library) const {
+  Port::StringBase entityLibrary;
+  Port::StringBase entity;
+  SplitDottedName(dottedName, entityLibrary, entity);
+  // "work" names the library of the referring unit.
+  if (entityLibrary.IsEmpty() || ModeOneEqual(entityLibrary, "work")) entityLibrary = library;
+  if (IsOneOf(entityLibrary, kUntrackedEntityLibraries)) return {};
+
+  const auto* keys = FindRegisteredKey(tables, Formatted("Architecture|%s", entity), entityLibrary, false);
+  if (keys && architecture.IsEmpty()) return FirstOf(keys);
+  if (keys) {
+    Port::StringBase wanted = Qualify(entityLibrary, Formatted("Architecture|%s|%s", entity, architecture));
+    for (const Port::StringBase& key : *keys) {
+      if (ModeOneEqual(key, wanted)) return key;
+    }
+    return {};
+  }
+  if (!architecture.IsEmpty()) return {};
+  Port::StringBase target =
+      FirstOf(FindRegisteredKey(tables, Formatted("Module|%s", entity), entityLibrary, true));
+  if (target.IsEmpty())
+    target = FirstOf(FindRegisteredKey(tables, Formatted("Module|%s", entity), entityLibrary, false));
+  return target;
+}
+
+// ---- processing one unit -------------------------------------------------------------------------
+
+namespace {
+
+// Spells out the shorthand forms of a use clause: "use lib.pkg;" (a registered package),
+// "use pkg.item;" (the first part is a package of the working library) and "use lib;".
+UseParts SplitUseClause(const CElaborator& elaborator, const CElabTables& tables, const Use& use,
+                        const Port::StringBase& unitLibrary) {
+  UseParts parts{use.GetLibraryPart(), use.GetPackagePart(), use.GetItemPart()};
+  if (parts.item.IsEmpty()) {
+    if (!parts.package.IsEmpty()) {
+      Port::StringBase packageKey = Formatted("PackageDecl|%s", parts.package);
+      Port::StringBase library = ModeOneEqual(parts.library, "work") ? unitLibrary : parts.library;
+      bool namesPackage = tables.m_DependsTable.count(CElaborator::Qualify(parts.library, packageKey)) != 0 ||
+                          elaborator.FindRegisteredKey(tables, packageKey, library, true) != nullptr;
+      parts.item = parts.package;
+      if (!namesPackage) parts.package = "*";
+    } else {
+      parts.package = "*";
+      parts.item = "all";
+    }
+  }
+  if (parts.package == "*") {
+    parts.package = parts.library;
+    parts.library = "work";
+  }
+  return parts;
+}
+
+std::vector<Use*> UsesOf(DbObject* unit) {
+  std::vector<Use*> uses;
+  auto* vhdlUnit = dynamic_cast<CVhdlDU*>(unit);
+  if (!vhdlUnit) return uses;
+  std::vector<DbObject*> objects;
+  vhdlUnit->GetUses(objects);
+  for (DbObject* object : objects) {
+    if (auto* use = dynamic_cast<Use*>(object)) uses.push_back(use);
+  }
+  return uses;
+}
+
+}  // namespace
+
+CitI::Result CElaborator::ProcessUseClauses(CElabTables& tables, const Port::StringBase& qualified,
+                                            DbObject* unit, const Port::StringBase& library) {
+  for (Use* use : UsesOf(unit)) {
+    UseParts parts = SplitUseClause(*this, tables, *use, library);
+    bool inWork = ModeOneEqual(parts.library, "work");
+    if (!inWork && IsOneOf(parts.library, kUntrackedUseLibraries)) continue;
+    // A package named with its library is looked for in that library.
+    const Port::StringBase& packageLibrary = inWork || parts.library.IsEmpty() ? library : parts.library;
+    Port::StringBase target = ResolvePackage(tables, parts.package, packageLibrary);
+    if (target.IsEmpty())
+      target = Qualify(packageLibrary, Formatted("PackageDecl|%s", parts.package));
+    else
+      CountReference(tables, target);
+    CitI::Result result = AddDepends(tables, qualified, target);
+    if (result == CitI::kOk) result = AddInstanceLabel(tables, qualified, {});
+    if (result != CitI::kOk) return result;
+  }
+  return CitI::kOk;
+}
+
+Port::StringBase CElaborator::InstanceTarget(CElabTables& tables, DbObject* child,
+                                             const Port::StringBase& library, Port::StringBase& label) {
+  Port::StringBase target;
+  if (auto* component = dynamic_cast<CompInst*>(child);
+      component && child->GetType() == DbType::kComponentInstantiation) {
+    label = component->GetLabel();
+    const Port::StringBase& name = component->GetComponentName();
+    target = component->GetDesignUnitTypeId() == VerilogInstanceTypeId()
+                 ? ResolveModuleRef(tables, name, library)
+                 : ResolveEntityRef(tables, name, {}, library);
+    if (target.IsEmpty()) return Qualify(library, Formatted("Architecture|%s", name));
+  } else if (auto* entity = dynamic_cast<EntityInst*>(child);
+             entity && child->GetType() == DbType::kEntityInstantiation) {
+    label = entity->GetLabel();
+    target = ResolveEntityRef(tables, entity->GetEntityName(), entity->GetArchitectureName(), library);
+    if (target.IsEmpty()) {
+      Port::StringBase entityLibrary;
+      Port::StringBase entityName;
+      SplitDottedName(entity->GetEntityName(), entityLibrary, entityName);
+      const Port::StringBase& text =
+          ModeOneEqual(entityLibrary, "work") ? entityName : entity->GetEntityName();
+      return Qualify(library, Formatted("Architecture|%s|%s", text, entity->GetArchitectureName()));
+    }
+  }
+  if (!target.IsEmpty()) CountReference(tables, target);
+  return target;
+}
+
+CitI::Result CElaborator::ProcessInstances(CElabTables& tables, const Port::StringBase& qualified,
+                                           DbObject* unit, const Port::StringBase& library) {
+  for (DbObject* child : unit->GetChildren()) {
+    Port::StringBase label;
+    Port::StringBase target = InstanceTarget(tables, child, library, label);
+    // Only instances take part: a label without a target would shift every later label against
+    // its target.
+    if (target.IsEmpty()) continue;
+    if (qualified.IsEmpty() || library.IsEmpty()) return CitI::kInvalidArg;
+    CitI::Result result = AddDepends(tables, qualified, target);
+    if (result == CitI::kOk) result = AddInstanceLabel(tables, qualified, label);
+    if (result != CitI::kOk) return result;
+
+    auto* instance = Prjrep::QueryAs<IHdlElement>(child);
+    if (!instance) return CitI::kInvalidArg;
+    Port::StringBase instanceKey;
+    instanceKey.Format("%s|%s|%s", qualified.c_str(), target.c_str(), label.c_str());
+    IHdlElement*& stored = tables.m_IHdlElementInstanceNameMap[instanceKey];
+    if (!stored) stored = instance;
+  }
+  return CitI::kOk;
+}
+
+CitI::Result CElaborator::ProcessPrimaryUnit(CElabTables& tables, const Port::StringBase& qualified,
+                                             DbObject* unit, const Port::StringBase& library) {
+  Port::StringBase target;
+  if (auto* arch = dynamic_cast<Arch*>(unit)) {
+    target = ResolvePrimaryEntity(tables, arch->GetEntityName(), library);
+    if (target.IsEmpty())
+      target = Qualify(library, Formatted("Entity|%s", arch->GetEntityName()));
+    else
+      CountReference(tables, target);
+  } else if (auto* body = dynamic_cast<PackageBody*>(unit)) {
+    target = ResolvePackage(tables, body->GetPackageName(), library);
+    if (target.IsEmpty())
+      target = Qualify(library, Formatted("PackageDecl|%s", body->GetPackageName()));
+    else
+      CountReference(tables, target);
+  }
+  if (target.IsEmpty()) return CitI::kInvalidArg;
+  CitI::Result result = AddDepends(tables, qualified, target);
+  if (result != CitI::kOk) return result;
+  Port::StringBase targetLibrary;
+  Port::StringBase targetKey;
+  SplitQualifiedName(target, targetLibrary, targetKey);
+  return AddInstanceLabel(tables, Qualify(library, targetKey), {});
+}
+
+CitI::Result CElaborator::ProcessElement(CElabTables& tables, const Port::StringBase& name,
+                                         IHdlElement* element) {
+  if (!element) return CitI::kInvalidArg;
+  DbObject* unit = DesignObjectOf(element);
+  if (!unit) return CitI::kFail;
+  Port::StringBase library = LibraryOf(element);
+  Port::StringBase qualified = Qualify(library, name);
+
+  if (tables.m_DependsTable.count(qualified))
+    Messages(__LINE__)->issueInfo(ElabText::kDuplicateName, name.c_str());
+
+  std::uint32_t type = unit->GetType();
+  CitI::Result result = CitI::kOk;
+  if (type & ElabMask::kVhdlUnit) result = ProcessUseClauses(tables, qualified, unit, library);
+  if (result == CitI::kOk && (type & ElabMask::kContainsInstances))
+    result = ProcessInstances(tables, qualified, unit, library);
+  if (result == CitI::kOk && (type & ElabMask::kHasPrimaryUnit))
+    result = ProcessPrimaryUnit(tables, qualified, unit, library);
+  if (result == CitI::kOk && !(type & ElabMask::kKnownUnit))
+    result = AddInstanceLabel(tables, qualified, ElabText::kUnknownType);
+  return result;
+}
+
+// ---- the run -------------------------------------------------------------------------------------
+
+CitI::Result CElaborator::Elaborate(CitI::IInterface* project, IHdlDesignUnitIterator* elements,
+                                    IHdlNetListNode** root) {
+  Prjrep::AutoOut<IHdlNetListNode> out(root);
+  if (!project || !elements || out.IsMissing()) return CitI::kInvalidArg;
+  auto* hdlProject = Prjrep::ObjectCast<CHdlProject>(project);
+  CLibRefs* libraryReferences = hdlProject ? hdlProject->getLibraryReferences() : nullptr;
+  if (!libraryReferences) return CitI::kFail;
+
+  CElabTables tables;
+  DuplicateList duplicates;
+  CitI::Result result = RegisterDesignUnits(tables, elements, duplicates);
+  if (result != CitI::kOk) return result;
+  for (const auto& [name, element] : tables.m_piHdlElementMultiMapNames) {
+    result = ProcessElement(tables, name, element);
+    if (result != CitI::kOk) return result;
+  }
+
+  Prjrep::AutoPtr<IHdlNetListNode> tree;
+  result = CreateNetListNode({}, nullptr, nullptr, tree.Out());
+  if (result != CitI::kOk) return result;
+  result = BuildHierarchy(tables, libraryReferences, tree.Get());
+  if (result == CitI::kOk) result = StripDuplicateSuffixes(duplicates, tree.Get());
+  if (result != CitI::kOk) return result;
+  Prjrep::QueryAs<IHdlNetListNodeInternal>(tree.Get())->ComputePaths({});
+  out.Set(tree.Get());
+  return CitI::kOk;
+}
+
+namespace {
+
+struct MissingFile {
+  IHdlFile* file;
+  std::uint64_t orderKey;
+  Port::StringBase fullName;
+};
+
+bool HasNoDesignUnit(CHdlFile* file) {
+  IHdlDesignUnitSet* units = file->GetUnitSet();
+  Prjrep::AutoRelease<IHdlDesignUnitIterator> unit;
+  if (!units || units->CreateIterator(unit.Out()) != CitI::kOk || !unit) return true;
+  // Library clauses, use clauses and instances alone do not put a file into the hierarchy.
+  for (; !unit->IsDone(); unit->Next()) {
+    DbObject* object = DesignObjectOf(unit->Current());
+    if (object && (object->GetType() & DbType::kDesignUnitKinds)) return false;
+  }
+  return true;
+}
+
+std::vector<MissingFile> FilesWithoutUnits(IHdlFileIterator* files) {
+  std::vector<MissingFile> missing;
+  for (files->First(); !files->IsDone(); files->Next()) {
+    IHdlFile* file = files->Current();
+    auto* hdlFile = Prjrep::ObjectCast<CHdlFile>(file);
+    if (!hdlFile) continue;
+    Port::StringBase plugin;
+    file->getPluginName(&plugin);
+    if (plugin != "PLUGIN_Vhdl" && plugin != "PLUGIN_Verilog") continue;
+    if (!HasNoDesignUnit(hdlFile)) continue;
+    MissingFile entry{file, 0, {}};
+    file->getOrderKey(&entry.orderKey);
+    hdlFile->GetFullFileName(entry.fullName);
+    missing.push_back(std::move(entry));
+  }
+  // Ascending order key; equal keys by name, so the result does not depend on addresses.
+  std::sort(missing.begin(), missing.end(), [](const MissingFile& a, const MissingFile& b) {
+    if (a.orderKey != b.orderKey) return a.orderKey < b.orderKey;
+    return a.fullName < b.fullName;
+  });
+  return missing;
+}
+
+}  // namespace
+
+CitI::Result CElaborator::AddMissingFileNodes(IHdlNetListNode* root, IHdlFileIterator* files) {
+  // Placeholders need a root to stand under; without files there is nothing to add.
+  auto* rootInternal = Prjrep::QueryAs<IHdlNetListNodeInternal>(root);
+  if (!rootInternal) return CitI::kInvalidArg;
+  if (!files) return CitI::kOk;
+  for (const MissingFile& entry : FilesWithoutUnits(files)) {
+    Prjrep::AutoRelease<CitI::IInterface> unit(new CMissingFileDU(entry.file));
+    auto* element = Prjrep::QueryAs<IHdlElement>(unit.Get());
+    Port::StringBase name;
+    DesignObjectOf(unit.Get())->GetDesignUnitKey(name);
+    Prjrep::AutoPtr<IHdlNetListNode> node;
+    if (CreateNetListNode(name, element, nullptr, node.Out()) != CitI::kOk) continue;
+    rootInternal->AddChildFirst(node.Get());
+  }
+  return CitI::kOk;
+}
+
+// ---- the tree ------------------------------------------------------------------------------------
+
+CitI::Result CElaborator::CreateNetListNode(const Port::StringBase& name, IHdlElement* element,
+                                            IHdlNetListNode* parent, IHdlNetListNode** out) {
+  Prjrep::AutoOut<IHdlNetListNode> result(out);
+  if (result.IsMissing()) return CitI::kInvalidArg;
+  auto node = Prjrep::CreateInstanceAs<IHdlNetListNode>(ClassIds::CNetListNode());
+  auto* internal = Prjrep::QueryAs<IHdlNetListNodeInternal>(node.Get());
+  if (!internal) return CitI::kFail;
+  internal->SetElement(element);
+  SetNodeNameFields(node.Get(), name);
+  if (auto* parentInternal = Prjrep::QueryAs<IHdlNetListNodeInternal>(parent)) {
+    CitI::Result linked = parentInternal->AddChild(node.Get());
+    if (linked != CitI::kOk) return linked;
+  }
+  result.Set(node.Get());
+  return CitI::kOk;
+}
+
+CitI::Result CElaborator::SetNodeNameFields(IHdlNetListNode* node, const Port::StringBase& name) {
+  auto* internal = Prjrep::QueryAs<IHdlNetListNodeInternal>(node);
+  if (!internal) return CitI::kInvalidArg;
+  internal->SetName(name);
+  std::vector<Port::StringBase> parts = SplitKeepingEmpty(name, '|');
+  internal->SetKind(parts[0]);
+  if (parts.size() > 1) internal->SetUnitName(parts[1]);
+  if (parts.size() > 2) internal->SetArchitectureName(parts[2]);
+  return CitI::kOk;
+}
+
+CitI::Result CElaborator::FindElementByKey(const CElabTables& tables, const Port::StringBase& qualifiedKey,
+                                           bool exact, IHdlElement** out) const {
+  if (!out) return CitI::kInvalidArg;
+  *out = nullptr;
+  if (qualifiedKey.IsEmpty()) return CitI::kInvalidArg;
+  Port::StringBase library;
+  Port::StringBase key;
+  SplitQualifiedName(qualifiedKey, library, key);
+  if (library.IsEmpty()) library = "work";
+  IHdlElement* element = FindRegisteredElement(tables, key, library, exact);
+  if (element && ModeOneEqual(LibraryOf(element), library)) *out = element;
+  return CitI::kOk;
+}
+
+CitI::Result CElaborator::BuildHierarchy(CElabTables& tables, CLibRefs* libraryReferences,
+                                         IHdlNetListNode* root) {
+  if (!root) return CitI::kInvalidArg;
+  std::vector<std::pair<Port::StringBase, std::uint32_t>> units(
+      tables.m_ElementNameDependencyCountMap.begin(), tables.m_ElementNameDependencyCountMap.end());
+  VisitedMap visited;
+  for (const auto& unit : units) visited.emplace(unit.first, false);
+  // Units that nothing references come first; the map's byte order breaks ties.
+  std::stable_sort(units.begin(), units.end(),
+                   [](const auto& a, const auto& b) { return a.second < b.second; });
+
+  MissingNodeList missing;
+  for (const auto& [name, count] : units) {
+    if (visited[name]) continue;
+    IHdlElement* element = nullptr;
+    FindElementByKey(tables, name, true, &element);
+    Port::StringBase library;
+    Port::StringBase key;
+    SplitQualifiedName(name, library, key);
+    Prjrep::AutoPtr<IHdlNetListNode> node;
+    CitI::Result result = CreateNetListNode(key, element, root, node.Out());
+    if (result != CitI::kOk) return result;
+    Port::StringBase path;
+    result = BuildSubtree(tables, visited, missing, node.Get(), name, path);
+    if (result != CitI::kOk) return result;
+  }
+
+  for (CNetListNode* node : missing) {
+    bool isLibraryCell = false;
+    CitI::Result result = TestLibraryCell(tables, libraryReferences, node->AsNode(), &isLibraryCell);
+    if (result != CitI::kOk) return result;
+    node->SetLibraryCell(isLibraryCell);
+  }
+  return CitI::kOk;
+}
+
+void CElaborator::AttachInstanceElement(const CElabTables& tables, CNetListNode* child,
+                                        const Port::StringBase& instanceKey) {
+  auto found = tables.m_IHdlElementInstanceNameMap.find(instanceKey);
+  if (found != tables.m_IHdlElementInstanceNameMap.end() && found->second)
+    child->SetInstanceElement(found->second);
+}
+
+CitI::Result CElaborator::BuildSubtree(CElabTables& tables, VisitedMap& visited, MissingNodeList& missing,
+                                       IHdlNetListNode* node, const Port::StringBase& name,
+                                       Port::StringBase& path) {
+  if (!node) return CitI::kInvalidArg;
+  if (!Prjrep::QueryAs<IHdlNetListNodeInternal>(node)) return CitI::kFail;
+  visited[name] = true;
+
+  Port::StringBase marker = Formatted("|*%s|", name);
+  if (path.Find(marker.view()) != Port::StringBase::npos) {
+    Messages(__LINE__)->issueWarning(ElabText::kCircularReference, name.c_str());
+    return CitI::kFail;
+  }
+  path.Append(marker.view());
+
+  CitI::Result result = CitI::kOk;
+  const std::vector<Port::StringBase>* targets = FindDepends(tables, name);
+  const std::vector<Port::StringBase>* labels = FindInstanceLabels(tables, name);
+  for (std::size_t i = 0; targets && i < targets->size() && result == CitI::kOk; ++i) {
+    // Copied: building the subtree below may add entries to the tables.
+    Port::StringBase target = (*targets)[i];
+    IHdlElement* element = nullptr;
+    FindElementByKey(tables, target, true, &element);
+    Prjrep::AutoPtr<IHdlNetListNode> childInterface;
+    result = CreateNetListNode(target, element, node, childInterface.Out());
+    if (result != CitI::kOk) break;
+    CNetListNode* child = CNetListNode::FromInterface(childInterface.Get());
+    if (!element) missing.push_back(child);
+    if (labels && i < labels->size()) {
+      const Port::StringBase& label = (*labels)[i];
+      child->SetInstanceName(label);
+      // Keyed by the referring unit's qualified name, as the instances were stored.
+      Port::StringBase instanceKey;
+      instanceKey.Format("%s|%s|%s", name.c_str(), target.c_str(), label.c_str());
+      AttachInstanceElement(tables, child, instanceKey);
+    }
+    BuildSubtree(tables, visited, missing, childInterface.Get(), target, path);
+  }
+
+  path.Truncate(path.Length() - marker.Length());
+  return result;
+}
+
+bool CElaborator::AskCellLibraries(CLibRefs* libraryReferences, const Port::StringBase& cell,
+                                   const char* language) const {
+  for (const char* library : kCellLibraries) {
+    if (libraryReferences->HasLibraryUnit(library, "*", "all", cell, language)) return true;
+  }
+  return false;
+}
+
+bool CElaborator::AskUseClauses(const CElabTables& tables, CLibRefs* libraryReferences, DbObject* unit,
+                                const Port::StringBase& cell) const {
+  Port::StringBase library = LibraryOf(unit);
+  for (Use* use : UsesOf(unit)) {
+    UseParts parts = SplitUseClause(*this, tables, *use, library);
+    if (libraryReferences->HasLibraryUnit(parts.library, parts.package, parts.item, cell, "VHDL"))
+      return true;
+  }
+  return false;
+}
+
+CitI::Result CElaborator::TestLibraryCell(CElabTables& tables, CLibRefs* libraryReferences,
+                                          IHdlNetListNode* node, bool* isLibraryCell) {
+  if (!isLibraryCell) return CitI::kInvalidArg;
+  *isLibraryCell = false;
+  CNetListNode* missingNode = CNetListNode::FromInterface(node);
+  if (!missingNode) return CitI::kInvalidArg;
+  if (!libraryReferences) return CitI::kOk;
+
+  Port::StringBase unitName = missingNode->UnitName();
+  unitName.RemoveAll("Architecture|");
+  unitName.RemoveAll("|");
+  Port::StringBase cellLibrary;
+  Port::StringBase cell;
+  SplitDottedName(unitName, cellLibrary, cell);
+  if (!cellLibrary.IsEmpty()) return CitI::kOk;
+
+  CNetListNode* parent =
+      missingNode->Parents().empty() ? nullptr : CNetListNode::FromInterface(missingNode->Parents().front());
+  DbObject* parentUnit = parent ? DesignObjectOf(parent->GetElement()) : nullptr;
+  if (!parentUnit) return CitI::kOk;
+  if (parentUnit->GetType() == DbType::kModule) {
+    *isLibraryCell = AskCellLibraries(libraryReferences, cell, "Verilog");
+    return CitI::kOk;
+  }
+  if (parentUnit->GetType() != DbType::kArchitecture) return CitI::kOk;
+
+  if (AskCellLibraries(libraryReferences, cell, "VHDL") ||
+      AskUseClauses(tables, libraryReferences, parentUnit, cell)) {
+    *isLibraryCell = true;
+    return CitI::kOk;
+  }
+  for (IHdlNetListNode* sibling : parent->Children()) {
+    DbObject* siblingUnit = DesignObjectOf(sibling->GetElement());
+    if (!siblingUnit || siblingUnit->GetType() != DbType::kEntity) continue;
+    *isLibraryCell = AskUseClauses(tables, libraryReferences, siblingUnit, cell);
+    break;
+  }
+  return CitI::kOk;
+}
+
+CitI::Result CElaborator::StripDuplicateSuffixes(const DuplicateList& duplicates, IHdlNetListNode* root) {
+  CNetListNode* rootNode = CNetListNode::FromInterface(root);
+  if (!rootNode) return CitI::kInvalidArg;
+  for (IHdlElement* duplicate : duplicates) {
+    for (IHdlNetListNode* child : rootNode->Children()) {
+      if (!SameObject(child->GetElement(), duplicate)) continue;
+      Port::StringBase name = CNetListNode::FromInterface(child)->Name();
+      std::size_t start = name.Find(ElabText::kDuplicateStart);
+      std::size_t end = name.Find(ElabText::kDuplicateEnd, start == Port::StringBase::npos ? 0 : start);
+      if (start == Port::StringBase::npos || end == Port::StringBase::npos) continue;
+      end += std::string_view(ElabText::kDuplicateEnd).size();
+      Port::StringBase stripped = name.Left(start) + name.Mid(end).view();
+      SetNodeNameFields(child, stripped);
+    }
+  }
+  return CitI::kOk;
+}
+
+// ---- dumps ---------------------------------------------------------------------------------------
+
+void CElaborator::DumpTables(const CElabTables& tables) const {
+  std::printf("\n\n>>> m_sArchitectureMultiMapList <<<\n");
+  for (const auto& [key, unit] : tables.m_sArchitectureMultiMapList) {
+    std::printf("  %s -- %s\n", key.c_str(), unit.library.c_str());
+    for (const Port::StringBase& text : unit.keys) std::printf("   %s\n", text.c_str());
+  }
+  std::printf("\n\n>>> m_sElementNameInstanceList <<<\n");
+  for (const auto& [key, labels] : tables.m_sElementNameInstanceList) {
+    std::printf("  %s\n", key.c_str());
+    for (const Port::StringBase& label : labels) std::printf("   %s\n", label.c_str());
+  }
+  std::printf("\n\n>>> m_IHdlElementInstanceNameMap <<<\n");
+  for (const auto& [key, element] : tables.m_IHdlElementInstanceNameMap) {
+    Port::StringBase partition;
+    if (auto* properties = Prjrep::QueryAs<IHdlDUProperties>(element))
+      properties->GetProperty("PARTITION", &partition);
+    std::printf("  %s, Prop: %s, Ptr: %p\n", key.c_str(), partition.c_str(), static_cast<void*>(element));
+  }
+  std::printf("\n\n>>> m_ElementNameDependencyCountMap <<<\n");
+  for (const auto& [key, count] : tables.m_ElementNameDependencyCountMap)
+    std::printf("  %s -- %u\n", key.c_str(), static_cast<unsigned>(count));
+  std::printf("\n\n>>> m_DependsTable <<<\n");
+  for (const auto& [key, targets] : tables.m_DependsTable) {
+    std::printf("  %s\n", key.c_str());
+    for (const Port::StringBase& target : targets) std::printf("    %s\n", target.c_str());
+  }
+  std::printf("\n\n>>> m_piHdlElementMultiMapNames <<<\n");
+  for (const auto& [key, element] : tables.m_piHdlElementMultiMapNames)
+    std::printf("  %s - %s Ptr: %p\n", LibraryOf(element).c_str(), key.c_str(), static_cast<void*>(element));
+}
+
+CitI::Result CElaborator::DumpTree(IHdlNetListNode* node, int depth) const {
+  CNetListNode* tree = CNetListNode::FromInterface(node);
+  if (!tree) return CitI::kInvalidArg;
+  std::string indent;
+  for (int i = 0; i < depth; ++i) indent += "|  ";
+  const char* in = indent.c_str();
+  std::printf("%sInstance Name    : %s\n", in, tree->InstanceName().c_str());
+  std::printf("%sModule Name      : %s\n", in, tree->UnitName().c_str());
+  std::printf("%sArchitecture Name: %s\n", in, tree->ArchitectureName().c_str());
+  Port::StringBase partition;
+  if (tree->GetPartition(partition) == CitI::kOk && !partition.IsEmpty())
+    std::printf("%sPartition: %s\n", in, partition.c_str());
+  Prjrep::AutoRelease<IHdlFile> file;
+  if (tree->GetElement() && tree->GetElement()->GetFile(file.Out()) == CitI::kOk && file) {
+    Port::StringBase directory;
+    Port::StringBase fileName;
+    file->getFileName(&directory, &fileName);
+    std::printf("%sFile             : %s%s\n", in, directory.c_str(), fileName.c_str());
+  }
+  for (IHdlNetListNode* child : tree->Children()) {
+    std::printf("%s-----------------------------\n", in);
+    DumpTree(child, depth + 1);
+  }
+  return CitI::kOk;
+}
+
+}  // namespace Vad

@@ -1,0 +1,1 @@
+-- Nothing but comments: this file yields no design unit.
