@@ -1,0 +1,251 @@
+#include "CCompileOrder.h"
+
+#include <algorithm>
+#include <boost/graph/depth_first_search.hpp>
+#include <boost/graph/dijkstra_shortest_paths.hpp>
+#include <boost/graph/topological_sort.hpp>
+#include <iterator>
+#include <limits>
+#include <memory>
+
+#include "DbObject.h"
+#include "NetListWalk.h"
+#include "Port/InitObjects.h"
+#include "Port/MsgManData.h"
+#include "Prjrep/AutoPtr.h"
+#include "Prjrep/Casts.h"
+#include "Prjrep/TSequenceSetHelper.h"
+
+namespace Vad {
+namespace {
+
+constexpr const char* kRevision = "1.1";
+constexpr std::uint32_t kDeclarationUnits = DbType::kEntity | DbType::kPackageDecl;
+constexpr std::int32_t kUnreached = std::numeric_limits<std::int32_t>::max();
+
+std::unique_ptr<Port_MsgManData> Message(int line) {
+  return Port_MsgManData::createObject(CompileOrderText::kCategory, CompileOrderText::kSource, line,
+                                       kRevision);
+}
+
+bool IsDeclarationUnit(IHdlElement* element) {
+  auto* unit = Prjrep::ImplementationCast<DbObject>(element);
+  return unit && (unit->GetType() & kDeclarationUnits);
+}
+
+// The root that elaboration makes: no element, no parent, no name.
+bool IsUnnamedRoot(IHdlNetListNode* node) {
+  if (node->GetElement()) return false;
+  Prjrep::AutoRelease<IHdlNetListNodeIterator> parent;
+  if (node->GetParents(parent.Out()) != CitI::kOk || !parent || !parent->IsDone()) return false;
+  auto* internal = Prjrep::QueryAs<IHdlNetListNodeInternal>(node);
+  Port::StringBase name;
+  return internal && internal->GetName(&name) == CitI::kOk && name.IsEmpty();
+}
+
+class BackEdgeRecorder : public boost::default_dfs_visitor {
+ public:
+  BackEdgeRecorder(std::vector<CCompileOrder::BackEdge>& backEdges, bool& cycleFound)
+      : backEdges_(&backEdges), cycleFound_(&cycleFound) {}
+
+  template <class Edge, class Graph>
+  void back_edge(Edge edge, const Graph& graph) {
+    *cycleFound_ = true;
+    backEdges_->emplace_back(boost::source(edge, graph), boost::target(edge, graph));
+  }
+
+ private:
+  std::vector<CCompileOrder::BackEdge>* backEdges_;
+  bool* cycleFound_;
+};
+
+}  // namespace
+
+Port::StringBase CCompileOrder::DisplayNameOf(IHdlFile* file) {
+  Port::StringBase directory;
+  Port::StringBase fileName;
+  if (!file || file->getFileName(&directory, &fileName) != CitI::kOk) {
+    return Port::StringBase(CompileOrderText::kUnnamedFile);
+  }
+  directory.Append(fileName.view());
+  return directory;
+}
+
+CitI::Result CCompileOrder::ComputeCompileOrder(IHdlNetListNode* node, IHdlFileIterator** out) {
+  if (!node || !out) return CitI::kInvalidArg;
+  *out = nullptr;
+  ClearGraph();
+  CitI::Result status = BuildFileGraph(node, false);
+  if (status == CitI::kOk && FindBackEdges()) status = RelaxAfterStrictCycles(node);
+  return status == CitI::kOk ? EmitOrder(out) : status;
+}
+
+CitI::Result CCompileOrder::RelaxAfterStrictCycles(IHdlNetListNode* node) {
+  Message(__LINE__)->issueWarning("%s", CompileOrderText::kStrictCycle);
+  CitI::Result status = ReportCycles(true);
+  if (status != CitI::kOk) return status;
+  Message(__LINE__)->issueWarning("%s", CompileOrderText::kRelaxing);
+  ClearGraph();
+  status = BuildFileGraph(node, true);
+  if (status != CitI::kOk) return status;
+  if (FindBackEdges()) return CutRelaxedCycles();
+  Message(__LINE__)->issueWarning("%s", CompileOrderText::kRelaxedOrderValid);
+  return CitI::kOk;
+}
+
+CitI::Result CCompileOrder::CutRelaxedCycles() {
+  Message(__LINE__)->issueWarning("%s", CompileOrderText::kRelaxedCycle);
+  CitI::Result status = ReportCycles(true);
+  if (status != CitI::kOk) return status;
+  Message(__LINE__)->issueWarning("%s", CompileOrderText::kBreaking);
+  BreakCycles();
+  if (FindBackEdges()) {
+    Message(__LINE__)->issueError("%s", CompileOrderText::kUnbreakable);
+    return CitI::kFail;
+  }
+  Message(__LINE__)->issueWarning("%s", CompileOrderText::kNoValidOrder);
+  return CitI::kOk;
+}
+
+void CCompileOrder::ClearGraph() {
+  graph_.clear();
+  vertices_.clear();
+  backEdges_.clear();
+  cycleFound_ = false;
+}
+
+CitI::Result CCompileOrder::BuildFileGraph(IHdlNetListNode* node, bool relaxed) {
+  if (!node) return CitI::kInvalidArg;
+  CitI::Result status = CitI::kOk;
+  NetListWalk::WalkPreOrder(node, [&](IHdlNetListNode* current) {
+    // The whole project (or a reduced unit tree) hangs below a root that has no file of its own.
+    if (current == node && IsUnnamedRoot(current)) return NetListWalk::Step::kDescend;
+    if (AddNodeDependencies(current, relaxed, status)) return NetListWalk::Step::kDescend;
+    return status == CitI::kOk ? NetListWalk::Step::kSkipChildren : NetListWalk::Step::kStop;
+  });
+  return status;
+}
+
+bool CCompileOrder::AddNodeDependencies(IHdlNetListNode* node, bool relaxed, CitI::Result& status) {
+  Prjrep::AutoPtr<IHdlFile> file = NetListWalk::SourceFileOf(node);
+  if (!file) return false;
+  Vertex user = 0;
+  status = GetFileVertex(file.Get(), &user);
+  if (status != CitI::kOk) return false;
+  for (IHdlNetListNode* child : NetListWalk::ChildrenOf(node)) {
+    Prjrep::AutoPtr<IHdlFile> childFile = NetListWalk::SourceFileOf(child);
+    if (!childFile) continue;
+    Vertex used = 0;
+    status = GetFileVertex(childFile.Get(), &used);
+    if (status != CitI::kOk) return false;
+    if (used == user) continue;
+    if (relaxed && !IsDeclarationUnit(child->GetElement())) continue;
+    AddEdge(user, used);
+  }
+  return true;
+}
+
+void CCompileOrder::AddEdge(Vertex from, Vertex to) { boost::add_edge(from, to, 1, graph_); }
+
+CitI::Result CCompileOrder::GetFileVertex(IHdlFile* file, Vertex* out) {
+  if (!file || !out) return CitI::kInvalidArg;
+  auto [entry, added] = vertices_.try_emplace(file, 0);
+  if (added) entry->second = boost::add_vertex(FileVertex{DisplayNameOf(file), file}, graph_);
+  *out = entry->second;
+  return CitI::kOk;
+}
+
+bool CCompileOrder::FindBackEdges() {
+  backEdges_.clear();
+  cycleFound_ = false;
+  if (boost::num_vertices(graph_) == 0) return false;
+  boost::depth_first_search(graph_, boost::visitor(BackEdgeRecorder(backEdges_, cycleFound_)));
+  return cycleFound_;
+}
+
+CitI::Result CCompileOrder::ReportCycles(bool report) {
+  FindBackEdges();
+  if (!cycleFound_ || !report) return CitI::kOk;
+  if (backEdges_.empty()) return CitI::kFail;
+  for (const BackEdge& backEdge : backEdges_) {
+    std::vector<Vertex> cycle;
+    CitI::Result status = ListCycleFiles(backEdge, cycle);
+    if (status != CitI::kOk) return status;
+    if (cycle.empty()) return CitI::kFail;
+    Message(__LINE__)->issueWarning("%s", CompileOrderText::kCycleHeader);
+    for (Vertex vertex : cycle) {
+      Message(__LINE__)->issueWarning(CompileOrderText::kCycleFileFormat, graph_[vertex].displayName.c_str());
+    }
+    Message(__LINE__)->issueWarning("%s", CompileOrderText::kCycleEnd);
+  }
+  return CitI::kOk;
+}
+
+CitI::Result CCompileOrder::ListCycleFiles(const BackEdge& backEdge, std::vector<Vertex>& out) const {
+  out.clear();
+  const std::size_t count = boost::num_vertices(graph_);
+  const auto [source, target] = backEdge;
+  if (source >= count || target >= count) return CitI::kInvalidArg;
+
+  std::vector<Vertex> predecessor(count);
+  std::vector<std::int32_t> distance(count);
+  auto index = boost::get(boost::vertex_index, graph_);
+  boost::dijkstra_shortest_paths(
+      graph_, target,
+      boost::predecessor_map(boost::make_iterator_property_map(predecessor.begin(), index))
+          .distance_map(boost::make_iterator_property_map(distance.begin(), index))
+          .weight_map(boost::get(boost::edge_weight, graph_)));
+
+  // An unreached vertex is its own predecessor, so the walk also stops there rather than loop.
+  for (Vertex current = source; current != target; current = predecessor[current]) {
+    if (distance[current] < 0 || distance[current] == kUnreached || out.size() >= count) {
+      Port_MsgManData::debugStub("%s", CompileOrderText::kNoShortestPath);
+      out.clear();
+      return CitI::kFail;
+    }
+    out.push_back(current);
+  }
+  out.push_back(target);
+  return CitI::kOk;
+}
+
+CitI::Result CCompileOrder::BreakCycles() {
+  for (const auto& [source, target] : backEdges_) boost::remove_edge(source, target, graph_);
+  return CitI::kOk;
+}
+
+std::vector<std::int32_t> CCompileOrder::ComputeLevels(const std::vector<Vertex>& reverseTopological) const {
+  std::vector<std::int32_t> level(boost::num_vertices(graph_), 0);
+  // From the back, every user is met before the files it uses, so its level is final by then.
+  for (auto vertex = reverseTopological.rbegin(); vertex != reverseTopological.rend(); ++vertex) {
+    for (auto edge : boost::make_iterator_range(boost::in_edges(*vertex, graph_))) {
+      level[*vertex] = std::max(level[*vertex], level[boost::source(edge, graph_)] + 1);
+    }
+  }
+  return level;
+}
+
+CitI::Result CCompileOrder::EmitOrder(IHdlFileIterator** out) const {
+  if (!out) return CitI::kInvalidArg;
+  std::vector<Vertex> order;
+  order.reserve(boost::num_vertices(graph_));
+  try {
+    boost::topological_sort(graph_, std::back_inserter(order));
+  } catch (const boost::not_a_dag&) {
+    return CitI::kFail;
+  }
+  const std::vector<std::int32_t> level = ComputeLevels(order);
+  // Stable, so that the rare ties (equal level and equal folded name) keep one fixed order.
+  std::stable_sort(order.begin(), order.end(), [&](Vertex a, Vertex b) {
+    if (level[a] != level[b]) return level[a] > level[b];
+    return graph_[a].displayName.Compare(graph_[b].displayName.view(), Port::kCompareNoCase) > 0;
+  });
+
+  auto files = Prjrep::TRefdSequenceSetHelper<IHdlFileSet>::New();
+  for (Vertex vertex : order) {
+    if (auto* file = Prjrep::QueryAs<IHdlFile>(graph_[vertex].file)) files->Add(file);
+  }
+  return files->CreateIterator(out);
+}
+
+}  // namespace Vad

@@ -1,0 +1,8 @@
+entity a is
+  port (clk : in bit);
+end entity a;
+
+architecture rtl of a is
+begin
+  u_b : entity work.b port map (clk => clk);
+end architecture rtl;

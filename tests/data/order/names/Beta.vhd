@@ -1,0 +1,3 @@
+entity Beta_unit is
+  port (clk : in bit);
+end entity Beta_unit;

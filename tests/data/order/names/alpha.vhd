@@ -1,0 +1,3 @@
+entity alpha_unit is
+  port (clk : in bit);
+end entity alpha_unit;

@@ -1,0 +1,3 @@
+package shared is
+  constant DEPTH : natural := 16;
+end package shared;

@@ -1,0 +1,3 @@
+entity a is
+  port (clk : in bit);
+end entity a;

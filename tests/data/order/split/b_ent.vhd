@@ -1,0 +1,3 @@
+entity b is
+  port (clk : in bit);
+end entity b;

@@ -1,0 +1,4 @@
+use work.util.all;
+entity leaf is
+  port (clk : in bit);
+end entity leaf;

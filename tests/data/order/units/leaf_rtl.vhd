@@ -1,0 +1,3 @@
+architecture rtl of leaf is
+begin
+end architecture rtl;

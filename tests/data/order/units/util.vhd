@@ -1,0 +1,3 @@
+package util is
+  constant RESET_LEVEL : bit := '0';
+end package util;
