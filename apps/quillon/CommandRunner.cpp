@@ -1,0 +1,231 @@
+#include "CommandRunner.h"
+
+#include <cinttypes>
+#include <cstdio>
+#include <fstream>
+#include <iostream>
+
+#include "DotOutput.h"
+#include "ExitStatus.h"
+#include "FileGraph.h"
+#include "Host/HostComponents.h"
+#include "IName.h"
+#include "JsonOutput.h"
+#include "ModuleLoader.h"
+#include "ProjectBuilder.h"
+#include "ProjectLoader.h"
+#include "RavA/Factory.h"
+#include "TextOutput.h"
+#include "TreeReader.h"
+#include "UnitFinder.h"
+
+namespace quillon {
+
+namespace {
+
+// What getCompileOrderByDU answers for a unit kind that has no order of its own, and for a unit
+// that is not in the hierarchy.
+constexpr CitI::Result kNoOrderForKind = 4;
+constexpr CitI::Result kNotInHierarchy = 5;
+
+std::string ResultText(CitI::Result result) {
+  char text[32];
+  if (result >= -1 && result <= 0xFFFF) {
+    std::snprintf(text, sizeof text, "%" PRId64, result);
+  } else {
+    std::snprintf(text, sizeof text, "0x%" PRIX64, static_cast<std::uint64_t>(result));
+  }
+  return text;
+}
+
+std::string KeyOf(Vad::IHdlDesignUnit* unit) {
+  Port::StringBase key;
+  if (auto* name = Prjrep::QueryAs<Prjrep::IName>(unit)) name->GetName(&key);
+  return key.str();
+}
+
+}  // namespace
+
+int CommandRunner::Run() {
+  if (options_.command == Command::kFactories) return ListFactories();
+  MessageLog log(options_.quiet, options_.verbose);
+  log_ = &log;
+  int status = RunOnProject();
+  log_ = nullptr;
+  return status;
+}
+
+int CommandRunner::BadInput(const std::string& text) {
+  std::fprintf(stderr, "quillon: %s\n", text.c_str());
+  return kExitBadInput;
+}
+
+int CommandRunner::Failed(const std::string& what, CitI::Result result) {
+  log_->ReportError(what + " (the module answered " + ResultText(result) + ")");
+  return kExitFailed;
+}
+
+int CommandRunner::Finished() const { return log_->HasErrors() ? kExitFailed : kExitDone; }
+
+int CommandRunner::ListFactories() {
+  ModuleLoader module;
+  std::string error;
+  if (!module.Load(error)) {
+    std::fprintf(stderr, "quillon: %s\n", error.c_str());
+    return kExitFailed;
+  }
+  std::printf("module %s registers %zu classes:\n", module.path().c_str(),
+              RavA::Factory::RegisteredClasses().size());
+  for (const Port::XUID& id : RavA::Factory::RegisteredClasses())
+    std::printf("  %s\n", id.ToString().c_str());
+  return kExitDone;
+}
+
+int CommandRunner::RunOnProject() {
+  ProjectSpec spec;
+  std::string error;
+  if (!ProjectLoader(spec).Load(options_, error)) return BadInput(error);
+
+  std::ofstream file;
+  if (!options_.outputPath.empty()) {
+    file.open(options_.outputPath, std::ios::binary | std::ios::trunc);
+    if (!file) return BadInput("cannot write the output file " + options_.outputPath);
+  }
+  std::ostream& out = file.is_open() ? static_cast<std::ostream&>(file) : std::cout;
+
+  ModuleLoader module;
+  if (!Host::RegisterHostComponents() || !module.Load(error)) {
+    log_->ReportError(error.empty() ? "the host components cannot be registered" : error);
+    return kExitFailed;
+  }
+  ProjectBuilder::SetInstallRootWhenUnset();
+  ProjectBuilder builder;
+  if (!builder.Build(spec, error)) {
+    log_->ReportError(error);
+    return kExitFailed;
+  }
+  int status = RunCommand(builder.project(), spec.files.size(), out);
+  out.flush();
+  if (!out) {
+    log_->ReportError("the output could not be written");
+    return kExitFailed;
+  }
+  return status;
+}
+
+int CommandRunner::RunCommand(Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out) {
+  Progress progress(options_.quiet, fileCount);
+  log_->SetProgress(&progress);
+  int status = ParseAndRun(project, fileCount, progress, out);
+  log_->SetProgress(nullptr);
+  return status;
+}
+
+int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount, Progress& progress,
+                               std::ostream& out) {
+  ProjectReader reader(project, progress);
+  if (CitI::Result result = reader.Parse(); result != CitI::kOk) {
+    int status = Failed("the sources could not be read", result);
+    if (options_.format == Format::kJson) JsonOutput::Messages(log_->messages(), out);
+    return status;
+  }
+  switch (options_.command) {
+    case Command::kUnits:
+      return Units(reader, out);
+    case Command::kTree:
+      return Tree(project, out);
+    case Command::kOrder:
+      return Order(reader, project, out);
+    case Command::kPorts:
+      return Ports(reader, out);
+    case Command::kCheck:
+      return Check(reader, fileCount, out);
+    case Command::kFactories:
+      break;
+  }
+  return kExitFailed;
+}
+
+int CommandRunner::Units(ProjectReader& reader, std::ostream& out) {
+  std::vector<FileInfo> files = reader.Files();
+  if (options_.format == Format::kJson) {
+    JsonOutput::Units(files, log_->messages(), out);
+  } else {
+    TextOutput::Units(files, out);
+  }
+  return Finished();
+}
+
+int CommandRunner::Tree(Vad::IHdlProject* project, std::ostream& out) {
+  TreeNodeInfo root;
+  CitI::Result result = TreeReader::Read(project, root);
+  int status = result == CitI::kOk ? Finished() : Failed("the design hierarchy is not available", result);
+  bool built = result == CitI::kOk;
+  if (options_.format == Format::kJson) {
+    JsonOutput::Tree(built ? &root : nullptr, log_->messages(), out);
+  } else if (built && options_.format == Format::kDot) {
+    DotOutput::Tree(root, out);
+  } else if (built) {
+    TextOutput::Tree(root, out);
+  }
+  return status;
+}
+
+int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out) {
+  std::vector<OrderEntry> order;
+  CitI::Result result;
+  if (options_.top.empty()) {
+    result = reader.Order(order);
+  } else {
+    Vad::IHdlDesignUnit* unit = UnitFinder(reader.designUnits()).Find(options_.top);
+    if (!unit) return BadInput("unknown design unit '" + options_.top + "'");
+    result = reader.OrderOf(unit, options_.byUnit, order);
+  }
+  bool ordered = result == CitI::kOk;
+  int status = Finished();
+  if (result == kNoOrderForKind) {
+    status = Failed("a compile order of a single unit is given for entities, architectures and modules only",
+                    result);
+  } else if (result == kNotInHierarchy) {
+    status = Failed("'" + options_.top + "' has no place in the design hierarchy", result);
+  } else if (!ordered) {
+    status = Failed("the compile order is not available", result);
+  }
+
+  if (options_.format == Format::kJson) {
+    JsonOutput::Order(ordered ? &order : nullptr, log_->messages(), out);
+  } else if (ordered && options_.format == Format::kDot) {
+    TreeNodeInfo root;
+    TreeReader::Read(project, root);
+    DotOutput::Order(FileGraph::Build(root, order), out);
+  } else if (ordered) {
+    TextOutput::Order(order, options_.withLibrary, out);
+  }
+  return status;
+}
+
+// The module offers ports through getDesignUnitPorts once its port extraction is in place; until
+// then the command names the unit and says so.
+int CommandRunner::Ports(ProjectReader& reader, std::ostream& out) {
+  Vad::IHdlDesignUnit* unit = UnitFinder(reader.designUnits()).Find(options_.unit);
+  if (!unit) return BadInput("unknown design unit '" + options_.unit + "'");
+  std::string key = KeyOf(unit);
+  log_->ReportError("port extraction is not available yet (unit " + key + ")");
+  if (options_.format == Format::kJson) JsonOutput::Ports(key, log_->messages(), out);
+  return kExitFailed;
+}
+
+int CommandRunner::Check(ProjectReader& reader, std::size_t fileCount, std::ostream& out) {
+  std::vector<OrderEntry> order;
+  CitI::Result result = reader.Order(order);
+  int status = result == CitI::kOk ? Finished() : Failed("the compile order is not available", result);
+  std::size_t units = reader.designUnits() ? reader.designUnits()->GetCount() : 0;
+  if (options_.format == Format::kJson) {
+    JsonOutput::Check(fileCount, units, log_->messages(), out);
+  } else {
+    TextOutput::CheckSummary(fileCount, units, log_->getErrCount(), log_->getWarnCount(), out);
+  }
+  return status;
+}
+
+}  // namespace quillon

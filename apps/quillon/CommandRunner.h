@@ -1,0 +1,43 @@
+// Runs one quillon command: loads the module, builds the project, asks the module and writes the
+// answer. Every problem ends in an exit status and a message, never in an exception.
+#pragma once
+
+#include <ostream>
+#include <string>
+
+#include "MessageLog.h"
+#include "Options.h"
+#include "ProjectReader.h"
+
+namespace quillon {
+
+class CommandRunner {
+ public:
+  explicit CommandRunner(const Options& options) : options_(options) {}
+
+  // The exit status (ExitStatus.h).
+  int Run();
+
+ private:
+  int ListFactories();
+  int RunOnProject();
+  int RunCommand(Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out);
+  int ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount, Progress& progress, std::ostream& out);
+  int Units(ProjectReader& reader, std::ostream& out);
+  int Tree(Vad::IHdlProject* project, std::ostream& out);
+  int Order(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out);
+  int Ports(ProjectReader& reader, std::ostream& out);
+  int Check(ProjectReader& reader, std::size_t fileCount, std::ostream& out);
+
+  // Reports the module's failure of `what` and returns kExitFailed.
+  int Failed(const std::string& what, CitI::Result result);
+  // The exit status of an operation that succeeded: kExitFailed when errors were reported.
+  int Finished() const;
+  // Writes "quillon: text" to standard error and returns kExitBadInput.
+  static int BadInput(const std::string& text);
+
+  const Options& options_;
+  MessageLog* log_ = nullptr;
+};
+
+}  // namespace quillon

@@ -1,0 +1,80 @@
+// Plain values that the commands read out of the module and the writers print. Nothing here holds
+// an interface pointer, so the writers never talk to the module.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace quillon {
+
+// A message of the host message system, as the JSON output lists it.
+struct MessageInfo {
+  std::string severity;  // "error", "warning" or "info"
+  std::string text;
+  std::string source;
+  int line = 0;
+};
+
+// One record of a file's design-unit set. Fields that a record kind does not have stay unset.
+struct UnitInfo {
+  std::string type;  // type name, as "Entity"
+  std::string name;
+  std::string key;  // design-unit key
+  std::string storeKey;
+  std::uint32_t line = 0;
+  std::optional<std::string> parent;  // the parent's store key
+  bool inGenerate = false;
+  bool unitFlag = false;
+  std::string partition;
+  std::optional<std::string> entity;
+  std::optional<std::string> architecture;
+  std::optional<std::string> component;
+  std::optional<std::string> library;
+  std::optional<std::string> package;
+  std::optional<std::string> item;
+};
+
+struct FileInfo {
+  std::string path;
+  std::string plugin;
+  std::string library;
+  std::vector<UnitInfo> units;
+};
+
+struct TreeNodeInfo {
+  std::string name;
+  std::string kind;
+  std::string unit;
+  std::string architecture;
+  std::string instance;
+  std::string path;
+  std::string type;
+  bool libraryCell = false;
+  std::string partition;
+  std::optional<std::string> elementType;
+  std::optional<std::string> file;
+  std::vector<TreeNodeInfo> children;
+};
+
+struct OrderEntry {
+  std::string path;
+  std::string library;
+  std::string plugin;
+};
+
+// The file dependency graph of a compile order: an edge from a file to a file it uses.
+struct FileEdge {
+  std::size_t from = 0;
+  std::size_t to = 0;
+  bool onCycle = false;
+};
+
+struct FileGraphInfo {
+  std::vector<std::string> files;
+  std::vector<FileEdge> edges;
+};
+
+}  // namespace quillon

@@ -1,0 +1,20 @@
+// Graphviz drawings: the hierarchy (tree) and the file dependency graph (order).
+#pragma once
+
+#include <ostream>
+
+#include "DesignModel.h"
+
+namespace quillon {
+
+class DotOutput {
+ public:
+  // One box a node below the root, labelled with instance label, unit, architecture and kind; library
+  // cells dashed, partitions with a double border.
+  static void Tree(const TreeNodeInfo& root, std::ostream& out);
+  // One box a file, numbered in compile order; an edge from a file to a file it uses, red and bold
+  // when it lies on a cycle.
+  static void Order(const FileGraphInfo& graph, std::ostream& out);
+};
+
+}  // namespace quillon

@@ -1,0 +1,46 @@
+// The message manager of quillon: takes the messages of the host message system (the module's
+// and quillon's own), keeps them for the JSON output, and writes them to standard error as
+// "ERROR: ", "WARNING: " or "INFO: " lines unless quiet.
+#pragma once
+
+#include <string_view>
+#include <vector>
+
+#include "DesignModel.h"
+#include "Port/MsgManData.h"
+#include "Port/MsgManDefault.h"
+#include "Progress.h"
+
+namespace quillon {
+
+class MessageLog : public Port_MsgManDefault {
+ public:
+  // Registers itself with the dispatcher in place of the default manager; `verbose` also sends
+  // the developer texts to standard error. Both are undone on destruction.
+  MessageLog(bool quiet, bool verbose);
+  ~MessageLog() override;
+
+  // An error message of quillon itself, through the message system like any other.
+  void ReportError(std::string_view text);
+
+  // A progress line to take off the terminal before a message is written; null for none.
+  void SetProgress(Progress* progress) { progress_ = progress; }
+
+  const std::vector<MessageInfo>& messages() const { return messages_; }
+  // True once an error (or worse) arrived.
+  bool HasErrors() const;
+
+  void onMessage(const Port_MsgRecord& record) override;
+  void writeMsgLines(MsgType type, const wchar_t* const* lines, int count) override;
+  void writeMsgEnd(MsgType type) override;
+
+ private:
+  bool quiet_;
+  Progress* progress_ = nullptr;
+  bool defaultWasRegistered_ = false;
+  bool sinkInstalled_ = false;
+  Port_MsgManData::DebugSink previousSink_;
+  std::vector<MessageInfo> messages_;
+};
+
+}  // namespace quillon

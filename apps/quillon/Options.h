@@ -1,0 +1,52 @@
+// The command line of quillon: what to do, on which sources, and how to write the answer.
+#pragma once
+
+#include <optional>
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace quillon {
+
+enum class Command { kUnits, kTree, kOrder, kPorts, kCheck, kFactories };
+enum class Format { kText, kJson, kDot };
+
+// One argument that names sources, in command-line order, with the library and plug-in that the
+// -l/--library and --plugin options before it put in effect (empty when none was given).
+struct SourceArgument {
+  enum class Kind { kFile, kProjectFile, kFileList };
+  Kind kind = Kind::kFile;
+  std::string path;
+  std::string library;
+  std::string plugin;
+};
+
+class Options {
+ public:
+  enum class Outcome { kRun, kHelpShown, kUsageError };
+
+  // Fills `options` from the arguments. kUsageError comes with a one-line reason in `error`;
+  // kHelpShown means the usage text was written to standard output.
+  static Outcome Parse(int argc, const char* const* argv, Options& options, std::string& error);
+
+  Command command = Command::kUnits;
+  std::string unit;  // the UNIT of `ports`
+  std::vector<SourceArgument> sources;
+
+  std::vector<std::string> defines;      // -D NAME[=VALUE]
+  std::vector<std::string> includeDirs;  // -I DIR
+  std::optional<std::string> target;
+  std::optional<std::string> family;
+  std::vector<std::pair<std::string, std::string>> properties;  // --property KEY=VALUE
+
+  std::string top;      // --top or --unit
+  bool byUnit = false;  // --unit
+  bool withLibrary = false;
+
+  Format format = Format::kText;
+  std::string outputPath;
+  bool quiet = false;
+  bool verbose = false;
+};
+
+}  // namespace quillon

@@ -1,0 +1,115 @@
+#include "ProjectReader.h"
+
+#include "FileFacts.h"
+#include "IHdlDesignUnit.h"
+#include "IHdlElaborationData.h"
+#include "PluginTable.h"
+#include "UnitRecordReader.h"
+
+namespace quillon {
+
+namespace {
+
+// The project parses Verilog files together (each parse sees the list of all of them), so only
+// the other files can be parsed one by one ahead of it without being parsed twice.
+bool ParsesAlone(Vad::IHdlFile* file) {
+  Port::StringBase plugin;
+  file->getPluginName(&plugin);
+  return !plugin.Equals("PLUGIN_Verilog", Port::kCompareNoCase);
+}
+
+template <class Iterator, class Visit>
+void ForEachIn(Iterator* iterator, Visit visit) {
+  if (!iterator) return;
+  for (iterator->First(); !iterator->IsDone(); iterator->Next()) {
+    if (auto* element = iterator->Current()) visit(element);
+  }
+}
+
+Prjrep::AutoRelease<Vad::IHdlFileIterator> FilesOf(Vad::IHdlProject* project) {
+  Prjrep::AutoRelease<Vad::IHdlFileIterator> files;
+  if (auto* set = Prjrep::QueryAs<Vad::IHdlFileSet>(project)) set->CreateIterator(files.Out());
+  return files;
+}
+
+std::vector<UnitInfo> UnitsOf(Vad::IHdlFile* file) {
+  std::vector<UnitInfo> units;
+  Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> iterator;
+  if (file->getDesignUnits(nullptr, iterator.Out()) != CitI::kOk) return units;
+  ForEachIn(iterator.Get(), [&](Vad::IHdlDesignUnit* unit) {
+    UnitInfo info;
+    UnitRecordReader::Read(unit, info);
+    units.push_back(std::move(info));
+  });
+  return units;
+}
+
+Vad::IHdlElaborationData* ElaborationOf(Vad::IHdlProject* project) {
+  return Prjrep::QueryAs<Vad::IHdlElaborationData>(project);
+}
+
+}  // namespace
+
+std::size_t ProjectReader::FileCount() const {
+  auto* set = Prjrep::QueryAs<Vad::IHdlFileSet>(project_);
+  return set ? set->GetCount() : 0;
+}
+
+void ProjectReader::ParseFilesOneByOne() {
+  if (!progress_.enabled()) return;
+  auto files = FilesOf(project_);
+  std::size_t total = FileCount(), done = 0;
+  ForEachIn(files.Get(), [&](Vad::IHdlFile* file) {
+    progress_.Step("parsing", ++done, total);
+    if (ParsesAlone(file)) file->parseIfNeeded();
+  });
+}
+
+CitI::Result ProjectReader::Parse() {
+  ParseFilesOneByOne();
+  progress_.Phase("collecting the design units");
+  CitI::Result result = project_->getAllDesignUnits(designUnits_.Out());
+  progress_.Clear();
+  return result;
+}
+
+std::vector<FileInfo> ProjectReader::Files() const {
+  std::vector<FileInfo> infos;
+  auto files = FilesOf(project_);
+  ForEachIn(files.Get(), [&](Vad::IHdlFile* file) {
+    OrderEntry facts = FileFacts::Describe(file);
+    infos.push_back({facts.path, facts.plugin, facts.library, UnitsOf(file)});
+  });
+  return infos;
+}
+
+std::vector<OrderEntry> ProjectReader::Describe(Vad::IHdlFileIterator* files) {
+  std::vector<OrderEntry> order;
+  ForEachIn(files, [&](Vad::IHdlFile* file) { order.push_back(FileFacts::Describe(file)); });
+  return order;
+}
+
+CitI::Result ProjectReader::Order(std::vector<OrderEntry>& order) const {
+  auto* elaboration = ElaborationOf(project_);
+  if (!elaboration) return CitI::kFail;
+  Prjrep::AutoRelease<Vad::IHdlFileIterator> files;
+  progress_.Phase("ordering the files");
+  CitI::Result result = elaboration->getCompileOrder(nullptr, files.Out());
+  progress_.Clear();
+  if (result == CitI::kOk) order = Describe(files.Get());
+  return result == CitI::kOk && !files ? CitI::kFail : result;
+}
+
+CitI::Result ProjectReader::OrderOf(Vad::IHdlDesignUnit* unit, bool byUnit,
+                                    std::vector<OrderEntry>& order) const {
+  auto* elaboration = ElaborationOf(project_);
+  if (!elaboration) return CitI::kFail;
+  Prjrep::AutoRelease<Vad::IHdlFileIterator> files;
+  progress_.Phase("ordering the files");
+  CitI::Result result = elaboration->getCompileOrderByDU(unit, byUnit, files.Out());
+  progress_.Clear();
+  if (result == CitI::kOk) order = Describe(files.Get());
+  return result == CitI::kOk && !files ? CitI::kFail : result;
+}
+
+}  // namespace quillon

@@ -1,0 +1,46 @@
+// Reads what the module derives from a built project: the design units of every file and the
+// compile orders. Every operation hands back the module's result; the caller reports failures.
+#pragma once
+
+#include <vector>
+
+#include "DesignModel.h"
+#include "HdlSets.h"
+#include "IHdlProject.h"
+#include "Prjrep/AutoPtr.h"
+#include "Progress.h"
+
+namespace Vad {
+class IHdlDesignUnit;
+}
+
+namespace quillon {
+
+class ProjectReader {
+ public:
+  ProjectReader(Vad::IHdlProject* project, Progress& progress) : project_(project), progress_(progress) {}
+
+  // Brings every file up to date and keeps the project's design units.
+  CitI::Result Parse();
+  // Entities, architectures, packages, package bodies, modules and generics of the last Parse.
+  Vad::IHdlDesignUnitSet* designUnits() const { return designUnits_.Get(); }
+  // Every file of the project's file set, with every record of its unit set. Does not parse.
+  std::vector<FileInfo> Files() const;
+
+  // The compile order of the whole project, or for `unit` (byUnit: the unit alone, else the unit
+  // and what it needs).
+  CitI::Result Order(std::vector<OrderEntry>& order) const;
+  CitI::Result OrderOf(Vad::IHdlDesignUnit* unit, bool byUnit, std::vector<OrderEntry>& order) const;
+
+  std::size_t FileCount() const;
+
+ private:
+  void ParseFilesOneByOne();
+  static std::vector<OrderEntry> Describe(Vad::IHdlFileIterator* files);
+
+  Vad::IHdlProject* project_;
+  Progress& progress_;
+  Prjrep::AutoPtr<Vad::IHdlDesignUnitSet> designUnits_;
+};
+
+}  // namespace quillon

@@ -1,0 +1,21 @@
+// What a project is made of before it is built: its properties and its source files.
+#pragma once
+
+#include <map>
+#include <string>
+#include <vector>
+
+namespace quillon {
+
+struct SourceFile {
+  std::string path;  // absolute
+  std::string library;
+  std::string plugin;
+};
+
+struct ProjectSpec {
+  std::map<std::string, std::string> properties;
+  std::vector<SourceFile> files;  // in the order given
+};
+
+}  // namespace quillon

@@ -1,0 +1,67 @@
+#include "TextOutput.h"
+
+#include <algorithm>
+#include <string>
+
+namespace quillon {
+
+namespace {
+
+std::string Plural(std::size_t count, const char* one, const char* many) {
+  return std::to_string(count) + " " + (count == 1 ? one : many);
+}
+
+// The set's order is by store key; people read a file from top to bottom.
+std::vector<const UnitInfo*> InLineOrder(const std::vector<UnitInfo>& units) {
+  std::vector<const UnitInfo*> ordered;
+  for (const UnitInfo& unit : units) ordered.push_back(&unit);
+  std::stable_sort(ordered.begin(), ordered.end(),
+                   [](const UnitInfo* a, const UnitInfo* b) { return a->line < b->line; });
+  return ordered;
+}
+
+}  // namespace
+
+void TextOutput::Units(const std::vector<FileInfo>& files, std::ostream& out) {
+  for (const FileInfo& file : files) {
+    for (const UnitInfo* unit : InLineOrder(file.units)) {
+      const std::string& shown = unit->key.find('|') == std::string::npos ? unit->name : unit->key;
+      out << file.path << ':' << unit->line << ": " << unit->type << ' ' << shown << " (library "
+          << file.library << ")\n";
+    }
+  }
+}
+
+void TextOutput::Tree(const TreeNodeInfo& root, std::ostream& out) {
+  for (const TreeNodeInfo& child : root.children) Node(child, 0, out);
+}
+
+void TextOutput::Node(const TreeNodeInfo& node, int depth, std::ostream& out) {
+  out << std::string(static_cast<std::size_t>(depth) * 2, ' ');
+  if (!node.instance.empty()) out << node.instance << ": ";
+  out << (node.unit.empty() ? node.name : node.unit);
+  if (!node.architecture.empty()) out << '(' << node.architecture << ')';
+  if (!node.kind.empty()) out << " [" << node.kind << ']';
+  if (node.file) out << "  " << *node.file;
+  if (node.libraryCell) out << " (library cell)";
+  if (!node.libraryCell && !node.elementType) out << " (not in the project)";
+  if (!node.partition.empty()) out << " (partition " << node.partition << ')';
+  out << '\n';
+  for (const TreeNodeInfo& child : node.children) Node(child, depth + 1, out);
+}
+
+void TextOutput::Order(const std::vector<OrderEntry>& order, bool withLibrary, std::ostream& out) {
+  for (const OrderEntry& entry : order) {
+    if (withLibrary) out << entry.library << ' ';
+    out << entry.path << '\n';
+  }
+}
+
+void TextOutput::CheckSummary(std::size_t files, std::size_t units, int errors, int warnings,
+                              std::ostream& out) {
+  out << Plural(files, "file", "files") << ", " << Plural(units, "design unit", "design units") << ": "
+      << Plural(static_cast<std::size_t>(errors), "error", "errors") << ", "
+      << Plural(static_cast<std::size_t>(warnings), "warning", "warnings") << '\n';
+}
+
+}  // namespace quillon

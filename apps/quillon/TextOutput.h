@@ -1,0 +1,28 @@
+// The text output of the commands, for people.
+#pragma once
+
+#include <ostream>
+#include <vector>
+
+#include "DesignModel.h"
+
+namespace quillon {
+
+class TextOutput {
+ public:
+  // One line a unit, in line order: FILE:LINE: TYPE KEY (library LIB). Records whose design-unit key is their
+  // type name alone (libraries, uses, instances) show their name instead.
+  static void Units(const std::vector<FileInfo>& files, std::ostream& out);
+  // The root's children and their subtrees, two blanks of indent a level: instance label, unit,
+  // architecture, kind, file and the flags (library cell, not in the project, partition).
+  static void Tree(const TreeNodeInfo& root, std::ostream& out);
+  // One path a line; with the library and a blank before it when asked.
+  static void Order(const std::vector<OrderEntry>& order, bool withLibrary, std::ostream& out);
+  // "N files, M design units: E errors, W warnings"
+  static void CheckSummary(std::size_t files, std::size_t units, int errors, int warnings, std::ostream& out);
+
+ private:
+  static void Node(const TreeNodeInfo& node, int depth, std::ostream& out);
+};
+
+}  // namespace quillon

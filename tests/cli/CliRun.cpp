@@ -1,0 +1,94 @@
+#include "CliRun.h"
+
+#include <fcntl.h>
+#include <spawn.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <cstring>
+#include <fstream>
+#include <iterator>
+#include <sstream>
+
+extern char** environ;
+
+namespace cli_test {
+
+namespace {
+
+std::string ReadFile(const std::string& path) {
+  std::ifstream in(path, std::ios::binary);
+  return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
+}
+
+std::vector<std::string> EnvironmentWith(const std::vector<std::pair<std::string, std::string>>& added) {
+  std::vector<std::string> entries;
+  for (char** entry = environ; *entry; ++entry) {
+    std::string text = *entry;
+    bool replaced = false;
+    for (const auto& [name, value] : added) replaced = replaced || text.rfind(name + "=", 0) == 0;
+    if (!replaced) entries.push_back(text);
+  }
+  for (const auto& [name, value] : added) entries.push_back(name + "=" + value);
+  return entries;
+}
+
+std::vector<char*> PointersTo(std::vector<std::string>& texts) {
+  std::vector<char*> pointers;
+  for (std::string& text : texts) pointers.push_back(text.data());
+  pointers.push_back(nullptr);
+  return pointers;
+}
+
+}  // namespace
+
+CliResult RunQuillon(const CliRun& run) {
+  ScopedTempDir capture;
+  std::string outPath = capture.Path("stdout"), errPath = capture.Path("stderr");
+  std::vector<std::string> argv{QUILLON_CLI_PATH};
+  argv.insert(argv.end(), run.args.begin(), run.args.end());
+  std::vector<std::string> environment = EnvironmentWith(run.environment);
+  std::vector<char*> argPointers = PointersTo(argv), envPointers = PointersTo(environment);
+
+  posix_spawn_file_actions_t actions;
+  posix_spawn_file_actions_init(&actions);
+  posix_spawn_file_actions_addopen(&actions, STDIN_FILENO, "/dev/null", O_RDONLY, 0);
+  posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, outPath.c_str(), O_WRONLY | O_CREAT | O_TRUNC,
+                                   0600);
+  posix_spawn_file_actions_addopen(&actions, STDERR_FILENO, errPath.c_str(), O_WRONLY | O_CREAT | O_TRUNC,
+                                   0600);
+  if (!run.workDir.empty()) posix_spawn_file_actions_addchdir_np(&actions, run.workDir.c_str());
+  pid_t child = 0;
+  int spawned =
+      posix_spawn(&child, argv[0].c_str(), &actions, nullptr, argPointers.data(), envPointers.data());
+  posix_spawn_file_actions_destroy(&actions);
+
+  CliResult result;
+  if (spawned != 0) {
+    result.err = std::string("cannot start quillon: ") + std::strerror(spawned);
+    return result;
+  }
+  int waitStatus = 0;
+  while (waitpid(child, &waitStatus, 0) < 0 && errno == EINTR) {
+  }
+  result.status = WIFEXITED(waitStatus) ? WEXITSTATUS(waitStatus) : 128 + WTERMSIG(waitStatus);
+  result.out = ReadFile(outPath);
+  result.err = ReadFile(errPath);
+  return result;
+}
+
+ScopedTextFile::ScopedTextFile(std::string_view text, std::string_view name) : path_(dir_.Path(name)) {
+  std::ofstream(path_, std::ios::binary) << text;
+}
+
+std::string DataDir() { return std::string(QUILLON_TEST_DATA_DIR) + "/cli"; }
+std::string DataPath(const std::string& name) { return DataDir() + "/" + name; }
+
+std::vector<std::string> Lines(const std::string& text) {
+  std::vector<std::string> lines;
+  std::istringstream in(text);
+  for (std::string line; std::getline(in, line);) lines.push_back(line);
+  return lines;
+}
+
+}  // namespace cli_test

@@ -1,0 +1,139 @@
+// The tree command end to end: the hierarchy that the module builds, in JSON, text and DOT.
+#include <gtest/gtest.h>
+
+#include <nlohmann/json.hpp>
+#include <string>
+#include <vector>
+
+#include "CliRun.h"
+
+namespace cli_test {
+namespace {
+
+using Json = nlohmann::json;
+
+Json TreeOf(const std::vector<std::string>& args) {
+  std::vector<std::string> all{"-q", "--format", "json", "tree"};
+  all.insert(all.end(), args.begin(), args.end());
+  CliResult result = RunQuillon(all);
+  EXPECT_EQ(result.status, 0) << result.err;
+  Json answer = Json::parse(result.out, nullptr, false);
+  EXPECT_FALSE(answer.is_discarded()) << result.out;
+  return answer;
+}
+
+std::string BaseName(const Json& path) {
+  if (!path.is_string()) return "-";
+  std::string text = path;
+  return text.substr(text.rfind('/') + 1);
+}
+
+std::string Text(const Json& value) { return value.is_string() ? value.get<std::string>() : "null"; }
+
+// One line a node below the root: indent, name, instance, path, type, element type, file.
+void Outline(const Json& node, int depth, std::vector<std::string>& lines) {
+  lines.push_back(std::string(depth * 2, ' ') + Text(node["name"]) + " | " + Text(node["instance"]) + " | " +
+                  Text(node["path"]) + " | " + Text(node["type"]) + " | " + Text(node["elementType"]) +
+                  " | " + BaseName(node["file"]));
+  for (const Json& child : node["children"]) Outline(child, depth + 1, lines);
+}
+
+std::vector<std::string> OutlineBelowRoot(const Json& root) {
+  std::vector<std::string> lines;
+  for (const Json& top : root["children"]) Outline(top, 0, lines);
+  return lines;
+}
+
+const Json* ChildWithInstance(const Json& node, const std::string& label) {
+  for (const Json& child : node["children"]) {
+    if (child["instance"] == label) return &child;
+  }
+  return nullptr;
+}
+
+TEST(Hierarchy, JsonTreeGivesEveryNodeItsNamesPathAndFile) {
+  Json answer = TreeOf({"-P", DataPath("mixed/project.json")});
+  const Json& root = answer["root"];
+  EXPECT_EQ(root["name"], "");
+  EXPECT_TRUE(root["elementType"].is_null());
+  EXPECT_TRUE(root["file"].is_null());
+  EXPECT_EQ(
+      OutlineBelowRoot(root),
+      (std::vector<std::string>{
+          "Architecture|top|rtl |  | /top | instance | Architecture | top.vhd",
+          "  work:Architecture|core|rtl | u_core | /top/u_core | instance | Architecture | core.vhd",
+          "    work:Architecture|lane|rtl | u_lane | /top/u_core/u_lane | instance | Architecture | lane.vhd",
+          "      work:Entity|lane |  |  | work:Entity | Entity | lane.vhd",
+          "    work:Entity|core |  |  | work:Entity | Entity | core.vhd",
+          "      shared:PackageDecl|shared_pkg |  |  | shared:PackageDecl | PackageDecl | shared_pkg.vhd",
+          "  work:Entity|top |  |  | work:Entity | Entity | top.vhd",
+      }));
+  const Json& core = *ChildWithInstance(root["children"][0], "u_core");
+  EXPECT_EQ(core["kind"], "work:Architecture");
+  EXPECT_EQ(core["unit"], "core");
+  EXPECT_EQ(core["architecture"], "rtl");
+  EXPECT_EQ(core["libraryCell"], false);
+  EXPECT_EQ(core["partition"], "");
+  EXPECT_EQ(core["file"], DataPath("mixed/core.vhd"));
+  EXPECT_EQ(answer["messages"], Json::array());
+}
+
+TEST(Hierarchy, UnitMissingFromTheProjectHasNoElementAndNoFile) {
+  Json answer = TreeOf({DataPath("stray/stray.vhd")});
+  ASSERT_EQ(answer["root"]["children"].size(), 1u);
+  const Json* mystery = ChildWithInstance(answer["root"]["children"][0], "u_mystery");
+  ASSERT_NE(mystery, nullptr) << answer.dump(2);
+  EXPECT_EQ((*mystery)["unit"], "mystery_block");
+  EXPECT_TRUE((*mystery)["elementType"].is_null());
+  EXPECT_TRUE((*mystery)["file"].is_null());
+  EXPECT_EQ((*mystery)["libraryCell"], false);
+
+  CliResult text = RunQuillon({"tree", DataPath("stray/stray.vhd")});
+  EXPECT_NE(text.out.find("  u_mystery: mystery_block [work:Architecture] (not in the project)\n"),
+            std::string::npos)
+      << text.out;
+}
+
+TEST(Hierarchy, TextTreeIndentsEachLevel) {
+  CliResult result = RunQuillon({"tree", "-P", DataPath("mixed/project.json")});
+  EXPECT_EQ(result.status, 0) << result.err;
+  auto file = [](const char* name) { return "  " + DataPath(std::string("mixed/") + name); };
+  EXPECT_EQ(Lines(result.out), (std::vector<std::string>{
+                                   "top(rtl) [Architecture]" + file("top.vhd"),
+                                   "  u_core: core(rtl) [work:Architecture]" + file("core.vhd"),
+                                   "    u_lane: lane(rtl) [work:Architecture]" + file("lane.vhd"),
+                                   "      lane [work:Entity]" + file("lane.vhd"),
+                                   "    core [work:Entity]" + file("core.vhd"),
+                                   "      shared_pkg [shared:PackageDecl]" + file("shared_pkg.vhd"),
+                                   "  top [work:Entity]" + file("top.vhd"),
+                               }));
+}
+
+TEST(Hierarchy, DotTreeDrawsOneEdgePerChild) {
+  CliResult result = RunQuillon({"--format", "dot", "tree", "-P", DataPath("mixed/project.json")});
+  EXPECT_EQ(result.status, 0) << result.err;
+  EXPECT_EQ(result.out.rfind("digraph hierarchy {\n", 0), 0u);
+  EXPECT_NE(result.out.find("[label=\"u_core\\ncore(rtl)\\nwork:Architecture\"]"), std::string::npos)
+      << result.out;
+  std::size_t edges = 0;
+  for (std::size_t at = result.out.find(" -> "); at != std::string::npos;
+       at = result.out.find(" -> ", at + 1)) {
+    ++edges;
+  }
+  EXPECT_EQ(edges, 6u);  // seven nodes below the root, one of them a top node
+}
+
+TEST(Hierarchy, CircularReferenceIsAWarningNotAFailure) {
+  CliResult result =
+      RunQuillon({"--format", "json", "tree", DataPath("cycle/ping.vhd"), DataPath("cycle/pong.vhd")});
+  EXPECT_EQ(result.status, 0) << result.err;
+  EXPECT_NE(result.err.find("WARNING: Circular Reference: "), std::string::npos) << result.err;
+  Json answer = Json::parse(result.out, nullptr, false);
+  ASSERT_FALSE(answer.is_discarded());
+  ASSERT_FALSE(answer["messages"].empty());
+  EXPECT_EQ(answer["messages"][0]["severity"], "warning");
+  EXPECT_EQ(Text(answer["messages"][0]["text"]).rfind("Circular Reference: ", 0), 0u);
+}
+
+}  // namespace
+}  // namespace cli_test

@@ -1,0 +1,3 @@
+`define HAVE_SECOND
+module first(input a);
+endmodule

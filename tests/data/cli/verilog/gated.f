@@ -1,0 +1,3 @@
++define+FROM_COMMAND_LINE
++incdir+include
+gated.v

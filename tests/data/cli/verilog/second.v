@@ -1,0 +1,4 @@
+`ifdef HAVE_SECOND
+module second(input a);
+endmodule
+`endif
