@@ -2,6 +2,7 @@
 
 #include <cwchar>
 #include <cstdlib>
+#include <string>
 #include <vector>
 
 #include "Port/InitObjects.h"
@@ -37,11 +38,11 @@ void MsgCapture::writeMsgLines(MsgType type, const wchar_t* const* lines, int co
   if (type != kError && type != kWarning && type != kInfo) return;
   for (int i = 0; i < count; ++i) {
     // As many bytes as the line has characters: a character that needs more is cut off there.
-    std::size_t characters = std::wcslen(lines[i]);
-    std::vector<char> buffer(characters + 1, '\0');
-    std::size_t written = std::wcstombs(buffer.data(), lines[i], characters);
+    std::string buffer(std::wcslen(lines[i]), '\0');
+    std::size_t written = std::wcstombs(buffer.data(), lines[i], buffer.size());
     if (written == static_cast<std::size_t>(-1)) continue;
-    m_capturedText.Append(std::string_view(buffer.data(), written));
+    buffer.resize(written);
+    m_capturedText.Append(buffer);
   }
 }
 

@@ -8,7 +8,8 @@ entity crossing is
     clk          : in  std_logic;
     button       : in  std_logic;
     car_lamps    : out lamps_t;
-    people_lamps : out lamps_t
+    people_lamps : out lamps_t;
+    beeper       : out std_logic
   );
 end entity crossing;
 
@@ -17,7 +18,11 @@ architecture structural of crossing is
     generic (FOR_PEOPLE : boolean := false);
     port (phase : in phase_t; lamps : out lamps_t);
   end component;
+  component chime is
+    port (clk : in std_logic; walk : in std_logic; tone : out std_logic);
+  end component;
   signal request : std_logic;
+  signal walking : std_logic;
   signal phase   : phase_t;
 begin
   input : entity work.debounce
@@ -32,4 +37,9 @@ begin
   people : lamp_driver
     generic map (FOR_PEOPLE => true)
     port map (phase => phase, lamps => people_lamps);
+
+  walking <= '1' when phase = WALK else '0';
+
+  bell : chime
+    port map (clk => clk, walk => walking, tone => beeper);
 end architecture structural;
