@@ -8,6 +8,7 @@
 #include "CHdlFile.h"
 #include "CLibRefs.h"
 #include "CParserConfigBase.h"
+#include "CProjectFileList.h"
 #include "DbObject.h"
 #include "IHdlNetListNode.h"
 #include "NetListWalk.h"
@@ -178,7 +179,7 @@ CitI::Result CHdlProject::getAllDesignUnits(IHdlDesignUnitSet** out) {
   if (!out) return CitI::kInvalidArg;
   *out = nullptr;
   VerilogSurvey survey = SurveyVerilogFiles();
-  auto projectFiles = Prjrep::TInterfaceListIter<IHdlFileIterator>::New(survey.files);
+  auto projectFiles = CProjectFileList::New(survey.files);
 
   std::uint32_t total = 0;
   for (const auto& [key, file] : files_.Elements()) {
@@ -364,7 +365,7 @@ bool CHdlProject::IsHierarchyUpToDate() {
   if (!cachedRoot_) return false;
   VerilogSurvey survey = SurveyVerilogFiles();
   if (survey.changed) return false;
-  auto projectFiles = Prjrep::TInterfaceListIter<IHdlFileIterator>::New(survey.files);
+  auto projectFiles = CProjectFileList::New(survey.files);
   for (const auto& [key, file] : files_.Elements()) {
     auto* hdlFile = Prjrep::ObjectCast<CHdlFile>(file);
     bool upToDate = false;

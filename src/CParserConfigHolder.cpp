@@ -1,5 +1,7 @@
 #include "CParserConfigHolder.h"
 
+#include "CProjectFileList.h"
+
 #include <utility>
 
 #include "Arch.h"
@@ -7,6 +9,7 @@
 #include "CHdlProject.h"
 #include "CLibRefs.h"
 #include "CParserConfigBase.h"
+#include "CProjectFileList.h"
 #include "CVhdlDU.h"
 #include "CompInst.h"
 #include "EntityDecl.h"
@@ -438,21 +441,16 @@ void CParserConfigHolder::SetEntityPortFlag(bool flag) {
 
 // ---- the parse run -------------------------------------------------------------------------------
 
-std::vector<Port::StringBase> CParserConfigHolder::SiblingPathsOf(IHdlFileIterator* projectFiles) const {
-  std::vector<Port::StringBase> paths;
-  if (!projectFiles) return paths;
+const std::vector<Port::StringBase>& CParserConfigHolder::GetSiblingPaths() const {
+  static const PathList kNone;
+  return siblingPaths_ ? *siblingPaths_ : kNone;
+}
+
+std::shared_ptr<const PathList> CParserConfigHolder::SiblingPathsOf(IHdlFileIterator* projectFiles) const {
   Port::StringBase pluginName;
   GetPluginName(pluginName);
-  for (projectFiles->First(); !projectFiles->IsDone(); projectFiles->Next()) {
-    IHdlFile* file = projectFiles->Current();
-    Port::StringBase filePlugin;
-    if (!file || file->getPluginName(&filePlugin) != CitI::kOk) continue;
-    if (!filePlugin.Equals(pluginName.view(), Port::kCompareNoCase)) continue;
-    Port::StringBase path;
-    if (auto* names = Prjrep::QueryAs<Prjrep::IFileNameHelper>(file)) names->GetFullPath(&path);
-    paths.push_back(std::move(path));
-  }
-  return paths;
+  if (auto* shared = dynamic_cast<CProjectFileList*>(projectFiles)) return shared->PathsOfPlugin(pluginName);
+  return std::make_shared<const PathList>(CollectPathsOfPlugin(projectFiles, pluginName));
 }
 
 void CParserConfigHolder::BeginParse(IHdlFileIterator* projectFiles) {
@@ -499,14 +497,19 @@ CitI::Result CParserConfigHolder::IsUpToDate(bool* valid, IHdlFileIterator* proj
   Port::StringBase library;
   GetLibraryName(library);
   if (library != library_) return CitI::kOk;
+  const PathList& stored = GetSiblingPaths();
   if (!projectFiles) {
-    *valid = siblingPaths_.empty();
+    *valid = stored.empty();
     return CitI::kOk;
   }
-  std::vector<Port::StringBase> paths = SiblingPathsOf(projectFiles);
-  if (paths.size() != siblingPaths_.size()) return CitI::kOk;
-  for (std::size_t i = 0; i < paths.size(); ++i) {
-    if (!paths[i].Equals(siblingPaths_[i].view(), Port::kCompareNoCase)) return CitI::kOk;
+  std::shared_ptr<const PathList> current = SiblingPathsOf(projectFiles);
+  if (current == siblingPaths_) {
+    *valid = true;
+    return CitI::kOk;
+  }
+  if (current->size() != stored.size()) return CitI::kOk;
+  for (std::size_t i = 0; i < stored.size(); ++i) {
+    if (!(*current)[i].Equals(stored[i].view(), Port::kCompareNoCase)) return CitI::kOk;
   }
   *valid = true;
   return CitI::kOk;

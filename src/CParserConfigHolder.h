@@ -5,6 +5,7 @@
 #include <array>
 #include <cstdint>
 #include <map>
+#include <memory>
 #include <vector>
 
 #include "CitI.h"
@@ -74,7 +75,7 @@ class CParserConfigHolder final : public CitI::IInterface {
   void SetTypeIds(const TypeIds& ids);
   const Port::XUID& GetTypeId(TypeSlot slot) const { return typeIds_[slot]; }
   // Full paths of the project's files with this file's plug-in name, as the last parse began.
-  const std::vector<Port::StringBase>& GetSiblingPaths() const { return siblingPaths_; }
+  const std::vector<Port::StringBase>& GetSiblingPaths() const;
   // The device part named by the last EDIF netlist parsed.
   void SetPart(const Port::StringBase& part) { part_ = part; }
   const Port::StringBase& GetPart() const { return part_; }
@@ -139,7 +140,8 @@ class CParserConfigHolder final : public CitI::IInterface {
   void AttachUse(Use* use, bool inBody);
   bool IsLibraryCell(const Port::StringBase& component) const;
   // Paths of the listed files whose plug-in name is this file's, ignoring case, in list order.
-  std::vector<Port::StringBase> SiblingPathsOf(IHdlFileIterator* projectFiles) const;
+  // Shared between the files of one project list (see CProjectFileList).
+  std::shared_ptr<const std::vector<Port::StringBase>> SiblingPathsOf(IHdlFileIterator* projectFiles) const;
   // Re-registers an instance under its first label.
   void RenameInstance(CHdlElement* instance, const Port::StringBase& label);
   void CopyInstance(const Port::StringBase& label);
@@ -147,7 +149,7 @@ class CParserConfigHolder final : public CitI::IInterface {
   CHdlFile* file_ = nullptr;
   Port::StringBase signature_;
   Port::StringBase library_;
-  std::vector<Port::StringBase> siblingPaths_;
+  std::shared_ptr<const std::vector<Port::StringBase>> siblingPaths_;
   Port::StringBase part_;
   std::map<Port::StringBase, Port::StringBase> componentBindings_;
   TypeIds typeIds_;
