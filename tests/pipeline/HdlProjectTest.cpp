@@ -216,6 +216,8 @@ TEST_F(HdlProject, VerilogFilesAreListedToEveryParseByOrderKeyLargestFirst) {
   EXPECT_TRUE(HolderOf(vhdl.Get())->GetSiblingPaths().empty());
   // A Verilog file outside the survey finds its siblings in the list all the same.
   EXPECT_EQ(HolderOf(notV3.Get())->GetSiblingPaths(), expected);
+  // One list for all the files of a pass, not a copy per file.
+  EXPECT_EQ(&HolderOf(low.Get())->GetSiblingPaths(), &HolderOf(high.Get())->GetSiblingPaths());
 
   // Reordering the Verilog files makes them out of date.
   high->setOrderKey(1);
