@@ -9,6 +9,7 @@
 #include <string>
 #include <vector>
 
+#include "BenchSupport.h"
 #include "CElaborator.h"
 #include "CHdlProject.h"
 #include "DesignTreeCorpus.h"
@@ -29,7 +30,6 @@
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/Casts.h"
 
-extern "C" void InstFactoryEntry();
 
 namespace {
 
@@ -41,14 +41,6 @@ constexpr std::size_t kFileCount = 10000;
 constexpr std::size_t kFileCount = 1000;
 #endif
 
-bool RegisterComponentsOnce() {
-  static const bool registered = [] {
-    bool hostComponents = Host::RegisterHostComponents();
-    InstFactoryEntry();
-    return hostComponents;
-  }();
-  return registered;
-}
 
 // The generated files in a temporary directory of their own, removed at exit.
 class CorpusOnDisk {
@@ -96,24 +88,6 @@ const CorpusOnDisk& Corpus(std::int64_t variant) {
   return variant == 0 ? acyclic : withCycles;
 }
 
-// The cyclic variant warns on every run; the figures are not about writing to a terminal. The
-// default manager is taken out of the dispatcher rather than disabled, since every parse's
-// message capture enables it again.
-class QuietMessages {
- public:
-  QuietMessages()
-      : manager_(Port_MsgDispatcher::getDefaultMsgMan()),
-        wasRegistered_(Port_MsgDispatcher::removeMsgMan(manager_)) {}
-  ~QuietMessages() {
-    if (wasRegistered_) Port_MsgDispatcher::addMsgMan(manager_);
-  }
-  QuietMessages(const QuietMessages&) = delete;
-  QuietMessages& operator=(const QuietMessages&) = delete;
-
- private:
-  Port_MsgManDefault* manager_;
-  bool wasRegistered_;
-};
 
 // A project of all the corpus files, set up the way a host does it.
 Prjrep::AutoPtr<Vad::IHdlProject> NewProject(const std::vector<std::string>& paths) {
@@ -149,9 +123,9 @@ std::size_t CountNodes(Vad::IHdlNetListNode* root) {
 }
 
 void BM_GetCompileOrder(benchmark::State& state) {
-  QuietMessages quiet;
+  bench::QuietMessages quiet;
   const auto& corpus = Corpus(state.range(0));
-  auto project = RegisterComponentsOnce() ? NewProject(corpus.paths()) : Prjrep::AutoPtr<Vad::IHdlProject>();
+  auto project = bench::RegisterComponentsOnce() ? NewProject(corpus.paths()) : Prjrep::AutoPtr<Vad::IHdlProject>();
   Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
   Prjrep::AutoPtr<Vad::IHdlParserConfig> config;
   Prjrep::AutoRelease<Vad::CElaborator> elaborator;
@@ -179,9 +153,9 @@ void BM_GetCompileOrder(benchmark::State& state) {
 BENCHMARK(BM_GetCompileOrder)->Arg(0)->Arg(1)->Unit(benchmark::kMillisecond);
 
 void BM_FilesToCompileOrder(benchmark::State& state) {
-  QuietMessages quiet;
+  bench::QuietMessages quiet;
   const auto& corpus = Corpus(state.range(0));
-  if (!RegisterComponentsOnce() || corpus.paths().empty()) {
+  if (!bench::RegisterComponentsOnce() || corpus.paths().empty()) {
     state.SkipWithError("the corpus could not be written");
     return;
   }

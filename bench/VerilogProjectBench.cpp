@@ -12,6 +12,7 @@
 #include <string>
 #include <vector>
 
+#include "BenchSupport.h"
 #include "CHdlFile.h"
 #include "CParserConfigHolder.h"
 #include "HdlSets.h"
@@ -30,20 +31,11 @@
 #include "Prjrep/TListIter.h"
 #include "VerilogParser.h"
 
-extern "C" void InstFactoryEntry();
 
 namespace {
 
 constexpr std::uint64_t kProjectSeed = 20250302;
 
-bool RegisterComponentsOnce() {
-  static const bool registered = [] {
-    bool hostComponents = Host::RegisterHostComponents();
-    InstFactoryEntry();
-    return hostComponents;
-  }();
-  return registered;
-}
 
 struct GeneratedFile {
   std::string name;
@@ -204,23 +196,6 @@ class FilesOnDisk {
   bool ok_ = false;
 };
 
-// The default manager is taken out of the dispatcher rather than disabled, since every parse's
-// message capture enables it again.
-class QuietMessages {
- public:
-  QuietMessages()
-      : manager_(Port_MsgDispatcher::getDefaultMsgMan()),
-        wasRegistered_(Port_MsgDispatcher::removeMsgMan(manager_)) {}
-  ~QuietMessages() {
-    if (wasRegistered_) Port_MsgDispatcher::addMsgMan(manager_);
-  }
-  QuietMessages(const QuietMessages&) = delete;
-  QuietMessages& operator=(const QuietMessages&) = delete;
-
- private:
-  Port_MsgManDefault* manager_;
-  bool wasRegistered_;
-};
 
 // A project of Verilog files on disk, added as a host adds them: plug-in, V3 flag, and order keys
 // that put them in the given order.
@@ -284,8 +259,8 @@ struct Outcome {
 // Rounds on a new project each, parsed by `parse`.
 template <class ParseProject>
 void ParseRounds(benchmark::State& state, const std::vector<GeneratedFile>& files, ParseProject parse) {
-  QuietMessages quiet;
-  if (!RegisterComponentsOnce()) {
+  bench::QuietMessages quiet;
+  if (!bench::RegisterComponentsOnce()) {
     state.SkipWithError("the registry could not be set up");
     return;
   }

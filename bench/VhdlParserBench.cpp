@@ -5,6 +5,7 @@
 #include <cstdio>
 #include <string>
 
+#include "BenchSupport.h"
 #include "CHdlFile.h"
 #include "CParserConfigHolder.h"
 #include "HdlSets.h"
@@ -20,26 +21,17 @@
 #include "Prjrep/Casts.h"
 #include "VhdlCorpus.h"
 
-extern "C" void InstFactoryEntry();
 
 namespace {
 
 constexpr std::uint64_t kCorpusSeed = 20240611;
 
-bool RegisterComponentsOnce() {
-  static const bool registered = [] {
-    bool hostComponents = Host::RegisterHostComponents();
-    InstFactoryEntry();
-    return hostComponents;
-  }();
-  return registered;
-}
 
 // A VHDL file of the generated corpus inside a project, the way a host sets one up.
 class CorpusProject {
  public:
   explicit CorpusProject(std::size_t corpusBytes) {
-    if (!RegisterComponentsOnce()) return;
+    if (!bench::RegisterComponentsOnce()) return;
     Port::StringBase dir;
     if (!Port::File::mkdtemp(&dir)) return;
     dir_ = dir.str();

@@ -6,33 +6,12 @@
 #include <optional>
 #include <string>
 
+#include "ScopedEnv.h"
 #include "Port/Env.h"
 
 namespace fs = std::filesystem;
 
 namespace {
-
-// Sets an environment variable for one test and restores the earlier state afterwards.
-class ScopedEnv {
- public:
-  ScopedEnv(const char* name, const char* value) : name_(name) {
-    if (const char* old = Port_Env::GetEnv(name)) saved_ = old;
-    if (value)
-      Port_Env::SetEnv(name, value);
-    else
-      Port_Env::UnsetEnv(name);
-  }
-  ~ScopedEnv() {
-    if (saved_)
-      Port_Env::SetEnv(name_.c_str(), saved_->c_str());
-    else
-      Port_Env::UnsetEnv(name_.c_str());
-  }
-
- private:
-  std::string name_;
-  std::optional<std::string> saved_;
-};
 
 // A fresh directory tree: <root>/data/kestrel/arch.vho and <root>/other/cells.vho.
 class DataDir : public testing::Test {

@@ -10,6 +10,7 @@
 #include <string_view>
 #include <vector>
 
+#include "ScopedEnv.h"
 #include "CLibLoader.h"
 #include "CLibRefs.h"
 #include "CParserConfigBase.h"
@@ -22,32 +23,6 @@
 #include "rudiva/RudIva.h"
 
 namespace libref_test {
-
-// Sets (or, with null, unsets) an environment variable for one scope.
-class ScopedEnv {
- public:
-  ScopedEnv(const char* name, const char* value) : name_(name) {
-    if (const char* old = Port_Env::GetEnv(name)) saved_ = old;
-    if (value) {
-      Port_Env::SetEnv(name, value);
-    } else {
-      Port_Env::UnsetEnv(name);
-    }
-  }
-  ScopedEnv(const ScopedEnv&) = delete;
-  ScopedEnv& operator=(const ScopedEnv&) = delete;
-  ~ScopedEnv() {
-    if (saved_) {
-      Port_Env::SetEnv(name_.c_str(), saved_->c_str());
-    } else {
-      Port_Env::UnsetEnv(name_.c_str());
-    }
-  }
-
- private:
-  std::string name_;
-  std::optional<std::string> saved_;
-};
 
 // CORVANE naming the repository's cell libraries, as the command-line host sets it.
 class ScopedCellLibraries : public ScopedEnv {

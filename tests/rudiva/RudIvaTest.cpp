@@ -9,6 +9,7 @@
 #include <system_error>
 #include <vector>
 
+#include "ScopedEnv.h"
 #include "Port/Env.h"
 #include "Port/File.h"
 #include "Port/StringBase.h"
@@ -21,30 +22,6 @@ namespace fs = std::filesystem;
 namespace {
 
 using Names = std::vector<std::string>;
-
-// Sets (or, with null, unsets) an environment variable for one scope.
-class ScopedEnv {
- public:
-  ScopedEnv(const char* name, const char* value) : name_(name) {
-    if (const char* old = Port_Env::GetEnv(name)) saved_ = old;
-    if (value) {
-      Port_Env::SetEnv(name, value);
-    } else {
-      Port_Env::UnsetEnv(name);
-    }
-  }
-  ~ScopedEnv() {
-    if (saved_) {
-      Port_Env::SetEnv(name_.c_str(), saved_->c_str());
-    } else {
-      Port_Env::UnsetEnv(name_.c_str());
-    }
-  }
-
- private:
-  std::string name_;
-  std::optional<std::string> saved_;
-};
 
 class ScopedWorkingDirectory {
  public:

@@ -11,7 +11,6 @@ using testing::Contains;
 using testing::ElementsAre;
 using testing::Not;
 using Vad::VerilogArguments;
-using verilog_test::ScopedEnv;
 using verilog_test::VerilogProject;
 
 namespace {

@@ -12,6 +12,7 @@
 #include <string_view>
 #include <vector>
 
+#include "ScopedEnv.h"
 #include "../pipeline/PipelineFixtures.h"
 #include "CHdlElement.h"
 #include "Port/Env.h"
@@ -24,22 +25,6 @@
 namespace verilog_test {
 
 inline constexpr const char* kVerilogPlugin = "PLUGIN_Verilog";
-
-// Sets or unsets an environment variable for one scope and restores it afterwards.
-class ScopedEnv {
- public:
-  ScopedEnv(const char* name, const char* value) : name_(name) {
-    if (const char* old = Port_Env::GetEnv(name)) old_ = old;
-    value ? Port_Env::SetEnv(name, value) : Port_Env::UnsetEnv(name);
-  }
-  ~ScopedEnv() { old_ ? Port_Env::SetEnv(name_, old_->c_str()) : Port_Env::UnsetEnv(name_); }
-  ScopedEnv(const ScopedEnv&) = delete;
-  ScopedEnv& operator=(const ScopedEnv&) = delete;
-
- private:
-  const char* name_;
-  std::optional<std::string> old_;
-};
 
 class VerilogProject : public pipeline_test::PipelineTest {
  protected:
