@@ -82,9 +82,9 @@ int CommandRunner::ListFactories() {
 }
 
 int CommandRunner::RunOnProject() {
-  ProjectSpec spec;
+  ProjectSources sources;
   std::string error;
-  if (!ProjectLoader(spec).Load(options_, error)) return BadInput(error);
+  if (!ProjectLoader(sources).Load(options_, error)) return BadInput(error);
 
   std::ofstream file;
   if (!options_.outputPath.empty()) {
@@ -100,11 +100,11 @@ int CommandRunner::RunOnProject() {
   }
   ProjectBuilder::SetInstallRootWhenUnset();
   ProjectBuilder builder;
-  if (!builder.Build(spec, error)) {
+  if (!builder.Build(sources, error)) {
     log_->ReportError(error);
     return kExitFailed;
   }
-  int status = RunCommand(builder.project(), spec.files.size(), out);
+  int status = RunCommand(builder.project(), sources.files.size(), out);
   out.flush();
   if (!out) {
     log_->ReportError("the output could not be written");

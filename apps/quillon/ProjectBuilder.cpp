@@ -21,21 +21,21 @@ void ProjectBuilder::SetInstallRootWhenUnset() {
   if (!installRoot || !*installRoot) Port_Env::SetEnv("CORVANE", Port_Env::GetInstallRoot().c_str());
 }
 
-bool ProjectBuilder::Build(const ProjectSpec& spec, std::string& error) {
+bool ProjectBuilder::Build(const ProjectSources& sources, std::string& error) {
   project_ = Prjrep::CreateInstanceAs<Vad::IHdlProject>(Vad::ClassIds::CHdlProject());
   if (!project_) {
     error = "the module does not create a project";
     return false;
   }
-  if (!SetProperties(spec, error)) return false;
-  std::uint64_t orderKey = spec.files.size();
-  for (const SourceFile& source : spec.files) {
+  if (!SetProperties(sources, error)) return false;
+  std::uint64_t orderKey = sources.files.size();
+  for (const SourceFile& source : sources.files) {
     if (!AddFile(source, orderKey--, error)) return false;
   }
   return true;
 }
 
-bool ProjectBuilder::SetProperties(const ProjectSpec& spec, std::string& error) {
+bool ProjectBuilder::SetProperties(const ProjectSources& sources, std::string& error) {
   Prjrep::AutoRelease<Vad::IHdlParserConfig> config;
   project_->getParserConfig(config.Out());
   auto* properties = Prjrep::QueryAs<Vad::IPropertyInstanceSet>(config.Get());
@@ -43,7 +43,7 @@ bool ProjectBuilder::SetProperties(const ProjectSpec& spec, std::string& error) 
     error = "the project offers no property set";
     return false;
   }
-  for (const auto& [name, value] : spec.properties) {
+  for (const auto& [name, value] : sources.properties) {
     if (properties->Add(Host::PropertyInstance::Create(name, value).Get()) != CitI::kOk) {
       error = "the project refuses the property " + name;
       return false;

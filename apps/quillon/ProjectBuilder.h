@@ -9,7 +9,7 @@
 #include "IHdlProject.h"
 #include "ISourceLibrary.h"
 #include "Prjrep/AutoPtr.h"
-#include "ProjectSpec.h"
+#include "ProjectSources.h"
 
 namespace quillon {
 
@@ -19,15 +19,15 @@ class ProjectBuilder {
   // environment names one already.
   static void SetInstallRootWhenUnset();
 
-  // Creates the project with the properties and files of `spec`. The first file gets the largest
+  // Creates the project with the properties and files of `sources`. The first file gets the largest
   // order key, so that files are compiled in the order given; every file gets the V3 flag. False
   // with a one-line reason in `error`.
-  bool Build(const ProjectSpec& spec, std::string& error);
+  bool Build(const ProjectSources& sources, std::string& error);
 
   Vad::IHdlProject* project() const { return project_.Get(); }
 
  private:
-  bool SetProperties(const ProjectSpec& spec, std::string& error);
+  bool SetProperties(const ProjectSources& sources, std::string& error);
   bool AddFile(const SourceFile& source, std::uint64_t orderKey, std::string& error);
   Vad::IFileType* FileTypeOf(const std::string& plugin);
   Vad::ISourceLibrary* LibraryNamed(const std::string& name);

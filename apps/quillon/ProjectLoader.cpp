@@ -92,9 +92,9 @@ bool ProjectLoader::Load(const Options& options, std::string& error) {
   }
   for (const std::string& define : options.defines) AddDefine(define);
   for (const std::string& directory : options.includeDirs) AddIncludeDir(directory);
-  if (options.target) spec_.properties[std::string(kTargetProperty)] = *options.target;
-  if (options.family) spec_.properties[std::string(kFamilyProperty)] = *options.family;
-  for (const auto& [name, value] : options.properties) spec_.properties[name] = value;
+  if (options.target) sources_.properties[std::string(kTargetProperty)] = *options.target;
+  if (options.family) sources_.properties[std::string(kFamilyProperty)] = *options.family;
+  for (const auto& [name, value] : options.properties) sources_.properties[name] = value;
   return true;
 }
 
@@ -115,7 +115,7 @@ bool ProjectLoader::AddSource(std::string path, const std::string& baseDir, std:
   }
   if (library.empty()) library = kDefaultLibrary;
   if (plugin.empty()) plugin = PluginTable::PluginForPath(fullPath);
-  spec_.files.push_back({std::move(fullPath), std::move(library), std::move(plugin)});
+  sources_.files.push_back({std::move(fullPath), std::move(library), std::move(plugin)});
   return true;
 }
 
@@ -144,7 +144,7 @@ bool ProjectLoader::AddProjectFile(const SourceArgument& argument, std::string& 
     if (!properties->is_object()) return malformed("\"properties\" must be an object");
     for (const auto& [name, value] : properties->items()) {
       if (!value.is_string()) return malformed("the value of property \"" + name + "\" must be a string");
-      spec_.properties[name] = value.get<std::string>();
+      sources_.properties[name] = value.get<std::string>();
     }
   }
 
@@ -220,7 +220,7 @@ void ProjectLoader::AddIncludeDir(std::string directory) {
 
 // The module reads both lists with ";" between the entries.
 void ProjectLoader::AppendToListProperty(std::string_view property, std::string_view value) {
-  std::string& list = spec_.properties[std::string(property)];
+  std::string& list = sources_.properties[std::string(property)];
   if (!list.empty()) list += ';';
   list += value;
 }

@@ -7,7 +7,7 @@
 #include <string_view>
 
 #include "Options.h"
-#include "ProjectSpec.h"
+#include "ProjectSources.h"
 
 namespace quillon {
 
@@ -18,7 +18,7 @@ class ProjectLoader {
   static constexpr std::string_view kTargetProperty = "PROP_Parse_Target";
   static constexpr std::string_view kFamilyProperty = "PROP_DevFamilyPMName";
 
-  explicit ProjectLoader(ProjectSpec& spec) : spec_(spec) {}
+  explicit ProjectLoader(ProjectSources& sources) : sources_(sources) {}
 
   // False with a one-line reason in `error` that names the file at fault.
   bool Load(const Options& options, std::string& error);
@@ -37,7 +37,7 @@ class ProjectLoader {
   void AppendToListProperty(std::string_view property, std::string_view value);
   bool TakeFileListLine(std::string line, const SourceArgument& argument, std::string& error);
 
-  ProjectSpec& spec_;
+  ProjectSources& sources_;
 };
 
 }  // namespace quillon

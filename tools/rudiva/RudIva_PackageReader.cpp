@@ -153,7 +153,7 @@ void RudIva_PackageReader::SkipDeclaration() {
 }
 
 // "component", "type" and "package" stand inside a declaration only as the class of an attribute
-// specification ("attribute a of x : component is ..."), right after the colon.
+// statement ("attribute a of x : component is ..."), right after the colon.
 bool RudIva_PackageReader::OpensDeclaration(const Token& previous) {
   return (Peek().Is("component") || Peek().Is("type") || Peek().Is("package")) && !previous.IsDelimiter(':');
 }

@@ -13,7 +13,7 @@ struct SourceFile {
   std::string plugin;
 };
 
-struct ProjectSpec {
+struct ProjectSources {
   std::map<std::string, std::string> properties;
   std::vector<SourceFile> files;  // in the order given
 };
