@@ -1,6 +1,7 @@
 // Finds the design units of a VHDL source file without analysing VHDL fully: a small scanner and a
-// partial grammar recognise library and use clauses, unit headers, instantiations, configuration
-// specifications, generate statements and port clauses, and record them in the file's holder.
+// partial grammar recognise library and use clauses, unit headers, instantiations, component
+// bindings of configurations, generate statements and port clauses, and record them in the file's
+// holder.
 #pragma once
 
 #include "CitI.h"
