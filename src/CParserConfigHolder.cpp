@@ -149,6 +149,14 @@ CHdlElement* CParserConfigHolder::FindRecorded(const Port::StringBase& key) cons
   return it == recordedUnits_.end() ? nullptr : dynamic_cast<CHdlElement*>(it->second.Get());
 }
 
+// A record's own store key.
+template <class Record>
+static Port::StringBase StoreKeyOf(Record* record) {
+  Port::StringBase key;
+  record->ComposeStoreKey(key);
+  return key;
+}
+
 bool CParserConfigHolder::Enter(CHdlElement* record, const Port::StringBase& key, std::uint32_t line,
                                 const Port::XUID& type) {
   Prjrep::AutoRelease<CitI::IInterface> creation(record);
@@ -177,8 +185,7 @@ Library* CParserConfigHolder::AddLibrary(const Port::StringBase& name, std::uint
   ResetForNextUnit();
   currentUnit_ = nullptr;
   auto* library = new Library(name.view(), nullptr);
-  Port::StringBase key;
-  library->ComposeStoreKey(key);
+  const Port::StringBase key = StoreKeyOf(library);
   if (auto* existing = dynamic_cast<Library*>(FindRecorded(key))) {
     Prjrep::AutoRelease<CitI::IInterface> discarded(library);
     return existing;
@@ -190,8 +197,7 @@ Use* CParserConfigHolder::AddUse(const Port::StringBase& dottedName, std::uint32
                                  const Port::XUID& type, bool inBody) {
   ResetForNextUnit();
   auto* use = new Use(dottedName.view(), nullptr);
-  Port::StringBase key;
-  use->ComposeStoreKey(key);
+  const Port::StringBase key = StoreKeyOf(use);
   if (auto* existing = dynamic_cast<Use*>(FindRecorded(key))) {
     Prjrep::AutoRelease<CitI::IInterface> discarded(use);
     use = existing;
@@ -222,9 +228,7 @@ EntityDecl* CParserConfigHolder::AddEntityDecl(const Port::StringBase& name, std
   if (!IsEnabled(kEntitySlot)) return nullptr;
   auto* entity = new EntityDecl(name.view(), nullptr);
   entity->SetUnitFlag(portFlag);
-  Port::StringBase key;
-  entity->ComposeStoreKey(key);
-  if (!Enter(entity, key, line, type)) return nullptr;
+  if (!Enter(entity, StoreKeyOf(entity), line, type)) return nullptr;
   TakePendingContext(entity);
   currentUnit_ = entity;
   return entity;
@@ -235,9 +239,7 @@ Arch* CParserConfigHolder::AddArch(const Port::StringBase& archName, const Port:
   ResetForNextUnit();
   if (!IsEnabled(kArchitectureSlot)) return nullptr;
   auto* architecture = new Arch(entityName.view(), archName.view(), nullptr);
-  Port::StringBase key;
-  architecture->ComposeStoreKey(key);
-  if (!Enter(architecture, key, line, type)) return nullptr;
+  if (!Enter(architecture, StoreKeyOf(architecture), line, type)) return nullptr;
   TakePendingContext(architecture);
   currentUnit_ = architecture;
   return architecture;
@@ -250,9 +252,7 @@ module* CParserConfigHolder::AddModule(const Port::StringBase& name, std::uint32
   auto* unit = new module(name.view(), nullptr);
   unit->SetUnitFlag(flag);
   if (!partition.IsEmpty()) unit->SetProperty(kPartitionProperty, partition);
-  Port::StringBase key;
-  unit->ComposeStoreKey(key);
-  if (!Enter(unit, key, line, type)) return nullptr;
+  if (!Enter(unit, StoreKeyOf(unit), line, type)) return nullptr;
   pendingContext_.clear();
   currentUnit_ = unit;
   return unit;
@@ -263,9 +263,7 @@ PackageBody* CParserConfigHolder::AddPackageBody(const Port::StringBase& name, s
   ResetForNextUnit();
   if (!IsEnabled(kPackageBodySlot)) return nullptr;
   auto* body = new PackageBody(name.view(), nullptr);
-  Port::StringBase key;
-  body->ComposeStoreKey(key);
-  if (!Enter(body, key, line, type)) return nullptr;
+  if (!Enter(body, StoreKeyOf(body), line, type)) return nullptr;
   TakePendingContext(body);
   currentUnit_ = nullptr;
   return body;
@@ -276,9 +274,7 @@ PackageDecl* CParserConfigHolder::AddPackageDecl(const Port::StringBase& name, s
   ResetForNextUnit();
   if (!IsEnabled(kPackageDeclSlot)) return nullptr;
   auto* package = new PackageDecl(name.view(), nullptr);
-  Port::StringBase key;
-  package->ComposeStoreKey(key);
-  if (!Enter(package, key, line, type)) return nullptr;
+  if (!Enter(package, StoreKeyOf(package), line, type)) return nullptr;
   TakePendingContext(package);
   currentUnit_ = nullptr;
   return package;
@@ -288,9 +284,7 @@ generic* CParserConfigHolder::AddGeneric(const Port::StringBase& name, std::uint
                                          const Port::XUID& type) {
   ResetForNextUnit();
   auto* unit = new generic(name.view(), nullptr);
-  Port::StringBase key;
-  unit->ComposeStoreKey(key);
-  return Enter(unit, key, line, type) ? unit : nullptr;
+  return Enter(unit, StoreKeyOf(unit), line, type) ? unit : nullptr;
 }
 
 bool CParserConfigHolder::IsLibraryCell(const Port::StringBase& component) const {
@@ -326,9 +320,7 @@ CompInst* CParserConfigHolder::AddCompInst(const Port::StringBase& label, const 
       new CompInst(label.IsEmpty() ? component.view() : label.view(), component.view(), currentUnit_);
   instance->SetInGenerate(generateDepth_ != 0);
   if (!partition.IsEmpty()) instance->SetProperty(kPartitionProperty, partition);
-  Port::StringBase key;
-  instance->ComposeStoreKey(key);
-  if (!Enter(instance, key, line, type)) return nullptr;
+  if (!Enter(instance, StoreKeyOf(instance), line, type)) return nullptr;
   lastCompInst_ = instance;
   lastEntityInst_ = nullptr;
   return instance;
@@ -343,9 +335,7 @@ EntityInst* CParserConfigHolder::AddEntityInst(const Port::StringBase& label, co
   instance->SetEntityName(entity.view());
   instance->SetArchitectureName(architecture.view());
   instance->SetInGenerate(generateDepth_ != 0);
-  Port::StringBase key;
-  instance->ComposeStoreKey(key);
-  if (!Enter(instance, key, line, type)) return nullptr;
+  if (!Enter(instance, StoreKeyOf(instance), line, type)) return nullptr;
   lastEntityInst_ = instance;
   lastCompInst_ = nullptr;
   // A new instance starts its own labels.
