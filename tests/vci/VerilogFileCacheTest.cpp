@@ -60,6 +60,35 @@ TEST_P(VerilogFileCacheTest, CompilingEveryFileAfterItsPrefixScansEachFileOnce) 
   EXPECT_EQ(project_.cache()->ScannedFileCount(), static_cast<std::uint64_t>(count));
 }
 
+// A project brings its files up to date in an order of its own (by name, say), not in the order of
+// the compile line: prefixes of every length then follow one another, shorter after longer.
+TEST_P(VerilogFileCacheTest, PrefixesInAnyOrderScanEachFileOnceAndSeeLaterChanges) {
+  const int count = 24;
+  std::vector<std::string> files = WriteChain(project_, count);
+  auto expectPrefix = [&](int length, const std::string& previousModule) {
+    std::vector<Module> modules = CompilePrefix(project_, files, static_cast<std::size_t>(length));
+    ASSERT_EQ(NamesOf(modules), Strings{"mod_" + std::to_string(length - 1)});
+    EXPECT_EQ(InstanceNamesOf(modules[0]), Strings{previousModule + " u_prev"});
+  };
+  for (int length : {2, 11, 12, 3, 20, 21, 4, 24, 5, 13}) {
+    expectPrefix(length, "mod_" + std::to_string(length - 2));
+  }
+  EXPECT_EQ(project_.cache()->ScannedFileCount(), static_cast<std::uint64_t>(count));
+
+  project_.Write("chain5.v",
+                 "`define NAME_5 mod_5_changed\nmodule `NAME_5;\n  `NAME_4 u_prev ();\nendmodule\n");
+  expectPrefix(4, "mod_2");
+  expectPrefix(7, "mod_5_changed");
+  // The changed file and the one after it, which is the first to start from a new macro state.
+  EXPECT_EQ(project_.cache()->ScannedFileCount(), static_cast<std::uint64_t>(count + 2));
+  expectPrefix(24, "mod_22");
+  EXPECT_EQ(project_.cache()->ScannedFileCount(), static_cast<std::uint64_t>(count + 19));
+
+  project_.cache()->Clear();
+  expectPrefix(3, "mod_1");
+  EXPECT_EQ(project_.cache()->ScannedFileCount(), static_cast<std::uint64_t>(count + 22));
+}
+
 TEST_P(VerilogFileCacheTest, ChangedFileIsScannedAgainAndItsMacrosReachTheFilesAfterIt) {
   const std::string defs = project_.Write("defs.v", "`define LEAF alpha\n");
   const std::string top = project_.Write("top.v", "module `LEAF; endmodule\n");

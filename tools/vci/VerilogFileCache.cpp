@@ -34,12 +34,12 @@ std::shared_ptr<const VerilogFileResult> VerilogFileCache::CompileChain(
   std::shared_ptr<const VerilogFileResult> last;
   const std::size_t matched = MatchRememberedChain(files, start);
   if (matched > 0) {
-    last = chain_.links[matched - 1].result;
+    last = chain_.results[matched - 1];
     macros = last->macrosAfter;
     context.macros = macros->fingerprint();
   }
   const std::uint64_t chainVersion = chain_.version;
-  std::vector<ChainLink> links;
+  Results linked;
   bool remember = watch_ != nullptr;
   for (std::size_t i = matched; i < files.size(); ++i) {
     Found found = Find(files[i], context, i + 1 == files.size());
@@ -55,18 +55,30 @@ std::shared_ptr<const VerilogFileResult> VerilogFileCache::CompileChain(
     context.macros = macros->fingerprint();
     remember = remember && found.trusted;
     if (remember) {
-      links.push_back({std::string(files[i]), last});
+      linked.push_back(last);
     }
   }
   // Another compile may have remembered a chain of its own meanwhile; ours then extends nothing.
   const bool sameChain = matched == 0 || chain_.version == chainVersion;
   if (remember && generation_ == generationAtStart && sameChain) {
-    RememberChain(start, matched, std::move(links));
+    RememberChain(start, files, matched, std::move(linked));
   } else if (!chain_.valid || chain_.generation != generation_) {
     chain_.valid = false;
-    chain_.links.clear();  // lets go of results that may be dropped from the cache
+    chain_.Truncate(0);  // lets go of results that may be dropped from the cache
   }
   return last;
+}
+
+void VerilogFileCache::Clear() {
+  std::lock_guard<std::mutex> lock(mutex_);
+  if (watch_) {
+    for (const auto& [path, node] : nodes_) watch_->Forget(path);
+  }
+  nodes_.clear();
+  bytes_ = 0;
+  ++generation_;
+  chain_.valid = false;
+  chain_.Truncate(0);
 }
 
 std::uint64_t VerilogFileCache::ScannedFileCount() const {
@@ -99,24 +111,52 @@ std::size_t VerilogFileCache::MatchRememberedChain(const std::vector<std::string
   if (!chain_.valid || chain_.generation != generation_ || !(chain_.start == start)) {
     return 0;
   }
-  const std::size_t limit = std::min(chain_.links.size(), files.size() - 1);
+  const std::size_t limit = std::min(chain_.Length(), files.size() - 1);
   std::size_t matched = 0;
-  while (matched < limit && chain_.links[matched].path == files[matched]) ++matched;
+  while (matched < limit && chain_.Path(matched) == files[matched]) ++matched;
   return matched;
 }
 
-void VerilogFileCache::RememberChain(const Context& start, std::size_t matched,
-                                     std::vector<ChainLink> links) {
-  if (matched == 0) {
-    chain_.links.clear();
-  } else {
-    chain_.links.erase(chain_.links.begin() + static_cast<std::ptrdiff_t>(matched), chain_.links.end());
+// A project's files are not always compiled in project order, so a compile of fewer files keeps
+// the links of a longer chain that goes on the same way.
+void VerilogFileCache::RememberChain(const Context& start, const std::vector<std::string_view>& files,
+                                     std::size_t matched, Results results) {
+  const bool extends = chain_.valid && chain_.generation == generation_ && chain_.start == start;
+  std::size_t length = extends ? matched : 0;
+  std::size_t next = 0;
+  while (extends && next < results.size() && length < chain_.Length() &&
+         chain_.results[length] == results[next] && chain_.Path(length) == files[matched + next]) {
+    ++length;
+    ++next;
   }
-  for (ChainLink& link : links) chain_.links.push_back(std::move(link));
+  if (next < results.size()) {
+    chain_.Truncate(length);
+    for (; next < results.size(); ++next) chain_.Append(files[matched + next], std::move(results[next]));
+  }
   chain_.start = start;
   chain_.generation = generation_;
   chain_.valid = true;
   ++chain_.version;
+}
+
+std::string_view VerilogFileCache::Chain::Path(std::size_t index) const {
+  const std::size_t begin = index == 0 ? 0 : pathEnds[index - 1];
+  return std::string_view(paths).substr(begin, pathEnds[index] - begin);
+}
+
+void VerilogFileCache::Chain::Truncate(std::size_t length) {
+  if (length >= Length()) {
+    return;
+  }
+  paths.resize(length == 0 ? 0 : pathEnds[length - 1]);
+  pathEnds.resize(length);
+  results.resize(length);
+}
+
+void VerilogFileCache::Chain::Append(std::string_view path, std::shared_ptr<const VerilogFileResult> result) {
+  paths.append(path);
+  pathEnds.push_back(paths.size());
+  results.push_back(std::move(result));
 }
 
 VerilogFileCache::Found VerilogFileCache::Find(std::string_view path, const Context& context,

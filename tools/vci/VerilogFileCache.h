@@ -60,6 +60,9 @@ class VerilogFileCache {
                                                         std::uint64_t includeDirs,
                                                         const CompileFile& compile);
 
+  // Forgets every result, so that the next compiles read every file again.
+  void Clear();
+
   // Files compiled into the cache since construction; lets tests see the work done.
   std::uint64_t ScannedFileCount() const;
   bool WatchesFiles() const { return watch_ != nullptr; }
@@ -88,16 +91,22 @@ class VerilogFileCache {
     std::size_t operator()(std::string_view path) const { return std::hash<std::string_view>()(path); }
   };
   using Nodes = std::unordered_map<std::string, Node, PathHash, std::equal_to<>>;
-  struct ChainLink {
-    std::string path;
-    std::shared_ptr<const VerilogFileResult> result;
-  };
+  using Results = std::vector<std::shared_ptr<const VerilogFileResult>>;
+  // Every compile of a project compares its files with the chain, so the paths are kept one
+  // after the other in one text, read in one sweep.
   struct Chain {
     bool valid = false;
     std::uint64_t version = 0;  // counts the chains remembered
     std::uint64_t generation = 0;
     Context start;
-    std::vector<ChainLink> links;
+    std::string paths;
+    std::vector<std::size_t> pathEnds;
+    Results results;
+
+    std::size_t Length() const { return results.size(); }
+    std::string_view Path(std::size_t index) const;
+    void Truncate(std::size_t length);
+    void Append(std::string_view path, std::shared_ptr<const VerilogFileResult> result);
   };
   // What a lookup or a store found out about one file of a chain.
   struct Found {
@@ -107,7 +116,9 @@ class VerilogFileCache {
 
   void TakeWatchedChanges();
   std::size_t MatchRememberedChain(const std::vector<std::string_view>& files, const Context& start) const;
-  void RememberChain(const Context& start, std::size_t matched, std::vector<ChainLink> links);
+  // The files from `matched` on have `results`, as many of them.
+  void RememberChain(const Context& start, const std::vector<std::string_view>& files, std::size_t matched,
+                     Results results);
   Found Find(std::string_view path, const Context& context, bool checkDisk);
   Found Store(std::string_view path, const VerilogFileStamp& stamp, const Context& context,
               std::shared_ptr<const VerilogFileResult> result);
