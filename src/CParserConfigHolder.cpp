@@ -1,7 +1,5 @@
 #include "CParserConfigHolder.h"
 
-#include "CProjectFileList.h"
-
 #include <utility>
 
 #include "Arch.h"
@@ -431,16 +429,17 @@ void CParserConfigHolder::SetEntityPortFlag(bool flag) {
 
 // ---- the parse run -------------------------------------------------------------------------------
 
-const std::vector<Port::StringBase>& CParserConfigHolder::GetSiblingPaths() const {
-  static const PathList kNone;
+const SiblingPaths& CParserConfigHolder::GetSiblingPaths() const {
+  static const SiblingPaths kNone;
   return siblingPaths_ ? *siblingPaths_ : kNone;
 }
 
-std::shared_ptr<const PathList> CParserConfigHolder::SiblingPathsOf(IHdlFileIterator* projectFiles) const {
+std::shared_ptr<const SiblingPaths> CParserConfigHolder::SiblingPathsOf(
+    IHdlFileIterator* projectFiles) const {
   Port::StringBase pluginName;
   GetPluginName(pluginName);
   if (auto* shared = dynamic_cast<CProjectFileList*>(projectFiles)) return shared->PathsOfPlugin(pluginName);
-  return std::make_shared<const PathList>(CollectPathsOfPlugin(projectFiles, pluginName));
+  return std::make_shared<const SiblingPaths>(CollectPathsOfPlugin(projectFiles, pluginName));
 }
 
 void CParserConfigHolder::BeginParse(IHdlFileIterator* projectFiles) {
@@ -487,19 +486,19 @@ CitI::Result CParserConfigHolder::IsUpToDate(bool* valid, IHdlFileIterator* proj
   Port::StringBase library;
   GetLibraryName(library);
   if (library != library_) return CitI::kOk;
-  const PathList& stored = GetSiblingPaths();
+  const std::vector<Port::StringBase>& stored = GetSiblingPaths().Paths();
   if (!projectFiles) {
     *valid = stored.empty();
     return CitI::kOk;
   }
-  std::shared_ptr<const PathList> current = SiblingPathsOf(projectFiles);
+  std::shared_ptr<const SiblingPaths> current = SiblingPathsOf(projectFiles);
   if (current == siblingPaths_) {
     *valid = true;
     return CitI::kOk;
   }
-  if (current->size() != stored.size()) return CitI::kOk;
+  if (current->Paths().size() != stored.size()) return CitI::kOk;
   for (std::size_t i = 0; i < stored.size(); ++i) {
-    if (!(*current)[i].Equals(stored[i].view(), Port::kCompareNoCase)) return CitI::kOk;
+    if (!current->Paths()[i].Equals(stored[i].view(), Port::kCompareNoCase)) return CitI::kOk;
   }
   *valid = true;
   return CitI::kOk;

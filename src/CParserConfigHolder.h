@@ -13,6 +13,7 @@
 #include "Port/StringBase.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/TRefCountHelper.h"
+#include "SiblingPaths.h"
 
 namespace Vad {
 
@@ -75,7 +76,7 @@ class CParserConfigHolder final : public CitI::IInterface {
   void SetTypeIds(const TypeIds& ids);
   const Port::XUID& GetTypeId(TypeSlot slot) const { return typeIds_[slot]; }
   // Full paths of the project's files with this file's plug-in name, as the last parse began.
-  const std::vector<Port::StringBase>& GetSiblingPaths() const;
+  const SiblingPaths& GetSiblingPaths() const;
   // The device part named by the last EDIF netlist parsed.
   void SetPart(const Port::StringBase& part) { part_ = part; }
   const Port::StringBase& GetPart() const { return part_; }
@@ -141,7 +142,7 @@ class CParserConfigHolder final : public CitI::IInterface {
   bool IsLibraryCell(const Port::StringBase& component) const;
   // Paths of the listed files whose plug-in name is this file's, ignoring case, in list order.
   // Shared between the files of one project list (see CProjectFileList).
-  std::shared_ptr<const std::vector<Port::StringBase>> SiblingPathsOf(IHdlFileIterator* projectFiles) const;
+  std::shared_ptr<const SiblingPaths> SiblingPathsOf(IHdlFileIterator* projectFiles) const;
   // Re-registers an instance under its first label.
   void RenameInstance(CHdlElement* instance, const Port::StringBase& label);
   void CopyInstance(const Port::StringBase& label);
@@ -149,7 +150,7 @@ class CParserConfigHolder final : public CitI::IInterface {
   CHdlFile* file_ = nullptr;
   Port::StringBase signature_;
   Port::StringBase library_;
-  std::shared_ptr<const std::vector<Port::StringBase>> siblingPaths_;
+  std::shared_ptr<const SiblingPaths> siblingPaths_;
   Port::StringBase part_;
   std::map<Port::StringBase, Port::StringBase> componentBindings_;
   TypeIds typeIds_;

@@ -5,8 +5,9 @@
 
 namespace Vad {
 
-PathList CollectPathsOfPlugin(IHdlFileIterator* files, const Port::StringBase& pluginName) {
-  PathList paths;
+std::vector<Port::StringBase> CollectPathsOfPlugin(IHdlFileIterator* files,
+                                                   const Port::StringBase& pluginName) {
+  std::vector<Port::StringBase> paths;
   if (!files) return paths;
   for (files->First(); !files->IsDone(); files->Next()) {
     IHdlFile* file = files->Current();
@@ -27,11 +28,11 @@ Prjrep::AutoRelease<IHdlFileIterator> CProjectFileList::New(const std::vector<IH
   return Prjrep::AutoRelease<IHdlFileIterator>(new CProjectFileList(std::move(entries)));
 }
 
-std::shared_ptr<const PathList> CProjectFileList::PathsOfPlugin(const Port::StringBase& pluginName) {
+std::shared_ptr<const SiblingPaths> CProjectFileList::PathsOfPlugin(const Port::StringBase& pluginName) {
   Port::StringBase key = pluginName;
   key.MakeLower();
   auto& paths = pathsByPlugin_[key];
-  if (!paths) paths = std::make_shared<const PathList>(CollectPathsOfPlugin(this, pluginName));
+  if (!paths) paths = std::make_shared<const SiblingPaths>(CollectPathsOfPlugin(this, pluginName));
   return paths;
 }
 

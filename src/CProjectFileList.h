@@ -9,14 +9,14 @@
 #include "Port/StringBase.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/TListIter.h"
+#include "SiblingPaths.h"
 
 namespace Vad {
 
-using PathList = std::vector<Port::StringBase>;
-
 // Full paths of the files in `files` whose plug-in name equals `pluginName` ignoring case, in
 // list order. Moves the iterator.
-PathList CollectPathsOfPlugin(IHdlFileIterator* files, const Port::StringBase& pluginName);
+std::vector<Port::StringBase> CollectPathsOfPlugin(IHdlFileIterator* files,
+                                                   const Port::StringBase& pluginName);
 
 // A file iterator that also answers, once per plug-in name, the paths of its files of that
 // plug-in. Every file of a project asks the same question of the same list, so the answer is
@@ -25,7 +25,7 @@ class CProjectFileList final : public Prjrep::TListIter<IHdlFileIterator, Prjrep
  public:
   static Prjrep::AutoRelease<IHdlFileIterator> New(const std::vector<IHdlFile*>& files);
 
-  std::shared_ptr<const PathList> PathsOfPlugin(const Port::StringBase& pluginName);
+  std::shared_ptr<const SiblingPaths> PathsOfPlugin(const Port::StringBase& pluginName);
 
  protected:
   IHdlFile* Convert(Prjrep::AutoPtr<IHdlFile>& entry) override { return entry.Get(); }
@@ -33,7 +33,7 @@ class CProjectFileList final : public Prjrep::TListIter<IHdlFileIterator, Prjrep
  private:
   using TListIter::TListIter;
 
-  std::map<Port::StringBase, std::shared_ptr<const PathList>> pathsByPlugin_;
+  std::map<Port::StringBase, std::shared_ptr<const SiblingPaths>> pathsByPlugin_;
 };
 
 }  // namespace Vad

@@ -3,6 +3,7 @@
 #include "CParserConfigHolder.h"
 #include "Port/Env.h"
 #include "Port/FileName.h"
+#include "SiblingPaths.h"
 
 namespace Vad {
 namespace {
@@ -29,14 +30,12 @@ VerilogArguments::VerilogArguments(const CParserConfigHolder& holder) {
   AddOptions(holder);
 }
 
-void VerilogArguments::AddFiles(const std::vector<Port::StringBase>& siblings) {
-  argv_.reserve(siblings.size() + 7);
+void VerilogArguments::AddFiles(const SiblingPaths& siblings) {
+  const auto texts = siblings.Texts().begin();
+  const auto before = static_cast<std::ptrdiff_t>(siblings.CountBefore(ownPath_.view()));
+  argv_.reserve(static_cast<std::size_t>(before) + 8);
   argv_.push_back(kCommandName);
-  // Runs once per sibling of every file of a project, so the inlined comparison of std::string.
-  for (const Port::StringBase& sibling : siblings) {
-    if (sibling.str() == ownPath_.str()) break;
-    argv_.push_back(sibling.c_str());
-  }
+  argv_.insert(argv_.end(), texts, texts + before);
   argv_.push_back(ownPath_.c_str());
 }
 

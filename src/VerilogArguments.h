@@ -11,6 +11,7 @@
 namespace Vad {
 
 class CParserConfigHolder;
+class SiblingPaths;
 
 class VerilogArguments {
  public:
@@ -29,7 +30,7 @@ class VerilogArguments {
 
   // Reads the holder's full path, sibling paths and properties. The vector points into the
   // holder's sibling paths, which must stay unchanged while it is used: a project's files are
-  // thus not copied for each of its files.
+  // thus neither copied nor compared for each of its files.
   explicit VerilogArguments(const CParserConfigHolder& holder);
   VerilogArguments(const VerilogArguments&) = delete;
   VerilogArguments& operator=(const VerilogArguments&) = delete;
@@ -45,7 +46,7 @@ class VerilogArguments {
   static Port::StringBase IncludeOption(const Port::StringBase& includeDirs, const Port::StringBase& ownPath);
 
  private:
-  void AddFiles(const std::vector<Port::StringBase>& siblings);
+  void AddFiles(const SiblingPaths& siblings);
   void AddOptions(const CParserConfigHolder& holder);
 
   Port::StringBase ownPath_;

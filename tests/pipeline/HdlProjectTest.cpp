@@ -211,11 +211,11 @@ TEST_F(HdlProject, VerilogFilesAreListedToEveryParseByOrderKeyLargestFirst) {
 
   AllUnitKeys();
   const std::vector<Port::StringBase> expected{"/p/b_high.v", "/p/a_low.v", "/p/c_tie.v"};
-  EXPECT_EQ(HolderOf(low.Get())->GetSiblingPaths(), expected);
-  EXPECT_EQ(HolderOf(high.Get())->GetSiblingPaths(), expected);
-  EXPECT_TRUE(HolderOf(vhdl.Get())->GetSiblingPaths().empty());
+  EXPECT_EQ(HolderOf(low.Get())->GetSiblingPaths().Paths(), expected);
+  EXPECT_EQ(HolderOf(high.Get())->GetSiblingPaths().Paths(), expected);
+  EXPECT_TRUE(HolderOf(vhdl.Get())->GetSiblingPaths().Paths().empty());
   // A Verilog file outside the survey finds its siblings in the list all the same.
-  EXPECT_EQ(HolderOf(notV3.Get())->GetSiblingPaths(), expected);
+  EXPECT_EQ(HolderOf(notV3.Get())->GetSiblingPaths().Paths(), expected);
   // One list for all the files of a pass, not a copy per file.
   EXPECT_EQ(&HolderOf(low.Get())->GetSiblingPaths(), &HolderOf(high.Get())->GetSiblingPaths());
 
@@ -224,7 +224,7 @@ TEST_F(HdlProject, VerilogFilesAreListedToEveryParseByOrderKeyLargestFirst) {
   Prjrep::AutoPtr<CitI::IInterface> before = OnlyUnit(high.Get());  // generic: name in another case
   ASSERT_TRUE(before);
   AllUnitKeys();
-  EXPECT_EQ(HolderOf(low.Get())->GetSiblingPaths(),
+  EXPECT_EQ(HolderOf(low.Get())->GetSiblingPaths().Paths(),
             (std::vector<Port::StringBase>{"/p/a_low.v", "/p/c_tie.v", "/p/b_high.v"}));
   EXPECT_NE(OnlyUnit(high.Get()).Get(), before.Get());
 }

@@ -328,7 +328,7 @@ TEST_F(Holder, UpToDateFollowsSignatureLibraryAndSiblingFilesInOrder) {
   SetProperty(project_.Get(), "PROP_Parse_Target", "synthesis");
   Prjrep::AutoRelease<Vad::IHdlFileIterator> list;
   holder_->BeginParse(ListOf(list, {other.Get(), verilog.Get(), file_.Get()}));
-  EXPECT_EQ(holder_->GetSiblingPaths(),
+  EXPECT_EQ(holder_->GetSiblingPaths().Paths(),
             (std::vector<Port::StringBase>{"/proj/src/other.vhd", "/proj/src/counter.vhd"}));
   holder_->EndParse();
 
