@@ -183,3 +183,36 @@ TEST(VpiAccess, AnswersTheQueriesOfAModuleWalk) {
   EXPECT_EQ(access.get_str(vpiName, nullptr), "");
   EXPECT_FALSE(Hx_VpiAccess(nullptr).iterate(vpiModule, nullptr));
 }
+
+TEST(VpiObject, PropertiesPastTheFirstFewAreKeptReplacedAndRemoved) {
+  Hx_VpiHandlePtr object = Hx_VpiHandlePtr::Make(vpiModule);
+  for (int property = 1; property <= 5; ++property) {
+    object->SetInt(property, property * 10);
+    object->SetStr(property, "text " + std::to_string(property));
+  }
+  object->SetInt(1, -1);
+  object->SetStr(4, "replaced");
+  EXPECT_EQ(object->GetInt(1), -1);
+  EXPECT_EQ(object->GetInt(5), 50);
+  EXPECT_EQ(object->GetInt(6), vpiUndefined);
+  EXPECT_EQ(object->GetStr(1), "text 1");
+  EXPECT_EQ(object->GetStr(4), "replaced");
+  EXPECT_EQ(object->GetStr(5), "text 5");
+
+  constexpr int kHighConnection = 79;
+  Hx_VpiHandlePtr first = Hx_VpiHandlePtr::Make(vpiNet);
+  Hx_VpiHandlePtr second = Hx_VpiHandlePtr::Make(vpiNet);
+  Hx_VpiHandlePtr third = Hx_VpiHandlePtr::Make(vpiNet);
+  object->SetRelated(vpiLowConn, first);
+  object->SetRelated(kHighConnection, second);
+  object->SetRelated(vpiLowConn, third);
+  EXPECT_EQ(first.UseCount(), 1) << "a replaced relation lets go of its object";
+  EXPECT_EQ(object->GetRelated(vpiLowConn), third);
+  object->SetRelated(vpiLowConn, nullptr);
+  EXPECT_FALSE(object->GetRelated(vpiLowConn));
+  EXPECT_EQ(object->GetRelated(kHighConnection), second);
+  EXPECT_EQ(third.UseCount(), 1);
+  object->SetRelated(kHighConnection, nullptr);
+  EXPECT_FALSE(object->GetRelated(kHighConnection));
+  EXPECT_EQ(second.UseCount(), 1);
+}

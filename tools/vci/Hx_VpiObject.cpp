@@ -9,30 +9,30 @@ Hx_VpiObject::Hx_VpiObject(int type) : type_(type) {}
 Hx_VpiObject::~Hx_VpiObject() = default;
 
 int Hx_VpiObject::GetInt(int property) const {
-  auto found = ints_.find(property);
-  return found == ints_.end() ? vpiUndefined : found->second;
+  const int* value = ints_.Find(property);
+  return value ? *value : vpiUndefined;
 }
 
-void Hx_VpiObject::SetInt(int property, int value) { ints_[property] = value; }
+void Hx_VpiObject::SetInt(int property, int value) { ints_.Set(property, value); }
 
 std::string Hx_VpiObject::GetStr(int property) const {
-  auto found = strs_.find(property);
-  return found == strs_.end() ? std::string() : found->second;
+  const std::string* value = strs_.Find(property);
+  return value ? *value : std::string();
 }
 
-void Hx_VpiObject::SetStr(int property, std::string value) { strs_[property] = std::move(value); }
+void Hx_VpiObject::SetStr(int property, std::string value) { strs_.Set(property, std::move(value)); }
 
 Hx_VpiHandlePtr Hx_VpiObject::GetRelated(int relation) const {
-  auto found = relations_.find(relation);
-  return found == relations_.end() ? nullptr : found->second;
+  const Hx_VpiHandlePtr* target = relations_.Find(relation);
+  return target ? *target : nullptr;
 }
 
 void Hx_VpiObject::SetRelated(int relation, Hx_VpiHandlePtr target) {
   if (!target) {
-    relations_.erase(relation);
+    relations_.Erase(relation);
     return;
   }
-  relations_[relation] = std::move(target);
+  relations_.Set(relation, std::move(target));
 }
 
 void Hx_VpiObject::AddChild(Hx_VpiHandlePtr child) {

@@ -5,10 +5,10 @@
 // relations such as a port's low connection); a reference back up would keep both alive forever.
 #pragma once
 
-#include <map>
 #include <string>
 #include <vector>
 
+#include "vci/Hx_VpiProperties.h"
 #include "vci/Hx_VpiPtr.h"
 
 class Hx_VpiObject;
@@ -41,8 +41,8 @@ class Hx_VpiObject : public Hx_VpiCounted {
 
  private:
   int type_;
-  std::map<int, int> ints_;
-  std::map<int, std::string> strs_;
-  std::map<int, Hx_VpiHandlePtr> relations_;
+  Hx_VpiProperties<int, 1> ints_;
+  Hx_VpiProperties<std::string, 2> strs_;
+  Hx_VpiProperties<Hx_VpiHandlePtr, 1> relations_;
   std::vector<Hx_VpiHandlePtr> children_;
 };
