@@ -37,8 +37,7 @@ CitI::Result Arch::Save(Prjrep::IArchive* archive) {
 void Arch::ComposeStoreKey(Port::StringBase& key) {
   Port::StringBase prefix;
   AppendKeyPrefix(prefix);
-  key.Format("%s|%s|%s|%s|", prefix.c_str(), architectureName_.c_str(), entityName_.c_str(),
-             reservedB_.c_str());
+  JoinKeyFields(key, {prefix.view(), architectureName_.view(), entityName_.view(), reservedB_.view(), ""});
   SetKey(key.view());
 }
 

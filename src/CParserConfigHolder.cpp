@@ -394,7 +394,7 @@ void CParserConfigHolder::AddTestVector(const Port::StringBase& name) {
   Port::StringBase prefix;
   vectorModule->AppendKeyPrefix(prefix);
   Port::StringBase key;
-  key.Format("%s|%s", prefix.c_str(), name.c_str());
+  DbObject::JoinKeyFields(key, {prefix.view(), name.view()});
   if (!Enter(vectorModule, key, 0, typeIds_[kTestVectorSlot])) return;
 
   auto* instance = new CompInst(name.view(), name.view(), vectorModule);

@@ -50,7 +50,7 @@ void CompInst::ComposeStoreKey(Port::StringBase& key) {
   }
   Port::StringBase prefix;
   AppendKeyPrefix(prefix);
-  key.Format("%s|%s|%s|%s|%s|", prefix.c_str(), entity, architecture, label_.c_str(), componentName_.c_str());
+  JoinKeyFields(key, {prefix.view(), entity, architecture, label_.view(), componentName_.view(), ""});
   SetKey(key.view());
 }
 

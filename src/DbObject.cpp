@@ -72,8 +72,18 @@ const char* DbObject::TypeNameOf(std::uint32_t type) {
 
 void DbObject::AppendKeyPrefix(Port::StringBase& key) const {
   Port::StringBase prefix;
-  prefix.Format("%s|%s|", key.c_str(), GetTypeName());
+  JoinKeyFields(prefix, {key.view(), GetTypeName(), ""});
   key.Append(prefix.view());
+}
+
+void DbObject::JoinKeyFields(Port::StringBase& key, std::initializer_list<std::string_view> fields) {
+  key.Empty();
+  bool first = true;
+  for (std::string_view field : fields) {
+    if (!first) key.Append('|');
+    key.Append(field);
+    first = false;
+  }
 }
 
 CitI::Result DbObject::PersistObject(Prjrep::IArchive* archive, bool saving) {

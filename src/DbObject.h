@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <initializer_list>
 #include <ranges>
 #include <string_view>
 #include <vector>
@@ -81,6 +82,9 @@ class DbObject : public CitI::IInterface {
   // Appends "<key>|<type name>|" to `key`; every caller passes it empty, which gives the store-key
   // prefix "|<type name>|".
   void AppendKeyPrefix(Port::StringBase& key) const;
+  // `key` becomes the fields with a '|' between each two. A parse makes a key for every record,
+  // so this is plain appending rather than formatting.
+  static void JoinKeyFields(Port::StringBase& key, std::initializer_list<std::string_view> fields);
 
   // Saves or loads type, parent reference, owned children, name, store key and a reserved flag.
   // The first archive result other than 1 is returned unchanged.

@@ -34,7 +34,7 @@ CitI::Result EntityDecl::Save(Prjrep::IArchive* archive) {
 void EntityDecl::ComposeStoreKey(Port::StringBase& key) {
   Port::StringBase prefix;
   AppendKeyPrefix(prefix);
-  key.Format("%s|%s", prefix.c_str(), entityName_.c_str());
+  JoinKeyFields(key, {prefix.view(), entityName_.view()});
   SetKey(key.view());
 }
 

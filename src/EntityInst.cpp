@@ -45,8 +45,8 @@ void EntityInst::ComposeStoreKey(Port::StringBase& key) {
   }
   Port::StringBase prefix;
   AppendKeyPrefix(prefix);
-  key.Format("%s|%s|%s|%s|%s|%s|%s", prefix.c_str(), entity, architecture, label_.c_str(),
-             entityName_.c_str(), reserved_.c_str(), architectureName_.c_str());
+  JoinKeyFields(key, {prefix.view(), entity, architecture, label_.view(), entityName_.view(),
+                      reserved_.view(), architectureName_.view()});
   SetKey(key.view());
 }
 

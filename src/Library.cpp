@@ -26,7 +26,7 @@ CitI::Result Library::Save(Prjrep::IArchive* archive) {
 }
 
 void Library::ComposeStoreKey(Port::StringBase& key) {
-  key.Format("|%s|%s|%s|", "", GetTypeName(), libraryName_.c_str());
+  JoinKeyFields(key, {"", "", GetTypeName(), libraryName_.view(), ""});
   SetKey(key.view());
 }
 

@@ -35,7 +35,7 @@ CitI::Result PackageDecl::Save(Prjrep::IArchive* archive) {
 void PackageDecl::ComposeStoreKey(Port::StringBase& key) {
   Port::StringBase prefix;
   AppendKeyPrefix(prefix);
-  key.Format("%s|%s|", prefix.c_str(), packageName_.c_str());
+  JoinKeyFields(key, {prefix.view(), packageName_.view(), ""});
   SetKey(key.view());
 }
 

@@ -43,7 +43,7 @@ void Use::SetParts(std::string_view library, std::string_view package, std::stri
 }
 
 void Use::ComposeStoreKey(Port::StringBase& key) {
-  key.Format("|%s|%s|%s|%s|%s|", "", GetTypeName(), library_.c_str(), package_.c_str(), item_.c_str());
+  JoinKeyFields(key, {"", "", GetTypeName(), library_.view(), package_.view(), item_.view(), ""});
   SetKey(key.view());
 }
 

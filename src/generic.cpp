@@ -35,7 +35,7 @@ CitI::Result generic::Save(Prjrep::IArchive* archive) {
 void generic::ComposeStoreKey(Port::StringBase& key) {
   Port::StringBase prefix;
   AppendKeyPrefix(prefix);
-  key.Format("%s|%s", prefix.c_str(), genericName_.c_str());
+  JoinKeyFields(key, {prefix.view(), genericName_.view()});
   SetKey(key.view());
 }
 

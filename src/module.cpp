@@ -34,7 +34,7 @@ CitI::Result module::Save(Prjrep::IArchive* archive) {
 void module::ComposeStoreKey(Port::StringBase& key) {
   Port::StringBase prefix;
   AppendKeyPrefix(prefix);
-  key.Format("%s|%s", prefix.c_str(), moduleName_.c_str());
+  JoinKeyFields(key, {prefix.view(), moduleName_.view()});
   SetKey(key.view());
 }
 
