@@ -30,7 +30,6 @@
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/Casts.h"
 
-
 namespace {
 
 constexpr std::uint64_t kCorpusSeed = 20240917;
@@ -40,7 +39,6 @@ constexpr std::size_t kFileCount = 10000;
 #else
 constexpr std::size_t kFileCount = 1000;
 #endif
-
 
 // The generated files in a temporary directory of their own, removed at exit.
 class CorpusOnDisk {
@@ -88,7 +86,6 @@ const CorpusOnDisk& Corpus(std::int64_t variant) {
   return variant == 0 ? acyclic : withCycles;
 }
 
-
 // A project of all the corpus files, set up the way a host does it.
 Prjrep::AutoPtr<Vad::IHdlProject> NewProject(const std::vector<std::string>& paths) {
   auto project = Prjrep::CreateInstanceAs<Vad::IHdlProject>(Vad::ClassIds::CHdlProject());
@@ -125,7 +122,8 @@ std::size_t CountNodes(Vad::IHdlNetListNode* root) {
 void BM_GetCompileOrder(benchmark::State& state) {
   bench::QuietMessages quiet;
   const auto& corpus = Corpus(state.range(0));
-  auto project = bench::RegisterComponentsOnce() ? NewProject(corpus.paths()) : Prjrep::AutoPtr<Vad::IHdlProject>();
+  auto project =
+      bench::RegisterComponentsOnce() ? NewProject(corpus.paths()) : Prjrep::AutoPtr<Vad::IHdlProject>();
   Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
   Prjrep::AutoPtr<Vad::IHdlParserConfig> config;
   Prjrep::AutoRelease<Vad::CElaborator> elaborator;

@@ -12,6 +12,8 @@
 #include <utility>
 #include <vector>
 
+#include "SeededRandom.h"
+
 namespace QuillonBench {
 
 struct CorpusFile {
@@ -32,7 +34,7 @@ class DesignTreeCorpus {
     int backReferencePercent = 0;
   };
 
-  DesignTreeCorpus(std::uint64_t seed, Options options) : state_(seed ? seed : 1), options_(options) {}
+  DesignTreeCorpus(std::uint64_t seed, Options options) : random_(seed), options_(options) {}
 
   std::vector<CorpusFile> Generate() {
     files_.clear();
@@ -44,14 +46,8 @@ class DesignTreeCorpus {
   }
 
  private:
-  std::uint64_t Next() {
-    state_ ^= state_ >> 12;
-    state_ ^= state_ << 25;
-    state_ ^= state_ >> 27;
-    return state_ * 0x2545F4914F6CDD1Dull;
-  }
-  std::size_t Below(std::size_t bound) { return static_cast<std::size_t>(Next() % bound); }
-  bool Chance(int percent) { return static_cast<int>(Below(100)) < percent; }
+  std::size_t Below(std::size_t bound) { return random_.Below(bound); }
+  bool Chance(int percent) { return random_.Chance(percent); }
 
   static std::string Design(std::size_t i) {
     std::string name("d");
@@ -144,7 +140,7 @@ class DesignTreeCorpus {
 
   static constexpr std::size_t kNone = static_cast<std::size_t>(-1);
 
-  std::uint64_t state_;
+  SeededRandom random_;
   Options options_;
   std::vector<CorpusFile> files_;
   std::vector<std::size_t> parents_;

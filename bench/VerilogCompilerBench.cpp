@@ -10,6 +10,7 @@
 #include <string>
 #include <vector>
 
+#include "SeededRandom.h"
 #include "vci/Hx_Vci.h"
 #include "vci/VerilogFileCache.h"
 
@@ -20,7 +21,7 @@ namespace {
 // with parameter overrides, generate loops, comments, an include and a few project-wide macros.
 class VerilogGenerator {
  public:
-  explicit VerilogGenerator(std::uint64_t seed) : state_(seed) {}
+  explicit VerilogGenerator(std::uint64_t seed) : random_(seed) {}
 
   std::string Module(int index, int earlierModules) {
     const std::string name = NameOf(index);
@@ -90,14 +91,9 @@ class VerilogGenerator {
     *text += "    .dout_0(s_" + std::to_string(Below(signals)) + ")\n  );\n";
   }
 
-  int Below(int bound) {
-    state_ ^= state_ << 13;
-    state_ ^= state_ >> 7;
-    state_ ^= state_ << 17;
-    return static_cast<int>(state_ % static_cast<std::uint64_t>(bound));
-  }
+  int Below(int bound) { return random_.Below(bound); }
 
-  std::uint64_t state_;
+  SeededRandom random_;
 };
 
 constexpr char kCommonDefs[] =

@@ -30,6 +30,7 @@
 #include "Port/StringBase.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/Casts.h"
+#include "SeededRandom.h"
 #include "VerilogParser.h"
 #include "vci/VerilogFileCache.h"
 
@@ -57,7 +58,7 @@ class VerilogProjectGenerator {
       "`define PICK(sel, a, b) ((sel) ? (a) : (b))\n"
       "`endif\n";
 
-  explicit VerilogProjectGenerator(std::uint64_t seed) : state_(seed | 1) {}
+  explicit VerilogProjectGenerator(std::uint64_t seed) : random_(seed) {}
 
   std::vector<GeneratedFile> Project(int fileCount) {
     std::vector<GeneratedFile> files;
@@ -151,14 +152,9 @@ class VerilogProjectGenerator {
 
   static std::string WidthMacro(int index) { return "UNIT" + std::to_string(index) + "_W"; }
 
-  int Below(int bound) {
-    state_ ^= state_ << 13;
-    state_ ^= state_ >> 7;
-    state_ ^= state_ << 17;
-    return static_cast<int>(state_ % static_cast<std::uint64_t>(bound));
-  }
+  int Below(int bound) { return random_.Below(bound); }
 
-  std::uint64_t state_;
+  SeededRandom random_;
 };
 
 // A new temporary directory holding the given files, removed with them.

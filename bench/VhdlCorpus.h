@@ -10,11 +10,13 @@
 #include <string_view>
 #include <vector>
 
+#include "SeededRandom.h"
+
 namespace QuillonBench {
 
 class VhdlCorpus {
  public:
-  explicit VhdlCorpus(std::uint64_t seed) : state_(seed ? seed : 1) {}
+  explicit VhdlCorpus(std::uint64_t seed) : random_(seed) {}
 
   // Design units, one after another, until the text holds at least `minimumBytes`.
   std::string Generate(std::size_t minimumBytes) {
@@ -28,15 +30,8 @@ class VhdlCorpus {
   }
 
  private:
-  // xorshift64*: the same sequence everywhere, unlike the standard distributions.
-  std::uint64_t Next() {
-    state_ ^= state_ >> 12;
-    state_ ^= state_ << 25;
-    state_ ^= state_ >> 27;
-    return state_ * 0x2545F4914F6CDD1Dull;
-  }
-  int Below(int bound) { return static_cast<int>(Next() % static_cast<std::uint64_t>(bound)); }
-  bool Chance(int percent) { return Below(100) < percent; }
+  int Below(int bound) { return random_.Below(bound); }
+  bool Chance(int percent) { return random_.Chance(percent); }
   template <std::size_t N>
   std::string_view Pick(const std::string_view (&words)[N]) {
     return words[Below(static_cast<int>(N))];
@@ -242,7 +237,7 @@ class VhdlCorpus {
                                                    "reset is active low",        "keeps the handshake simple",
                                                    "one word per cycle at most", "see the block diagram"};
 
-  std::uint64_t state_;
+  SeededRandom random_;
   int unitCount_ = 0;
   int labelCount_ = 0;
   std::string packageName_;

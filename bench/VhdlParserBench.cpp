@@ -21,11 +21,9 @@
 #include "Prjrep/Casts.h"
 #include "VhdlCorpus.h"
 
-
 namespace {
 
 constexpr std::uint64_t kCorpusSeed = 20240611;
-
 
 // A VHDL file of the generated corpus inside a project, the way a host sets one up.
 class CorpusProject {

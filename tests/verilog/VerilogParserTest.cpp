@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "Port/MsgManData.h"
+#include "SeededRandom.h"
 #include "VerilogParser.h"
 #include "VerilogTestFixture.h"
 #include "vci/VerilogMessageLog.h"
@@ -28,19 +29,6 @@ namespace Text = Hx_Vci::VerilogMessageText;
 template <class... Args>
 std::string CompilerText(const char* format, Args... args) {
   return Hx_Vci::VerilogMessageLog::Format(format, args...);
-}
-
-// Bytes of every value, the same on every run.
-std::string PseudoRandomBytes(std::size_t count) {
-  std::string bytes(count, '\0');
-  std::uint64_t state = 0x9E3779B97F4A7C15ull;
-  for (char& byte : bytes) {
-    state ^= state << 13;
-    state ^= state >> 7;
-    state ^= state << 17;
-    byte = static_cast<char>(state >> 56);
-  }
-  return bytes;
 }
 
 using VerilogParse = VerilogProject;
@@ -183,7 +171,9 @@ TEST_F(VerilogParse, IncludeFilesAreFoundInTheProjectIncludeDirectories) {
 }
 
 TEST_F(VerilogParse, BadInputGivesACapturedMessageAndKeepsWhatWasRecognised) {
-  auto binary = AddVerilog(Write("binary.v", "module before_junk; endmodule\n" + PseudoRandomBytes(4096)), 1);
+  auto binary = AddVerilog(
+      Write("binary.v", "module before_junk; endmodule\n" + SeededRandom(0x9E3779B97F4A7C15ull).Bytes(4096)),
+      1);
   EXPECT_THAT(ParseAlone(binary.Get()), Not(IsEmpty()));
   EXPECT_THAT(Describe(binary.Get()), Contains("|Module||before_junk line 1 module"));
 

@@ -9,6 +9,7 @@
 
 #include "Port/File.h"
 #include "Port/StringBase.h"
+#include "SeededRandom.h"
 #include "VhdlParser.h"
 #include "VhdlTestFixture.h"
 
@@ -27,19 +28,6 @@ std::string FileNotFound(const std::string& path, const char* reason) {
     text.Format(Vad::VhdlParser::kFileNotFound, path.c_str());
   }
   return text.str();
-}
-
-// Bytes of every value, the same on every run.
-std::string PseudoRandomBytes(std::size_t count) {
-  std::string bytes(count, '\0');
-  std::uint64_t state = 0x9E3779B97F4A7C15ull;
-  for (char& byte : bytes) {
-    state ^= state << 13;
-    state ^= state >> 7;
-    state ^= state << 17;
-    byte = static_cast<char>(state >> 56);
-  }
-  return bytes;
 }
 
 TEST_F(VhdlParse, RecordsEveryUnitOfAMultiUnitDesignWithLinesParentsAndContext) {
@@ -314,8 +302,8 @@ TEST_F(VhdlParse, ListTooDeepForTheParseStackEndsTheParseQuietly) {
 }
 
 TEST_F(VhdlParse, BinaryBytesAreScannedWithoutHarm) {
-  std::string source =
-      "entity before is end;\n" + PseudoRandomBytes(1 << 20) + "\n;\n;\nentity after is end;\n";
+  std::string source = "entity before is end;\n" + SeededRandom(0x9E3779B97F4A7C15ull).Bytes(1 << 20) +
+                       "\n;\n;\nentity after is end;\n";
   std::vector<std::string> units = Parse(source);
   EXPECT_THAT(units, Contains("|Entity||before line 1 entity uses []"));
   EXPECT_THAT(units, Contains(testing::StartsWith("|Entity||after line ")));
