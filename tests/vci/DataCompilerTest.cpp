@@ -155,7 +155,41 @@ TEST(VerilogDataCompiler, GatesDeclarationsProcessesAndPrimitivesAreNoInstances)
                           "  last_cell u_last (a);\n"
                           "endmodule\n");
   ASSERT_EQ(NamesOf(modules), Strings{"top"});
-  EXPECT_EQ(InstanceNamesOf(modules[0]), (Strings{"cell u_attr", "mux_udp u_udp", "last_cell u_last"}));
+  EXPECT_EQ(InstanceNamesOf(modules[0]), (Strings{"cell u_attr", "last_cell u_last"}));
+  EXPECT_TRUE(messages.records().empty()) << messages.All();
+}
+
+// A primitive is known from its declaration on, in its own file or an earlier one of the compile,
+// also when the files come from the cache.
+TEST(VerilogDataCompiler, InstancesOfPrimitivesDeclaredInTheCompileAreNoModuleInstances) {
+  MessageCapture messages;
+  Project project;
+  const std::string cells = project.Write("cells.v",
+                                          "primitive early_udp (o, a); output o; input a;\n"
+                                          "  table 0 : 1; 1 : 0; endtable\nendprimitive\n");
+  const std::string plain = project.Write("plain.v", "module plain; endmodule\n");
+  const std::string top = project.Write("top.v",
+                                        "module top (input a, output o);\n"
+                                        "  early_udp u_early (o, a);\n"
+                                        "  own_udp u_own (o, a);\n"
+                                        "  late_udp u_late (o, a);\n"
+                                        "  plain u_plain ();\n"
+                                        "endmodule\n"
+                                        "primitive own_udp (o, a); output o; input a;\n"
+                                        "  table 0 : 1; 1 : 0; endtable\nendprimitive\n");
+  const std::string late = project.Write("late.v",
+                                         "primitive late_udp (o, a); output o; input a;\n"
+                                         "  table 0 : 1; 1 : 0; endtable\nendprimitive\n");
+  for (int round = 0; round < 2; ++round) {
+    EXPECT_EQ(InstanceNamesOf(project.Compile({top}).at(0)),
+              (Strings{"early_udp u_early", "late_udp u_late", "plain u_plain"}));
+    project.Compile({cells, plain});
+    EXPECT_EQ(InstanceNamesOf(project.Compile({cells, plain, top}).at(0)),
+              (Strings{"late_udp u_late", "plain u_plain"}));
+    EXPECT_EQ(InstanceNamesOf(project.Compile({late, top}).at(0)),
+              (Strings{"early_udp u_early", "plain u_plain"}));
+  }
+  EXPECT_EQ(project.cache()->ScannedFileCount(), 4u);
   EXPECT_TRUE(messages.records().empty()) << messages.All();
 }
 

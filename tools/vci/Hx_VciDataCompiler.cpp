@@ -85,15 +85,16 @@ std::unique_ptr<Hx_VpiAccess> DataCompiler::CompileFiles(int argc, const char* c
     lastCompiled = index + 1 == files.size();
     return compiled;
   };
-  const std::shared_ptr<const VerilogFileResult> result = cache_->CompileChain(
+  const VerilogFileCache::ChainResult chain = cache_->CompileChain(
       files, MacrosOf(commandLine.defines()), HashOf(commandLine.includeDirs()), compile);
+  const VerilogFileResult& result = *chain.result;
   if (!lastCompiled) {
-    VerilogMessageLog::Issue(result->messages);  // the file compiled is reported in full every time
+    VerilogMessageLog::Issue(result.messages);  // the file compiled is reported in full every time
   }
-  if (!result->readable) {
+  if (!result.readable) {
     return nullptr;
   }
-  return std::make_unique<Hx_VpiAccess>(VerilogDesignBuilder::Build(result->modules));
+  return std::make_unique<Hx_VpiAccess>(VerilogDesignBuilder::Build(result.modules, *chain.primitives));
 }
 
 }  // namespace Hx_Vci

@@ -10,15 +10,17 @@ constexpr int kDesign = 0;  // the type of the object that contains the top-leve
 
 }  // namespace
 
-Hx_VpiHandlePtr VerilogDesignBuilder::Build(const std::vector<VerilogModuleInfo>& modules) {
+Hx_VpiHandlePtr VerilogDesignBuilder::Build(const std::vector<VerilogModuleInfo>& modules,
+                                            const VerilogNameSet& primitives) {
   Hx_VpiHandlePtr design = Hx_VpiHandlePtr::Make(kDesign);
   for (const VerilogModuleInfo& module : modules) {
-    design->AddChild(BuildModule(module));
+    design->AddChild(BuildModule(module, primitives));
   }
   return design;
 }
 
-Hx_VpiHandlePtr VerilogDesignBuilder::BuildModule(const VerilogModuleInfo& module) {
+Hx_VpiHandlePtr VerilogDesignBuilder::BuildModule(const VerilogModuleInfo& module,
+                                                  const VerilogNameSet& primitives) {
   Hx_VpiHandlePtr object = Hx_VpiHandlePtr::Make(vpiModule);
   object->SetStr(vpiName, module.name);
   object->SetStr(vpiDefName, module.name);
@@ -27,7 +29,7 @@ Hx_VpiHandlePtr VerilogDesignBuilder::BuildModule(const VerilogModuleInfo& modul
     object->AddChild(BuildPort(port));
   }
   for (const VerilogInstanceInfo& instance : module.instances) {
-    object->AddChild(BuildInstance(instance));
+    if (!primitives.contains(instance.defName)) object->AddChild(BuildInstance(instance));
   }
   return object;
 }

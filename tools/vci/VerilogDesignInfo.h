@@ -2,6 +2,8 @@
 // Plain values, so that results can be cached and shared without any reference counting.
 #pragma once
 
+#include <functional>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -12,6 +14,9 @@ struct VerilogInstanceInfo {
   std::string name;     // the instance name; an instance array keeps its base name
   int line = 0;         // line of the instance name
 };
+
+// Names looked up by text, such as those of the user-defined primitives known to a compile.
+using VerilogNameSet = std::set<std::string, std::less<>>;
 
 struct VerilogModuleInfo {
   std::string name;

@@ -7,6 +7,22 @@
 
 namespace Hx_Vci {
 
+namespace {
+
+using PrimitiveNames = VerilogFileCache::PrimitiveNames;
+
+std::shared_ptr<const PrimitiveNames> WithPrimitivesOf(std::shared_ptr<const PrimitiveNames> before,
+                                                       const VerilogFileResult& result) {
+  if (result.primitives.empty()) {
+    return before;
+  }
+  auto names = std::make_shared<PrimitiveNames>(*before);
+  names->insert(result.primitives.begin(), result.primitives.end());
+  return names;
+}
+
+}  // namespace
+
 VerilogFileCache::VerilogFileCache(Limits limits) : limits_(limits) {
   if (limits_.watchFiles) {
     watch_ = std::make_unique<VerilogFileWatch>();
@@ -23,23 +39,25 @@ std::shared_ptr<VerilogFileCache> VerilogFileCache::Shared() {
   return shared;
 }
 
-std::shared_ptr<const VerilogFileResult> VerilogFileCache::CompileChain(
-    const std::vector<std::string_view>& files, std::shared_ptr<const VerilogMacroTable> macros,
-    std::uint64_t includeDirs, const CompileFile& compile) {
+VerilogFileCache::ChainResult VerilogFileCache::CompileChain(const std::vector<std::string_view>& files,
+                                                             std::shared_ptr<const VerilogMacroTable> macros,
+                                                             std::uint64_t includeDirs,
+                                                             const CompileFile& compile) {
   std::unique_lock<std::mutex> lock(mutex_);
   TakeWatchedChanges();
   const std::uint64_t generationAtStart = generation_;
   const Context start{macros->fingerprint(), includeDirs};
   Context context = start;
-  std::shared_ptr<const VerilogFileResult> last;
+  static const auto kNoPrimitives = std::make_shared<const PrimitiveNames>();
+  ChainResult last{nullptr, kNoPrimitives};
   const std::size_t matched = MatchRememberedChain(files, start);
   if (matched > 0) {
-    last = chain_.results[matched - 1];
-    macros = last->macrosAfter;
+    last = chain_.links[matched - 1];
+    macros = last.result->macrosAfter;
     context.macros = macros->fingerprint();
   }
   const std::uint64_t chainVersion = chain_.version;
-  Results linked;
+  Links linked;
   bool remember = watch_ != nullptr;
   for (std::size_t i = matched; i < files.size(); ++i) {
     Found found = Find(files[i], context, i + 1 == files.size());
@@ -50,8 +68,9 @@ std::shared_ptr<const VerilogFileResult> VerilogFileCache::CompileChain(
       lock.lock();
       found = Store(files[i], compiled.stamp, context, std::move(compiled.result));
     }
-    last = std::move(found.result);
-    macros = last->macrosAfter;
+    last.primitives = WithPrimitivesOf(std::move(last.primitives), *found.result);
+    last.result = std::move(found.result);
+    macros = last.result->macrosAfter;
     context.macros = macros->fingerprint();
     remember = remember && found.trusted;
     if (remember) {
@@ -120,18 +139,18 @@ std::size_t VerilogFileCache::MatchRememberedChain(const std::vector<std::string
 // A project's files are not always compiled in project order, so a compile of fewer files keeps
 // the links of a longer chain that goes on the same way.
 void VerilogFileCache::RememberChain(const Context& start, const std::vector<std::string_view>& files,
-                                     std::size_t matched, Results results) {
+                                     std::size_t matched, Links links) {
   const bool extends = chain_.valid && chain_.generation == generation_ && chain_.start == start;
   std::size_t length = extends ? matched : 0;
   std::size_t next = 0;
-  while (extends && next < results.size() && length < chain_.Length() &&
-         chain_.results[length] == results[next] && chain_.Path(length) == files[matched + next]) {
+  while (extends && next < links.size() && length < chain_.Length() &&
+         chain_.links[length].result == links[next].result && chain_.Path(length) == files[matched + next]) {
     ++length;
     ++next;
   }
-  if (next < results.size()) {
+  if (next < links.size()) {
     chain_.Truncate(length);
-    for (; next < results.size(); ++next) chain_.Append(files[matched + next], std::move(results[next]));
+    for (; next < links.size(); ++next) chain_.Append(files[matched + next], std::move(links[next]));
   }
   chain_.start = start;
   chain_.generation = generation_;
@@ -150,13 +169,13 @@ void VerilogFileCache::Chain::Truncate(std::size_t length) {
   }
   paths.resize(length == 0 ? 0 : pathEnds[length - 1]);
   pathEnds.resize(length);
-  results.resize(length);
+  links.resize(length);
 }
 
-void VerilogFileCache::Chain::Append(std::string_view path, std::shared_ptr<const VerilogFileResult> result) {
+void VerilogFileCache::Chain::Append(std::string_view path, ChainResult link) {
   paths.append(path);
   pathEnds.push_back(paths.size());
-  results.push_back(std::move(result));
+  links.push_back(std::move(link));
 }
 
 VerilogFileCache::Found VerilogFileCache::Find(std::string_view path, const Context& context,

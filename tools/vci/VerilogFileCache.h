@@ -22,6 +22,7 @@
 #include <unordered_map>
 #include <vector>
 
+#include "vci/VerilogDesignInfo.h"
 #include "vci/VerilogFileCompiler.h"
 #include "vci/VerilogFileResult.h"
 #include "vci/VerilogFileStamp.h"
@@ -39,6 +40,13 @@ class VerilogFileCache {
     bool watchFiles = true;  // false: read the stamp of every file at every use
   };
 
+  // The user-defined primitives declared by the files of a chain up to one of them.
+  using PrimitiveNames = VerilogNameSet;
+  struct ChainResult {
+    std::shared_ptr<const VerilogFileResult> result;
+    std::shared_ptr<const PrimitiveNames> primitives;  // never null
+  };
+
   // Compiles files[index] (at `path`) starting with `macros`; called without the cache's lock.
   using CompileFile = std::function<VerilogFileCompiler::Compiled(
       std::size_t index, const std::string& path, const std::shared_ptr<const VerilogMacroTable>& macros)>;
@@ -52,13 +60,12 @@ class VerilogFileCache {
   // The cache of the process, shared by the compilers that do not get one of their own.
   static std::shared_ptr<VerilogFileCache> Shared();
 
-  // The result of the last of `files` (not empty), each file starting with the macro state that
-  // the one before left, the first with `macros` (not null); `includeDirs` identifies the include
-  // directory list. Files without a current result are compiled by `compile` and kept.
-  std::shared_ptr<const VerilogFileResult> CompileChain(const std::vector<std::string_view>& files,
-                                                        std::shared_ptr<const VerilogMacroTable> macros,
-                                                        std::uint64_t includeDirs,
-                                                        const CompileFile& compile);
+  // The result of the last of `files` (not empty) and the primitives of all, each file starting with the
+  // macro state that the one before left, the first with `macros` (not null); `includeDirs` identifies the
+  // include directory list. Files without a current result are compiled by `compile` and kept.
+  ChainResult CompileChain(const std::vector<std::string_view>& files,
+                           std::shared_ptr<const VerilogMacroTable> macros, std::uint64_t includeDirs,
+                           const CompileFile& compile);
 
   // Forgets every result, so that the next compiles read every file again.
   void Clear();
@@ -91,7 +98,7 @@ class VerilogFileCache {
     std::size_t operator()(std::string_view path) const { return std::hash<std::string_view>()(path); }
   };
   using Nodes = std::unordered_map<std::string, Node, PathHash, std::equal_to<>>;
-  using Results = std::vector<std::shared_ptr<const VerilogFileResult>>;
+  using Links = std::vector<ChainResult>;
   // Every compile of a project compares its files with the chain, so the paths are kept one
   // after the other in one text, read in one sweep.
   struct Chain {
@@ -101,12 +108,12 @@ class VerilogFileCache {
     Context start;
     std::string paths;
     std::vector<std::size_t> pathEnds;
-    Results results;
+    Links links;
 
-    std::size_t Length() const { return results.size(); }
+    std::size_t Length() const { return links.size(); }
     std::string_view Path(std::size_t index) const;
     void Truncate(std::size_t length);
-    void Append(std::string_view path, std::shared_ptr<const VerilogFileResult> result);
+    void Append(std::string_view path, ChainResult link);
   };
   // What a lookup or a store found out about one file of a chain.
   struct Found {
@@ -116,9 +123,9 @@ class VerilogFileCache {
 
   void TakeWatchedChanges();
   std::size_t MatchRememberedChain(const std::vector<std::string_view>& files, const Context& start) const;
-  // The files from `matched` on have `results`, as many of them.
+  // The files from `matched` on have `links`, as many of them.
   void RememberChain(const Context& start, const std::vector<std::string_view>& files, std::size_t matched,
-                     Results results);
+                     Links links);
   Found Find(std::string_view path, const Context& context, bool checkDisk);
   Found Store(std::string_view path, const VerilogFileStamp& stamp, const Context& context,
               std::shared_ptr<const VerilogFileResult> result);

@@ -39,6 +39,7 @@ VerilogFileCompiler::Compiled VerilogFileCompiler::Compile(
   VerilogModuleParser parser(preprocessed, log);
   result->readable = true;
   result->modules = parser.Parse();
+  result->primitives = parser.TakePrimitives();
   result->macrosAfter = macroState.Snapshot();
   result->dependencies = preprocessor.TakeDependencies();
   result->messages = log.Take();

@@ -11,6 +11,7 @@ std::size_t VerilogFileResult::ApproximateBytes() const {
       bytes += sizeof(instance) + instance.defName.size() + instance.name.size();
     }
   }
+  for (const std::string& primitive : primitives) bytes += sizeof(primitive) + primitive.size();
   for (const VerilogMessage& message : messages)
     bytes += sizeof(message) + message.file.size() + message.text.size();
   for (const VerilogDependency& dependency : dependencies)

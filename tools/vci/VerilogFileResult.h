@@ -17,6 +17,8 @@ struct VerilogFileResult {
   bool readable = false;  // false: the file could not be read and nothing else is set but messages
   std::shared_ptr<const VerilogMacroTable> macrosAfter;  // the macro state the next file starts with
   std::vector<VerilogModuleInfo> modules;
+  // The user-defined primitives declared in the file: their instances are no module instances.
+  std::vector<std::string> primitives;
   std::vector<VerilogMessage> messages;
   std::vector<VerilogDependency> dependencies;
 

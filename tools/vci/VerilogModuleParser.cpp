@@ -459,6 +459,9 @@ void VerilogModuleParser::SkipRegion() {
   const VerilogToken open = token_;
   const K closing = VerilogKeywords::ClosingOf(open.keyword);
   Advance();
+  if (open.Is(K::kPrimitive) && token_.IsName()) {
+    primitives_.emplace_back(token_.text);
+  }
   while (!token_.Is(closing)) {
     if (AtBoundary()) {
       Error(open, Text::kMissingBlockEnd, std::string(open.text).c_str(),

@@ -5,6 +5,7 @@
 #pragma once
 
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "vci/VerilogDesignInfo.h"
@@ -25,6 +26,8 @@ class VerilogModuleParser {
 
   // The named modules in source order, also those that lack their endmodule.
   std::vector<VerilogModuleInfo> Parse();
+  // The names of the user-defined primitives that Parse met.
+  std::vector<std::string> TakePrimitives() { return std::move(primitives_); }
 
  private:
   void Advance() { token_ = lexer_.Next(); }
@@ -62,6 +65,7 @@ class VerilogModuleParser {
   VerilogMessageLog& log_;
   VerilogToken token_;
   std::vector<VerilogModuleInfo> modules_;
+  std::vector<std::string> primitives_;
   bool nestingReported_ = false;
 };
 
