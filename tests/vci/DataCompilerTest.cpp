@@ -254,6 +254,22 @@ TEST(VerilogDataCompiler, MacrosOfEarlierFilesReachLaterOnesAndOnlyTheLastFileIs
       << "alone, the later file does not know the macro: " << messages.All();
 }
 
+TEST(VerilogDataCompiler, UndefineAllForgetsEveryMacroUpToThatPointOnly) {
+  MessageCapture messages;
+  Project project;
+  const std::string defs = project.Write("defs.v",
+                                         "`define EARLY 1\n"
+                                         "`undefineall\n"
+                                         "`define LATE 1\n");
+  const std::string probe = project.Write("probe.v",
+                                          "`ifdef FROM_LINE module saw_line; endmodule `endif\n"
+                                          "`ifdef EARLY module saw_early; endmodule `endif\n"
+                                          "`ifdef LATE module saw_late; endmodule `endif\n");
+  EXPECT_EQ(NamesOf(project.Compile({defs, probe, "+define+FROM_LINE"})), Strings{"saw_late"});
+  EXPECT_EQ(NamesOf(project.Compile({probe, "+define+FROM_LINE"})), Strings{"saw_line"});
+  EXPECT_TRUE(messages.records().empty()) << messages.All();
+}
+
 TEST(VerilogDataCompiler, DefineAndIncdirArgumentsAndIgnoredOptions) {
   MessageCapture messages;
   Project project;

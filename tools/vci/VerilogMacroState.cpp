@@ -21,6 +21,11 @@ void VerilogMacroState::Undefine(std::string_view name) {
   }
 }
 
+void VerilogMacroState::UndefineAll() {
+  writable_ = std::make_shared<VerilogMacroTable>();
+  current_ = writable_;
+}
+
 std::shared_ptr<const VerilogMacroTable> VerilogMacroState::Snapshot() {
   writable_.reset();
   return current_;

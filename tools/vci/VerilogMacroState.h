@@ -18,6 +18,8 @@ class VerilogMacroState {
   const VerilogMacro* Find(std::string_view name) const { return current_->Find(name); }
   void Define(std::string_view name, VerilogMacro macro);
   void Undefine(std::string_view name);
+  // Forgets every definition, those of the command line too.
+  void UndefineAll();
 
   // The table as it stands now; later changes to this state do not reach it.
   std::shared_ptr<const VerilogMacroTable> Snapshot();

@@ -108,7 +108,7 @@ VerilogPreprocessor::Directive VerilogPreprocessor::Classify(std::string_view na
       {"endcelldefine", Directive::kIgnored},
       {"nounconnected_drive", Directive::kIgnored},
       {"end_keywords", Directive::kIgnored},
-      {"undefineall", Directive::kIgnored},
+      {"undefineall", Directive::kUndefineAll},
       {"delay_mode_distributed", Directive::kIgnored},
       {"delay_mode_path", Directive::kIgnored},
       {"delay_mode_unit", Directive::kIgnored},
@@ -195,6 +195,9 @@ void VerilogPreprocessor::HandleBacktick(Source& s) {
       return;
     case Directive::kUndef:
       HandleUndef(s, at);
+      return;
+    case Directive::kUndefineAll:
+      macros_.UndefineAll();
       return;
     case Directive::kInclude:
       HandleInclude(s, at);

@@ -49,6 +49,7 @@ class VerilogPreprocessor {
     kMacro,  // not a directive: a macro use
     kDefine,
     kUndef,
+    kUndefineAll,
     kIfdef,
     kIfndef,
     kElsif,
