@@ -7,8 +7,6 @@
 #include "pep/PepExtractor.h"
 #include "pep/Pep_Exception.h"
 #include "vci/Hx_Vci.h"
-#include "xdm/Xdm_Exception.h"
-#include "xdm/Xdm_Model.h"
 
 namespace {
 
@@ -23,49 +21,6 @@ std::string MessageThrownBy(Call call) {
 }
 
 }  // namespace
-
-TEST(NetlistDatabase, NoFileOpensAndOpeningThrowsTheLibraryException) {
-  EXPECT_FALSE(Xdm_Model::CanOpen("design.tbx"));
-  EXPECT_FALSE(Xdm_Model::CanOpen(nullptr));
-
-  Xdm_Model model("SnxParser", "SnxParser", "1.1", false);
-  EXPECT_EQ(
-      MessageThrownBy<Xdm_Exception::Base>([&] { model.Open("design.tbx", Xdm_Model::kOpenForReading); }),
-      Xdm_Model::kUnavailableMessage);
-  EXPECT_EQ(MessageThrownBy<Xdm_Exception::Base>([&] { model.CreateTxn("txn", Xdm_Model::kTxnRead); }),
-            Xdm_Model::kNotOpenMessage);
-  ASSERT_NE(model.GetDesignMgr(), nullptr);
-  EXPECT_EQ(model.GetDesignMgr()->GetDesignItr().Next(), nullptr);
-}
-
-TEST(NetlistDatabase, BlocksKnowTheirParentsAndPropertiesMatchExactNames) {
-  Xdm_Model model("N", "A", "V", false);
-  Xdm_Design* design = model.GetDesignMgr()->AddDesign("chip");
-  design->SetProperty("PART", "k100");
-  design->SetProperty("PART", "k200");
-  Xdm_Block* top = design->AddView("SOURCE")->SetBlock("top");
-  Xdm_Block* first = top->AddBlock("u1");
-  Xdm_Block* second = top->AddBlock("u2");
-  first->AddBlock("gate");
-
-  ASSERT_NE(design->GetPropertyByName("PART"), nullptr);
-  EXPECT_EQ(design->GetPropertyByName("PART")->GetValue(), "k200");
-  EXPECT_EQ(design->GetPropertyByName("part"), nullptr);
-  EXPECT_EQ(design->GetPropertyByName(nullptr), nullptr);
-  EXPECT_EQ(design->GetViewByName("SOURCE")->GetBlock(), top);
-  EXPECT_EQ(design->GetViewByName("RTL"), nullptr);
-
-  EXPECT_EQ(top->GetParent(), nullptr);
-  EXPECT_EQ(top->GetNumBlocks(), 2);
-  Xdm_BlockItr children = top->GetBlockItr();
-  EXPECT_EQ(children.Next(), first);
-  EXPECT_EQ(children.Next(), second);
-  EXPECT_EQ(children.Next(), nullptr);
-  EXPECT_EQ(children.Next(), nullptr);
-  EXPECT_EQ(first->GetParent(), top);
-  EXPECT_EQ(first->GetNumBlocks(), 1);
-  EXPECT_EQ(second->GetNumBlocks(), 0);
-}
 
 TEST(PortExtractor, ParseThrowsAndTheUnitIsNeverFound) {
   PepExtractor extractor;

@@ -22,6 +22,8 @@ class Xdm_DesignMgr {
 
   // Creates a design owned by the manager, after the existing ones.
   Xdm_Design* AddDesign(std::string name);
+  // Destroys every design, with all that it holds.
+  void Clear();
 
  private:
   std::vector<std::unique_ptr<Xdm_Design>> designs_;
