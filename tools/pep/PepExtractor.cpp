@@ -1,5 +1,12 @@
 #include "pep/PepExtractor.h"
 
+#include "pep/PepSourceFile.h"
+#include "pep/PepTokenStream.h"
+#include "pep/PepUnitEvaluator.h"
+#include "pep/PepVerilogLexer.h"
+#include "pep/PepVerilogReader.h"
+#include "pep/PepVhdlLexer.h"
+#include "pep/PepVhdlReader.h"
 #include "pep/Pep_Exception.h"
 
 namespace {
@@ -18,12 +25,53 @@ void PepExtractor::addDesignFile(const char* library, const char* path, int lang
   if (library == nullptr || path == nullptr || !IsKnownLanguage(language)) {
     throw Pep_Exception::Base(kBadFileMessage);
   }
-  files_.push_back({library, path, language});
+  files_.push_back({PepUnitCatalog::Folded(library), path, language});
 }
 
-void PepExtractor::Parse(int) { throw Pep_Exception::Base(kUnavailableMessage); }
+void PepExtractor::Parse(int) {
+  if (files_.empty()) throw Pep_Exception::Base(kNoFilesMessage);
+  catalog_.Clear();
+  SelectUnit(nullptr);
+  for (const DesignFile& file : files_) ReadFile(file);
+}
 
-// Nothing is ever parsed yet, so no unit can be found and no generics are known.
-int PepExtractor::findDesignUnit(const char*, const char*, int) { return kUnitNotFound; }
+void PepExtractor::ReadFile(const DesignFile& file) {
+  std::string text;
+  switch (PepSourceFile::Load(file.path, text)) {
+    case PepSourceFile::Status::kUnreadable:
+      throw Pep_Exception::Base(kUnreadableFileMessage + file.path);
+    case PepSourceFile::Status::kTooLarge:
+      throw Pep_Exception::Base(kTooLargeFileMessage + file.path);
+    case PepSourceFile::Status::kRead:
+      break;
+  }
+  if (file.language == kVhdl) {
+    PepVhdlLexer lexer(text);
+    PepTokenStream tokens(lexer);
+    PepVhdlReader(tokens, file.library, catalog_).Read();
+  } else {
+    PepVerilogLexer lexer(text);
+    PepTokenStream tokens(lexer);
+    PepVerilogReader(tokens, file.library, catalog_).Read();
+  }
+}
 
-bool PepExtractor::hasAllGenericsDefined() const { return false; }
+int PepExtractor::findDesignUnit(const char* library, const char* name, int searchMode) {
+  const PepDesignUnit* unit = nullptr;
+  if (library != nullptr && searchMode == kSearchTop) {
+    unit = catalog_.FindTop(library);
+  } else if (library != nullptr && name != nullptr && searchMode == kSearchExactName) {
+    unit = catalog_.FindByName(library, name);
+  }
+  SelectUnit(unit);
+  return unit == nullptr ? kUnitNotFound : kUnitFound;
+}
+
+void PepExtractor::SelectUnit(const PepDesignUnit* unit) {
+  ports_.clear();
+  allGenericsDefined_ = false;
+  if (unit == nullptr) return;
+  PepUnitEvaluator evaluator(*unit);
+  ports_ = evaluator.Ports();
+  allGenericsDefined_ = evaluator.AllGenericsDefined();
+}

@@ -1,46 +1,11 @@
 #include <gtest/gtest.h>
 
+#include <memory>
 #include <string>
 #include <vector>
 
 #include "Port/SafeCount.h"
-#include "pep/PepExtractor.h"
-#include "pep/Pep_Exception.h"
 #include "vci/Hx_Vci.h"
-
-namespace {
-
-template <class Exception, class Call>
-std::string MessageThrownBy(Call call) {
-  try {
-    call();
-  } catch (const Exception& e) {
-    return e.what();
-  }
-  return "(nothing thrown)";
-}
-
-}  // namespace
-
-TEST(PortExtractor, ParseThrowsAndTheUnitIsNeverFound) {
-  PepExtractor extractor;
-  extractor.addDesignFile("work", "/src/top.vhd", PepExtractor::kVhdl);
-  extractor.addDesignFile("work", "/src/sub.v", PepExtractor::kVerilog);
-
-  EXPECT_EQ(MessageThrownBy<Pep_Exception::Base>([&] { extractor.Parse(PepExtractor::kVerilog); }),
-            PepExtractor::kUnavailableMessage);
-  EXPECT_NE(extractor.findDesignUnit("work", "topmodule", PepExtractor::kSearchByName),
-            PepExtractor::kUnitFound);
-  EXPECT_FALSE(extractor.hasAllGenericsDefined());
-  EXPECT_TRUE(extractor.getPorts().empty());
-}
-
-TEST(PortExtractor, RejectsDesignFilesItCannotRead) {
-  PepExtractor extractor;
-  EXPECT_THROW(extractor.addDesignFile("work", "/src/top.vhd", 2), Pep_Exception::Base);
-  EXPECT_THROW(extractor.addDesignFile("work", nullptr, PepExtractor::kVhdl), Pep_Exception::Base);
-  EXPECT_THROW(extractor.addDesignFile(nullptr, "/src/top.vhd", PepExtractor::kVhdl), Pep_Exception::Base);
-}
 
 TEST(VerilogDataCompiler, CompileAnswersNoAccessObject) {
   std::unique_ptr<Hx_Vci::DataCompiler> compiler = Hx_Vci::create_data_compiler();
