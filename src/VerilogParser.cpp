@@ -3,9 +3,12 @@
 #include <cstdint>
 #include <new>
 
+#include "CHdlFile.h"
 #include "CParserConfigHolder.h"
 #include "MsgCapture.h"
+#include "PortExtraction.h"
 #include "VerilogArguments.h"
+#include "pep/PepExtractor.h"
 #include "vci/Hx_Vci.h"
 
 namespace Vad {
@@ -71,6 +74,18 @@ void VerilogParser::RecordModules(const Hx_VpiAccess& access, CParserConfigHolde
                      Port::StringBase());
     RecordInstances(access, module, holder);
   }
+}
+
+CitI::Result VerilogParser::ExtractPorts(CParserConfigHolder& holder, IHdlDesignUnit* unit,
+                                         IHdlPortIterator** ports) {
+  auto listOwnFile = [&](std::vector<PortExtraction::DesignFile>& files) {
+    PortExtraction::DesignFile file{{}, PepExtractor::kVerilog};
+    auto* hdlFile = holder.GetFile() ? Prjrep::QueryAs<IHdlFile>(holder.GetFile()) : nullptr;
+    if (!PortExtraction::ExtractorPathOf(hdlFile, file.path)) return false;
+    files.push_back(std::move(file));
+    return true;
+  };
+  return PortExtraction::Extract(unit, listOwnFile, ports);
 }
 
 }  // namespace Vad

@@ -33,7 +33,11 @@ class VerilogParser : public Parser {
   // that does not compile records nothing. Always 0.
   int Parse(CParserConfigHolder& holder) override;
 
-  // ExtractPorts keeps the base behaviour until port extraction of Verilog modules is built.
+  // The ports of a module: the port extractor reads only the holder's file and is asked for the
+  // module by name, so a module that others instantiate gets its own ports. Results as for
+  // VhdlParser::ExtractPorts.
+  CitI::Result ExtractPorts(CParserConfigHolder& holder, IHdlDesignUnit* unit,
+                            IHdlPortIterator** ports) override;
 
   // The compiler's messages during the last Parse, which the user does not see.
   const Port::StringBase& CapturedMessages() const { return capturedMessages_; }

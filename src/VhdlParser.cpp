@@ -2,9 +2,16 @@
 
 #include <cstdio>
 
+#include "CHdlFile.h"
 #include "CParserConfigHolder.h"
+#include "HdlSets.h"
+#include "IHdlElaborationData.h"
+#include "IHdlProject.h"
 #include "Port/StringBase.h"
+#include "PortExtraction.h"
+#include "Prjrep/AutoPtr.h"
 #include "jpParser.h"
+#include "pep/PepExtractor.h"
 
 namespace Vad {
 namespace {
@@ -24,6 +31,37 @@ bool IsSynthesisTarget(const CParserConfigHolder& holder) {
   return target == VhdlParser::kSynthesisTarget;
 }
 
+// The extractor's language for a file of the compile order; false for files it does not read.
+bool ExtractorLanguageOf(IHdlFile* file, int& language) {
+  Port::StringBase plugin;
+  if (!file || file->getPluginName(&plugin) != CitI::kOk) return false;
+  if (plugin == "PLUGIN_Vhdl") {
+    language = PepExtractor::kVhdl;
+  } else if (plugin == "PLUGIN_Verilog") {
+    language = PepExtractor::kVerilog;
+  } else {
+    return false;
+  }
+  return true;
+}
+
+bool ListCompileOrder(CParserConfigHolder& holder, IHdlDesignUnit* unit,
+                      std::vector<PortExtraction::DesignFile>& files) {
+  Prjrep::AutoRelease<IHdlProject> project;
+  if (!holder.GetFile() || holder.GetFile()->getProject(project.Out()) != CitI::kOk) return false;
+  auto* elaboration = Prjrep::QueryAs<IHdlElaborationData>(project.Get());
+  Prjrep::AutoRelease<IHdlFileIterator> order;
+  if (!elaboration || elaboration->getCompileOrderByDU(unit, true, order.Out()) != CitI::kOk || !order)
+    return false;
+  for (order->First(); !order->IsDone(); order->Next()) {
+    PortExtraction::DesignFile file;
+    if (ExtractorLanguageOf(order->Current(), file.language) &&
+        PortExtraction::ExtractorPathOf(order->Current(), file.path))
+      files.push_back(std::move(file));
+  }
+  return true;
+}
+
 }  // namespace
 
 int VhdlParser::Parse(CParserConfigHolder& holder) {
@@ -38,6 +76,14 @@ int VhdlParser::Parse(CParserConfigHolder& holder) {
   // after any other stop.
   driver.Run(holder, IsSynthesisTarget(holder));
   return 0;
+}
+
+CitI::Result VhdlParser::ExtractPorts(CParserConfigHolder& holder, IHdlDesignUnit* unit,
+                                      IHdlPortIterator** ports) {
+  return PortExtraction::Extract(
+      unit,
+      [&](std::vector<PortExtraction::DesignFile>& files) { return ListCompileOrder(holder, unit, files); },
+      ports);
 }
 
 }  // namespace Vad

@@ -37,7 +37,13 @@ class VhdlParser : public Parser {
   // gives the message above and no units. Always 0.
   int Parse(CParserConfigHolder& holder) override;
 
-  // ExtractPorts keeps the base behaviour until port extraction of VHDL units is built.
+  // The ports of an entity, or of an architecture's entity: the port extractor reads the VHDL and
+  // Verilog files of the unit's compile order (getCompileOrderByDU, mode flag set) in order and is
+  // asked for the entity by name. 1 with the port iterator in `ports`; 10 when the extractor does
+  // not find the entity, 11 when a generic has no value, 0 when the files are not available or
+  // the extractor fails (each with an error message); kInvalidArg for a null unit or `ports`.
+  CitI::Result ExtractPorts(CParserConfigHolder& holder, IHdlDesignUnit* unit,
+                            IHdlPortIterator** ports) override;
 };
 
 }  // namespace Vad
