@@ -4,6 +4,7 @@
 #include <cstdio>
 #include <fstream>
 #include <iostream>
+#include <optional>
 
 #include "DotOutput.h"
 #include "ExitStatus.h"
@@ -204,15 +205,30 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
   return status;
 }
 
-// The module offers ports through getDesignUnitPorts once its port extraction is in place; until
-// then the command names the unit and says so.
+// The module explains a failed extraction in its own messages; a unit whose kind of source has
+// no port extraction gets no answer and no message, so quillon says so itself.
 int CommandRunner::Ports(ProjectReader& reader, std::ostream& out) {
   Vad::IHdlDesignUnit* unit = UnitFinder(reader.designUnits()).Find(options_.unit);
   if (!unit) return BadInput("unknown design unit '" + options_.unit + "'");
   std::string key = KeyOf(unit);
-  log_->ReportError("port extraction is not available yet (unit " + key + ")");
-  if (options_.format == Format::kJson) JsonOutput::Ports(key, log_->messages(), out);
-  return kExitFailed;
+  std::optional<std::vector<PortInfo>> ports;
+  int errorsBefore = log_->getErrCount();
+  CitI::Result result = reader.PortsOf(unit, ports);
+  int status = Finished();
+  if (result != CitI::kOk) {
+    status = Failed("the ports of " + key + " are not available", result);
+  } else if (!ports) {
+    if (log_->getErrCount() == errorsBefore)
+      log_->ReportError("the ports of " + key +
+                        " are not available: ports are extracted from VHDL and Verilog only");
+    status = kExitFailed;
+  }
+  if (options_.format == Format::kJson) {
+    JsonOutput::Ports(key, ports ? &*ports : nullptr, log_->messages(), out);
+  } else if (ports) {
+    TextOutput::Ports(*ports, out);
+  }
+  return status;
 }
 
 int CommandRunner::Check(ProjectReader& reader, std::size_t fileCount, std::ostream& out) {

@@ -65,6 +65,17 @@ struct OrderEntry {
   std::string plugin;
 };
 
+// One port of a design unit; the bounds are unset when the port has no range.
+struct PortInfo {
+  std::string name;
+  std::uint32_t position = 0;
+  std::string type;
+  std::string direction;  // "in", "out" or "inout"
+  std::optional<std::int32_t> low;
+  std::optional<std::int32_t> high;
+  std::optional<std::int32_t> span;
+};
+
 // The file dependency graph of a compile order: an edge from a file to a file it uses.
 struct FileEdge {
   std::size_t from = 0;

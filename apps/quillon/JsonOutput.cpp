@@ -66,6 +66,12 @@ Json NodeObject(const TreeNodeInfo& node) {
           {"file", OrNull(node.file)},   {"children", std::move(children)}};
 }
 
+Json PortObject(const PortInfo& port) {
+  return {{"name", port.name},           {"position", port.position}, {"type", port.type},
+          {"direction", port.direction}, {"low", OrNull(port.low)},   {"high", OrNull(port.high)},
+          {"span", OrNull(port.span)}};
+}
+
 // Names and paths come from the sources byte for byte; bytes that are no UTF-8 are replaced rather
 // than refused.
 void Write(const Json& document, std::ostream& out) {
@@ -102,8 +108,14 @@ void JsonOutput::Check(std::size_t files, std::size_t units, const std::vector<M
   Write({{"files", files}, {"units", units}, {"messages", MessageList(messages)}}, out);
 }
 
-void JsonOutput::Ports(const std::string& unit, const std::vector<MessageInfo>& messages, std::ostream& out) {
-  Write({{"unit", unit}, {"ports", nullptr}, {"messages", MessageList(messages)}}, out);
+void JsonOutput::Ports(const std::string& unit, const std::vector<PortInfo>* ports,
+                       const std::vector<MessageInfo>& messages, std::ostream& out) {
+  Json list = nullptr;
+  if (ports) {
+    list = Json::array();
+    for (const PortInfo& port : *ports) list.push_back(PortObject(port));
+  }
+  Write({{"unit", unit}, {"ports", std::move(list)}, {"messages", MessageList(messages)}}, out);
 }
 
 void JsonOutput::Messages(const std::vector<MessageInfo>& messages, std::ostream& out) {

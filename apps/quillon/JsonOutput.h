@@ -19,8 +19,10 @@ class JsonOutput {
                     std::ostream& out);
   static void Check(std::size_t files, std::size_t units, const std::vector<MessageInfo>& messages,
                     std::ostream& out);
-  // The ports of `unit` come with the module's port extraction; until then "ports" is null.
-  static void Ports(const std::string& unit, const std::vector<MessageInfo>& messages, std::ostream& out);
+  // "low", "high" and "span" are null for a port without a range; "ports" is null when the
+  // module handed out none.
+  static void Ports(const std::string& unit, const std::vector<PortInfo>* ports,
+                    const std::vector<MessageInfo>& messages, std::ostream& out);
   // Only the messages, for a command that produced nothing else.
   static void Messages(const std::vector<MessageInfo>& messages, std::ostream& out);
 };

@@ -3,6 +3,7 @@
 #include "FileFacts.h"
 #include "IHdlDesignUnit.h"
 #include "IHdlElaborationData.h"
+#include "IHdlPort.h"
 #include "PluginTable.h"
 #include "UnitRecordReader.h"
 
@@ -46,6 +47,31 @@ std::vector<UnitInfo> UnitsOf(Vad::IHdlFile* file) {
 
 Vad::IHdlElaborationData* ElaborationOf(Vad::IHdlProject* project) {
   return Prjrep::QueryAs<Vad::IHdlElaborationData>(project);
+}
+
+const char* DirectionName(std::int32_t direction) {
+  switch (direction) {
+    case Vad::IHdlPort::kDirectionIn:
+      return "in";
+    case Vad::IHdlPort::kDirectionOut:
+      return "out";
+    default:
+      return "inout";
+  }
+}
+
+PortInfo PortInfoOf(Vad::IHdlPort* port) {
+  Port::StringBase name;
+  Port::StringBase type;
+  port->getName(&name);
+  port->getTypeName(&type);
+  PortInfo info{name.str(), port->getPosition(), type.str(), DirectionName(port->getDirection()), {}, {}, {}};
+  if (port->hasRange()) {
+    info.low = port->getRangeLow();
+    info.high = port->getRangeHigh();
+    info.span = port->getRangeSpan();
+  }
+  return info;
 }
 
 }  // namespace
@@ -110,6 +136,21 @@ CitI::Result ProjectReader::OrderOf(Vad::IHdlDesignUnit* unit, bool byUnit,
   progress_.Clear();
   if (result == CitI::kOk) order = Describe(files.Get());
   return result == CitI::kOk && !files ? CitI::kFail : result;
+}
+
+CitI::Result ProjectReader::PortsOf(Vad::IHdlDesignUnit* unit,
+                                    std::optional<std::vector<PortInfo>>& ports) const {
+  ports.reset();
+  auto* elaboration = ElaborationOf(project_);
+  if (!elaboration) return CitI::kFail;
+  Prjrep::AutoRelease<Vad::IHdlPortIterator> iterator;
+  progress_.Phase("extracting the ports");
+  CitI::Result result = elaboration->getDesignUnitPorts(unit, iterator.Out());
+  progress_.Clear();
+  if (result != CitI::kOk || !iterator) return result;
+  ports.emplace();
+  ForEachIn(iterator.Get(), [&](Vad::IHdlPort* port) { ports->push_back(PortInfoOf(port)); });
+  return result;
 }
 
 }  // namespace quillon

@@ -2,6 +2,7 @@
 // compile orders. Every operation hands back the module's result; the caller reports failures.
 #pragma once
 
+#include <optional>
 #include <vector>
 
 #include "DesignModel.h"
@@ -31,6 +32,10 @@ class ProjectReader {
   // and what it needs).
   CitI::Result Order(std::vector<OrderEntry>& order) const;
   CitI::Result OrderOf(Vad::IHdlDesignUnit* unit, bool byUnit, std::vector<OrderEntry>& order) const;
+
+  // The ports of `unit` in port order. The module's result; `ports` stays unset when no port
+  // iterator came back (the module's messages say why).
+  CitI::Result PortsOf(Vad::IHdlDesignUnit* unit, std::optional<std::vector<PortInfo>>& ports) const;
 
   std::size_t FileCount() const;
 

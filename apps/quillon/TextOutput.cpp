@@ -64,4 +64,12 @@ void TextOutput::CheckSummary(std::size_t files, std::size_t units, int errors, 
       << Plural(static_cast<std::size_t>(warnings), "warning", "warnings") << '\n';
 }
 
+void TextOutput::Ports(const std::vector<PortInfo>& ports, std::ostream& out) {
+  for (const PortInfo& port : ports) {
+    out << port.position << ' ' << port.name << ' ' << port.direction << ' ' << port.type;
+    if (port.high && port.low) out << ' ' << *port.high << ".." << *port.low;
+    out << '\n';
+  }
+}
+
 }  // namespace quillon

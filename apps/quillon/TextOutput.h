@@ -18,6 +18,8 @@ class TextOutput {
   static void Tree(const TreeNodeInfo& root, std::ostream& out);
   // One path a line; with the library and a blank before it when asked.
   static void Order(const std::vector<OrderEntry>& order, bool withLibrary, std::ostream& out);
+  // One line a port: POSITION NAME DIRECTION TYPE, then HIGH..LOW when the port has a range.
+  static void Ports(const std::vector<PortInfo>& ports, std::ostream& out);
   // "N files, M design units: E errors, W warnings"
   static void CheckSummary(std::size_t files, std::size_t units, int errors, int warnings, std::ostream& out);
 
