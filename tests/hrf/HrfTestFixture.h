@@ -1,0 +1,106 @@
+// Reads hierarchy descriptions as a file of a project, through the project's own reader or
+// through the converter-output grammar, and describes what was recorded: one line per unit, in
+// the order of the file's unit set.
+#pragma once
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <cstdio>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "../pipeline/PipelineFixtures.h"
+#include "CHdlElement.h"
+#include "CParserConfigHolder.h"
+#include "ScopedTempDir.h"
+#include "qhParser.h"
+
+namespace hrf_test {
+
+class HierarchyRead : public pipeline_test::PipelineTest {
+ protected:
+  void SetUp() override { project_ = NewProject(); }
+
+  // Reads `text` as a hierarchy file of the project (plug-in "PLUGIN_Hrf").
+  std::vector<std::string> ReadProjectFile(std::string_view text) { return ReadProjectPath(Write(text)); }
+
+  std::vector<std::string> ReadProjectPath(const std::string& path) {
+    file_ = AddNewFile(project_.Get(), path, "PLUGIN_Hrf");
+    HolderOf(file_.Get())->Parse(nullptr);
+    return Describe(FileObject(file_.Get())->GetUnitSet());
+  }
+
+  // Reads `text` with the grammar, as the converter parsers do, into a file's holder with its
+  // default type slots. `result` gets qhParser's result.
+  std::vector<std::string> ReadConverterOutput(std::string_view text, int& result) {
+    return ReadConverterPath(Write(text), result);
+  }
+
+  std::vector<std::string> ReadConverterPath(const std::string& path, int& result) {
+    file_ = AddNewFile(project_.Get(), path, "PLUGIN_Hrf");
+    Vad::CParserConfigHolder* holder = HolderOf(file_.Get());
+    holder->BeginParse(nullptr);
+    result = Vad::qhParser(Port::StringBase(path), *holder).Parse();
+    holder->EndParse();
+    return Describe(holder->GetUnitSet());
+  }
+
+  // A new file in the test's directory holding exactly these bytes.
+  std::string Write(std::string_view bytes) {
+    std::string path = dir_.Path("design" + std::to_string(++fileCount_) + ".hrf");
+    std::FILE* out = std::fopen(path.c_str(), "wb");
+    EXPECT_NE(out, nullptr);
+    if (out) {
+      EXPECT_EQ(std::fwrite(bytes.data(), 1, bytes.size(), out), bytes.size());
+      std::fclose(out);
+    }
+    return path;
+  }
+
+  static std::vector<std::string> Describe(Vad::IHdlDesignUnitSet* set) {
+    std::vector<std::string> descriptions;
+    for (CitI::IInterface* unit : UnitsOf(set)) descriptions.push_back(Describe(unit));
+    return descriptions;
+  }
+
+  // "<store key> line <n> <kind>", then "parent <store key>" and "flag" (the unit flag) as they
+  // apply.
+  static std::string Describe(CitI::IInterface* unit) {
+    auto* element = Prjrep::ImplementationCast<Vad::CHdlElement>(unit);
+    if (!element) return "<not a record>";
+    std::string text = element->GetKey().str() + " line " + std::to_string(element->GetLine()) + " " +
+                       KindOf(element->GetDesignUnitTypeId());
+    if (element->GetParent()) text += " parent " + element->GetParent()->GetKey().str();
+    if (element->GetUnitFlag()) text += " flag";
+    return text;
+  }
+
+  // The identifiers of hierarchy files and of the holder's default slots.
+  static std::string KindOf(const Port::XUID& type) {
+    struct Kind {
+      const char* id;
+      const char* name;
+    };
+    static constexpr Kind kKinds[] = {{"{F8EC4980-CDA2-4346-9E3C-DB50D7DA83E9}", "instance"},
+                                      {"{15B800DC-CD3B-45f9-B26A-26BFDD3441EF}", "entity"},
+                                      {"{C15358C8-D5ED-4619-9ADB-1D607C75747B}", "use"},
+                                      {"{6DCC6CCB-40B6-4f09-9AB3-C3593438F5B2}", "architecture"},
+                                      {"{35077F2B-87EA-47ac-834F-8C02E49945F0}", "package-body"},
+                                      {"{98867360-CC87-4033-AB17-973F0CEB374F}", "package"},
+                                      {"{AE4C9C94-8BAF-44e7-8443-58AD260CF311}", "module"},
+                                      {"{2391D1AB-9BB0-4a61-A080-3CE4BFE2E116}", "test-vector"}};
+    for (const Kind& kind : kKinds) {
+      if (type == Port::XUID(std::string_view(kind.id))) return kind.name;
+    }
+    return "type " + type.ToString();
+  }
+
+  ScopedTempDir dir_;
+  Prjrep::AutoPtr<Vad::IHdlProject> project_;
+  Prjrep::AutoPtr<Vad::IHdlFile> file_;
+  int fileCount_ = 0;
+};
+
+}  // namespace hrf_test
