@@ -7,7 +7,8 @@ namespace Vad {
 
 class AbelVectorParser : public Parser {
  public:
-  // This source kind is not read yet: records nothing and says so on the debug channel.
+  // As AbelParser, but with type slots under which only entities, packages, instance labels and
+  // test vectors record: the converter's module and architecture lines record nothing. Always 1.
   int Parse(CParserConfigHolder& holder) override;
 };
 

@@ -3,12 +3,21 @@
 
 #include "Parser.h"
 
+class Xdm_Model;
+
 namespace Vad {
 
 class PlxParser : public Parser {
  public:
-  // This source kind is not read yet: records nothing and says so on the debug channel.
+  // Records one module named after the top block of the database's first view, with the type of
+  // slot 1; a database that cannot be read is reported and gives a module named after the file
+  // instead. Always 1.
   int Parse(CParserConfigHolder& holder) override;
+
+ private:
+  // True when the database was read and its module recorded.
+  bool ReadDatabase(const char* path, CParserConfigHolder& holder) const;
+  void RecordTopBlock(Xdm_Model& model, CParserConfigHolder& holder) const;
 };
 
 }  // namespace Vad

@@ -7,7 +7,9 @@ namespace Vad {
 
 class SchematicParser : public Parser {
  public:
-  // This source kind is not read yet: records nothing and says so on the debug channel.
+  // Converts the schematic unless its output ("<base name>.hrf" in the directory of the file's
+  // host location) is at least as new as the source, then reads the output with the hierarchy
+  // grammar; without an output, records one module named after the file. Always 1.
   int Parse(CParserConfigHolder& holder) override;
 };
 

@@ -1,0 +1,54 @@
+// What the parsers that read sources through an external converter share: the source's names,
+// running the converter with its failure messages, and working inside the source's directory.
+#pragma once
+
+#include "Port/ChildOutput.h"
+#include "Port/StringBase.h"
+
+namespace Vad {
+
+class CParserConfigHolder;
+
+// The names of the holder's source file.
+struct SourceNames {
+  explicit SourceNames(const CParserConfigHolder& holder);
+
+  Port::StringBase fullPath;
+  Port::StringBase baseName;  // without directory and extension
+  Port::StringBase fileName;  // without directory
+  // The full path with the file name removed (it keeps its trailing '/'); empty when the path
+  // has no directory.
+  Port::StringBase directory;
+};
+
+// The two messages a converter's failure is reported with.
+struct ConverterMessages {
+  const char* processFailed;
+  const char* badCommandLine;
+};
+
+// Runs `command` without a shell and reports a failure with the tool's messages: the first for
+// status 1, the second for any other non-zero status. `sink` (may be null) takes the tool's
+// output and is owned by the call. The tool's status.
+int RunConverter(const Port::StringBase& command, const ConverterMessages& messages,
+                 Port::ChildOutput* sink = nullptr);
+
+// Issues one finished message text of the converter parsers (category "ProjectMgmt").
+void IssueConverterError(const Port::StringBase& text);
+void IssueConverterWarning(const Port::StringBase& text);
+
+// Changes the current directory for one scope and always changes back, also when the scope is
+// left by an exception. An empty directory leaves the current one as it is.
+class CurrentDirectoryScope {
+ public:
+  explicit CurrentDirectoryScope(const Port::StringBase& directory);
+  ~CurrentDirectoryScope();
+  CurrentDirectoryScope(const CurrentDirectoryScope&) = delete;
+  CurrentDirectoryScope& operator=(const CurrentDirectoryScope&) = delete;
+
+ private:
+  Port::StringBase saved_;
+  bool changed_ = false;
+};
+
+}  // namespace Vad
