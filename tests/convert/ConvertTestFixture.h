@@ -59,13 +59,6 @@ class ConverterParse : public pipeline_test::PipelineTest {
     return path;
   }
 
-  static void WriteBytes(const std::string& path, std::string_view bytes) {
-    std::FILE* out = std::fopen(path.c_str(), "wb");
-    ASSERT_NE(out, nullptr) << path;
-    EXPECT_EQ(std::fwrite(bytes.data(), 1, bytes.size(), out), bytes.size());
-    std::fclose(out);
-  }
-
   static std::string ReadBytes(const std::string& path) {
     std::string text;
     if (std::FILE* in = std::fopen(path.c_str(), "rb")) {
@@ -118,9 +111,7 @@ class ConverterParse : public pipeline_test::PipelineTest {
   }
 
   static std::vector<std::string> Describe(Vad::IHdlDesignUnitSet* set) {
-    std::vector<std::string> descriptions;
-    for (CitI::IInterface* unit : UnitsOf(set)) descriptions.push_back(Describe(unit));
-    return descriptions;
+    return DescribeUnits(set, [](CitI::IInterface* unit) { return Describe(unit); });
   }
 
   // "<store key> line <n> <kind>", then "partition <p>", "parent <store key>" and "flag" as they

@@ -93,19 +93,11 @@ class EdifRead : public pipeline_test::PipelineTest {
 
   std::string Write(std::string_view bytes, std::string_view name) {
     std::string path = dir_.Path(name);
-    std::FILE* out = std::fopen(path.c_str(), "wb");
-    EXPECT_NE(out, nullptr);
-    if (out) {
-      EXPECT_EQ(std::fwrite(bytes.data(), 1, bytes.size(), out), bytes.size());
-      std::fclose(out);
-    }
-    return path;
+    return WriteBytes(path, bytes);
   }
 
   static std::vector<std::string> Describe(Vad::IHdlDesignUnitSet* set) {
-    std::vector<std::string> descriptions;
-    for (CitI::IInterface* unit : UnitsOf(set)) descriptions.push_back(Describe(unit));
-    return descriptions;
+    return DescribeUnits(set, [](CitI::IInterface* unit) { return Describe(unit); });
   }
 
   // "<store key> <kind>", then "parent <store key>", "partition <name>" and "line <n>" (a line

@@ -50,19 +50,11 @@ class HierarchyRead : public pipeline_test::PipelineTest {
   // A new file in the test's directory holding exactly these bytes.
   std::string Write(std::string_view bytes) {
     std::string path = dir_.Path("design" + std::to_string(++fileCount_) + ".hrf");
-    std::FILE* out = std::fopen(path.c_str(), "wb");
-    EXPECT_NE(out, nullptr);
-    if (out) {
-      EXPECT_EQ(std::fwrite(bytes.data(), 1, bytes.size(), out), bytes.size());
-      std::fclose(out);
-    }
-    return path;
+    return WriteBytes(path, bytes);
   }
 
   static std::vector<std::string> Describe(Vad::IHdlDesignUnitSet* set) {
-    std::vector<std::string> descriptions;
-    for (CitI::IInterface* unit : UnitsOf(set)) descriptions.push_back(Describe(unit));
-    return descriptions;
+    return DescribeUnits(set, [](CitI::IInterface* unit) { return Describe(unit); });
   }
 
   // "<store key> line <n> <kind>", then "parent <store key>" and "flag" (the unit flag) as they

@@ -4,6 +4,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdio>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -94,6 +95,25 @@ class PipelineTest : public testing::Test {
     if (!set || set->CreateIterator(it.Out()) != CitI::kOk) return units;
     for (; !it->IsDone(); it->Next()) units.push_back(it->Current());
     return units;
+  }
+
+  // Writes exactly `bytes` to `path` (replacing the file) and answers the path.
+  static std::string WriteBytes(const std::string& path, std::string_view bytes) {
+    std::FILE* out = std::fopen(path.c_str(), "wb");
+    EXPECT_NE(out, nullptr) << path;
+    if (out) {
+      EXPECT_EQ(std::fwrite(bytes.data(), 1, bytes.size(), out), bytes.size()) << path;
+      std::fclose(out);
+    }
+    return path;
+  }
+
+  // One description per unit of `set`, in its order.
+  template <class DescribeUnit>
+  static std::vector<std::string> DescribeUnits(Vad::IHdlDesignUnitSet* set, DescribeUnit describe) {
+    std::vector<std::string> descriptions;
+    for (CitI::IInterface* unit : UnitsOf(set)) descriptions.push_back(describe(unit));
+    return descriptions;
   }
 
   static std::vector<std::string> StoreKeys(Vad::IHdlDesignUnitSet* set) {

@@ -12,12 +12,12 @@
 #include <string_view>
 #include <vector>
 
-#include "ScopedEnv.h"
 #include "../pipeline/PipelineFixtures.h"
 #include "CHdlElement.h"
 #include "Port/Env.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
+#include "ScopedEnv.h"
 #include "ScopedTempDir.h"
 #include "VerilogArguments.h"
 #include "VerilogParser.h"
@@ -33,13 +33,7 @@ class VerilogProject : public pipeline_test::PipelineTest {
   // A file of the test's directory holding exactly these bytes; answers its full path.
   std::string Write(std::string_view name, std::string_view bytes) const {
     const std::string path = dir_.Path(name);
-    std::FILE* out = std::fopen(path.c_str(), "wb");
-    EXPECT_NE(out, nullptr);
-    if (out) {
-      EXPECT_EQ(std::fwrite(bytes.data(), 1, bytes.size(), out), bytes.size());
-      std::fclose(out);
-    }
-    return path;
+    return WriteBytes(path, bytes);
   }
 
   Prjrep::AutoPtr<Vad::IHdlFile> AddVerilog(const std::string& path, std::uint64_t orderKey, bool v3 = true) {
