@@ -114,42 +114,22 @@ class ConverterParse : public pipeline_test::PipelineTest {
     return DescribeUnits(set, [](CitI::IInterface* unit) { return Describe(unit); });
   }
 
-  // "<store key> line <n> <kind>", then "partition <p>", "parent <store key>" and "flag" as they
-  // apply.
-  static std::string Describe(CitI::IInterface* unit) {
-    auto* element = Prjrep::ImplementationCast<Vad::CHdlElement>(unit);
-    if (!element) return "<not a record>";
-    std::string text = element->GetKey().str() + " line " + std::to_string(element->GetLine()) + " " +
-                       KindOf(element->GetDesignUnitTypeId());
-    Port::StringBase partition;
-    if (element->GetProperty("PARTITION", partition) == CitI::kOk && !partition.IsEmpty()) {
-      text += " partition " + partition.str();
-    }
-    if (element->GetParent()) text += " parent " + element->GetParent()->GetKey().str();
-    if (element->GetUnitFlag()) text += " flag";
-    return text;
-  }
+  static std::string Describe(CitI::IInterface* unit) { return DescribeRecord(unit, KindOf); }
 
   static std::string KindOf(const Port::XUID& type) {
-    struct Kind {
-      const char* id;
-      const char* name;
-    };
-    static constexpr Kind kKinds[] = {{"{F8EC4980-CDA2-4346-9E3C-DB50D7DA83E9}", "instance"},
-                                      {"{15B800DC-CD3B-45f9-B26A-26BFDD3441EF}", "entity"},
-                                      {"{6DCC6CCB-40B6-4f09-9AB3-C3593438F5B2}", "architecture"},
-                                      {"{AE4C9C94-8BAF-44e7-8443-58AD260CF311}", "module"},
-                                      {"{2391D1AB-9BB0-4a61-A080-3CE4BFE2E116}", "test-vector"},
-                                      {"{3E515CB2-8A29-45dd-860D-0C91C6E19881}", "file-named"},
-                                      {"{8E6A8A42-F002-42fd-B41D-ACBD4C2B5496}", "netlist-top"},
-                                      {"{45521D25-692C-4132-B1A3-3B13F6144A62}", "netlist-lower"},
-                                      {"{B237B353-2643-4349-909D-962EC491A5A1}", "netlist-instance"},
-                                      {"{6DD669C2-9830-4a4d-B522-97C444BEB739}", "placed-database"},
-                                      {"{98318D43-5516-4f88-880D-2695BB65C12E}", "intermediate-database"}};
-    for (const Kind& kind : kKinds) {
-      if (type == Port::XUID(std::string_view(kind.id))) return kind.name;
-    }
-    return "type " + type.ToString();
+    static constexpr TypeName kKinds[] = {
+        {"{F8EC4980-CDA2-4346-9E3C-DB50D7DA83E9}", "instance"},
+        {"{15B800DC-CD3B-45f9-B26A-26BFDD3441EF}", "entity"},
+        {"{6DCC6CCB-40B6-4f09-9AB3-C3593438F5B2}", "architecture"},
+        {"{AE4C9C94-8BAF-44e7-8443-58AD260CF311}", "module"},
+        {"{2391D1AB-9BB0-4a61-A080-3CE4BFE2E116}", "test-vector"},
+        {"{3E515CB2-8A29-45dd-860D-0C91C6E19881}", "file-named"},
+        {"{8E6A8A42-F002-42fd-B41D-ACBD4C2B5496}", "netlist-top"},
+        {"{45521D25-692C-4132-B1A3-3B13F6144A62}", "netlist-lower"},
+        {"{B237B353-2643-4349-909D-962EC491A5A1}", "netlist-instance"},
+        {"{6DD669C2-9830-4a4d-B522-97C444BEB739}", "placed-database"},
+        {"{98318D43-5516-4f88-880D-2695BB65C12E}", "intermediate-database"}};
+    return NameOfType(type, kKinds);
   }
 
   ScopedTempDir tools_;

@@ -57,36 +57,19 @@ class HierarchyRead : public pipeline_test::PipelineTest {
     return DescribeUnits(set, [](CitI::IInterface* unit) { return Describe(unit); });
   }
 
-  // "<store key> line <n> <kind>", then "parent <store key>" and "flag" (the unit flag) as they
-  // apply.
-  static std::string Describe(CitI::IInterface* unit) {
-    auto* element = Prjrep::ImplementationCast<Vad::CHdlElement>(unit);
-    if (!element) return "<not a record>";
-    std::string text = element->GetKey().str() + " line " + std::to_string(element->GetLine()) + " " +
-                       KindOf(element->GetDesignUnitTypeId());
-    if (element->GetParent()) text += " parent " + element->GetParent()->GetKey().str();
-    if (element->GetUnitFlag()) text += " flag";
-    return text;
-  }
+  static std::string Describe(CitI::IInterface* unit) { return DescribeRecord(unit, KindOf); }
 
   // The identifiers of hierarchy files and of the holder's default slots.
   static std::string KindOf(const Port::XUID& type) {
-    struct Kind {
-      const char* id;
-      const char* name;
-    };
-    static constexpr Kind kKinds[] = {{"{F8EC4980-CDA2-4346-9E3C-DB50D7DA83E9}", "instance"},
-                                      {"{15B800DC-CD3B-45f9-B26A-26BFDD3441EF}", "entity"},
-                                      {"{C15358C8-D5ED-4619-9ADB-1D607C75747B}", "use"},
-                                      {"{6DCC6CCB-40B6-4f09-9AB3-C3593438F5B2}", "architecture"},
-                                      {"{35077F2B-87EA-47ac-834F-8C02E49945F0}", "package-body"},
-                                      {"{98867360-CC87-4033-AB17-973F0CEB374F}", "package"},
-                                      {"{AE4C9C94-8BAF-44e7-8443-58AD260CF311}", "module"},
-                                      {"{2391D1AB-9BB0-4a61-A080-3CE4BFE2E116}", "test-vector"}};
-    for (const Kind& kind : kKinds) {
-      if (type == Port::XUID(std::string_view(kind.id))) return kind.name;
-    }
-    return "type " + type.ToString();
+    static constexpr TypeName kKinds[] = {{"{F8EC4980-CDA2-4346-9E3C-DB50D7DA83E9}", "instance"},
+                                          {"{15B800DC-CD3B-45f9-B26A-26BFDD3441EF}", "entity"},
+                                          {"{C15358C8-D5ED-4619-9ADB-1D607C75747B}", "use"},
+                                          {"{6DCC6CCB-40B6-4f09-9AB3-C3593438F5B2}", "architecture"},
+                                          {"{35077F2B-87EA-47ac-834F-8C02E49945F0}", "package-body"},
+                                          {"{98867360-CC87-4033-AB17-973F0CEB374F}", "package"},
+                                          {"{AE4C9C94-8BAF-44e7-8443-58AD260CF311}", "module"},
+                                          {"{2391D1AB-9BB0-4a61-A080-3CE4BFE2E116}", "test-vector"}};
+    return NameOfType(type, kKinds);
   }
 
   ScopedTempDir dir_;

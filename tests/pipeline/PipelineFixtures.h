@@ -9,6 +9,7 @@
 #include <string_view>
 #include <vector>
 
+#include "CHdlElement.h"
 #include "CHdlFile.h"
 #include "CParserConfigHolder.h"
 #include "DbObject.h"
@@ -114,6 +115,38 @@ class PipelineTest : public testing::Test {
     std::vector<std::string> descriptions;
     for (CitI::IInterface* unit : UnitsOf(set)) descriptions.push_back(describe(unit));
     return descriptions;
+  }
+
+  // A design-unit type identifier (as text) and the short name tests describe it by.
+  struct TypeName {
+    const char* id;
+    const char* name;
+  };
+
+  // The name `names` gives `type`; "type <identifier>" when it gives none.
+  template <std::size_t N>
+  static std::string NameOfType(const Port::XUID& type, const TypeName (&names)[N]) {
+    for (const TypeName& entry : names) {
+      if (type == Port::XUID(std::string_view(entry.id))) return entry.name;
+    }
+    return "type " + type.ToString();
+  }
+
+  // "<store key> line <n> <kind>", then "partition <p>", "parent <store key>" and "flag" (the unit
+  // flag) as they apply; `kindOf` names the record's type.
+  template <class KindOf>
+  static std::string DescribeRecord(CitI::IInterface* unit, KindOf kindOf) {
+    auto* element = Prjrep::ImplementationCast<Vad::CHdlElement>(unit);
+    if (!element) return "<not a record>";
+    std::string text = element->GetKey().str() + " line " + std::to_string(element->GetLine()) + " " +
+                       kindOf(element->GetDesignUnitTypeId());
+    Port::StringBase partition;
+    if (element->GetProperty("PARTITION", partition) == CitI::kOk && !partition.IsEmpty()) {
+      text += " partition " + partition.str();
+    }
+    if (element->GetParent()) text += " parent " + element->GetParent()->GetKey().str();
+    if (element->GetUnitFlag()) text += " flag";
+    return text;
   }
 
   static std::vector<std::string> StoreKeys(Vad::IHdlDesignUnitSet* set) {
