@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <fstream>
+
 #include "Host/DataStore.h"
 #include "Host/EventReceiver.h"
 #include "Host/FileType.h"
@@ -9,6 +11,7 @@
 #include "IDesignUnitTypeStore.h"
 #include "IEventSender.h"
 #include "IFile.h"
+#include "ScopedTempDir.h"
 #include "IFileNameHelper.h"
 #include "IName.h"
 #include "ISourceLibrary.h"
@@ -182,7 +185,10 @@ TEST_F(HostComponents, FileNameHelperLooksAtTheFileItself) {
   ASSERT_TRUE(helper);
   bool exists = false;
   std::int64_t seconds = 0;
-  helper->SetFilePath(__FILE__, "", "/");
+  ScopedTempDir dir;
+  const std::string path = dir.Path("top.v");
+  std::ofstream(path) << "module top; endmodule\n";
+  helper->SetFilePath(path.c_str(), "", "/");
   EXPECT_EQ(helper->Exists(&exists), CitI::kOk);
   EXPECT_TRUE(exists);
   EXPECT_EQ(helper->GetModificationTime(&seconds), CitI::kOk);

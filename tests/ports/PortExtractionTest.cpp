@@ -14,7 +14,7 @@
 #include <string_view>
 #include <vector>
 
-#include "../pipeline/PipelineFixtures.h"
+#include "PipelineFixtures.h"
 #include "IHdlElaborationData.h"
 #include "IHdlPort.h"
 #include "Port/MsgCollector.h"

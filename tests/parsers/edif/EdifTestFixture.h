@@ -11,7 +11,7 @@
 #include <string_view>
 #include <vector>
 
-#include "../pipeline/PipelineFixtures.h"
+#include "PipelineFixtures.h"
 #include "CHdlElement.h"
 #include "CParserConfigHolder.h"
 #include "EdifParser.h"

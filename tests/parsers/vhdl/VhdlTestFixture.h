@@ -10,7 +10,7 @@
 #include <string_view>
 #include <vector>
 
-#include "../pipeline/PipelineFixtures.h"
+#include "PipelineFixtures.h"
 #include "CHdlElement.h"
 #include "CVhdlDU.h"
 #include "ScopedTempDir.h"

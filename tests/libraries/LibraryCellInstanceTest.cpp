@@ -2,7 +2,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "../vhdl/VhdlTestFixture.h"
+#include "../parsers/vhdl/VhdlTestFixture.h"
 #include "CHdlProject.h"
 #include "CLibRefs.h"
 #include "LibRefTestSupport.h"

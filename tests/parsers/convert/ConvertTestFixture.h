@@ -14,7 +14,7 @@
 #include <string_view>
 #include <vector>
 
-#include "../pipeline/PipelineFixtures.h"
+#include "PipelineFixtures.h"
 #include "CHdlElement.h"
 #include "CParserConfigHolder.h"
 #include "Port/File.h"

@@ -12,7 +12,7 @@
 #include <string_view>
 #include <vector>
 
-#include "../pipeline/PipelineFixtures.h"
+#include "PipelineFixtures.h"
 #include "CHdlElement.h"
 #include "Port/Env.h"
 #include "Port/MsgCollector.h"
