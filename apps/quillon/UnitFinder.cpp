@@ -1,5 +1,6 @@
 #include "UnitFinder.h"
 
+#include "Host/VhdlName.h"
 #include "IName.h"
 #include "Port/StringBase.h"
 #include "Prjrep/AutoPtr.h"
@@ -16,8 +17,9 @@ std::string_view NameInKey(std::string_view key) {
   return key.substr(start + 1, end == std::string_view::npos ? std::string_view::npos : end - start - 1);
 }
 
+// The second look-up follows VHDL: letter case is ignored except inside extended identifiers.
 bool Same(std::string_view a, std::string_view b, int compareType) {
-  return Port::StringBase(a).Equals(b, compareType);
+  return compareType == Port::kCompareExact ? a == b : Host::SameVhdlName(a, b);
 }
 
 }  // namespace

@@ -14,6 +14,7 @@
 #include "CompInst.h"
 #include "EntityDecl.h"
 #include "EntityInst.h"
+#include "Host/VhdlName.h"
 #include "IHdlDUProperties.h"
 #include "Identifiers.h"
 #include "PackageBody.h"
@@ -45,6 +46,14 @@ constexpr const char* kUntrackedEntityLibraries[] = {"basecell", "ieee", "blockc
 constexpr const char* kCellLibraries[] = {"basecell", "blockcell", "timecell"};
 
 bool ModeOneEqual(const Port::StringBase& a, std::string_view b) { return a.Equals(b, Port::kCompareNoCase); }
+
+// Unit keys name their kind first: Verilog module names keep their letter case, VHDL names follow
+// the VHDL rule (basic identifiers fold, extended identifiers do not).
+bool SameUnitKey(std::string_view a, std::string_view b) {
+  constexpr std::string_view kModulePrefix = "Module|";
+  if (a.substr(0, kModulePrefix.size()) == kModulePrefix) return a == b;
+  return Host::SameVhdlName(a, b);
+}
 
 template <std::size_t N>
 bool IsOneOf(const Port::StringBase& text, const char* const (&list)[N]) {
@@ -192,7 +201,7 @@ const std::vector<Port::StringBase>* CElaborator::FindRegisteredKey(const CElabT
   const CElabTables::RegisteredUnit* chosen = nullptr;
   auto [first, last] = tables.m_sArchitectureMultiMapList.equal_range(shortKey);
   for (auto entry = first; entry != last; ++entry) {
-    if (exact && entry->first != shortKey) continue;
+    if (exact && !SameUnitKey(entry->first, shortKey)) continue;
     chosen = &entry->second;
     if (ModeOneEqual(entry->second.library, library)) break;
   }
@@ -204,7 +213,7 @@ IHdlElement* CElaborator::FindRegisteredElement(const CElabTables& tables, const
   IHdlElement* chosen = nullptr;
   auto [first, last] = tables.m_piHdlElementMultiMapNames.equal_range(name);
   for (auto entry = first; entry != last; ++entry) {
-    if (exact && entry->first != name) continue;
+    if (exact && !SameUnitKey(entry->first, name)) continue;
     chosen = entry->second;
     if (ModeOneEqual(LibraryOf(chosen), library)) break;
   }
@@ -256,7 +265,7 @@ CitI::Result CElaborator::RegisterShortKey(CElabTables& tables, const Port::Stri
   if (shortKey.IsEmpty() || library.IsEmpty()) return CitI::kInvalidArg;
   auto [first, last] = tables.m_sArchitectureMultiMapList.equal_range(shortKey);
   for (auto entry = first; entry != last; ++entry) {
-    if (entry->first == shortKey && ModeOneEqual(entry->second.library, library)) return CitI::kOk;
+    if (SameUnitKey(entry->first, shortKey) && ModeOneEqual(entry->second.library, library)) return CitI::kOk;
   }
   tables.m_sArchitectureMultiMapList.emplace(
       shortKey, CElabTables::RegisteredUnit{{Qualify(library, fullKey)}, library});
@@ -282,8 +291,7 @@ CitI::Result CElaborator::RegisterDesignUnits(CElabTables& tables, IHdlDesignUni
     Port::StringBase fullKey;
     MakeUnitKeys(element, shortKey, fullKey);
 
-    bool exact = (unit->GetType() & ElabMask::kVhdlUnit) == 0;
-    IHdlElement* registered = FindRegisteredElement(tables, name, library, exact);
+    IHdlElement* registered = FindRegisteredElement(tables, name, library, true);
     if (registered && ModeOneEqual(LibraryOf(registered), library)) {
       Port::StringBase suffix;
       suffix.Format(ElabText::kDuplicateSuffix, ++duplicateCount);
@@ -342,12 +350,12 @@ Port::StringBase CElaborator::ResolveEntityRef(const CElabTables& tables, const 
   if (entityLibrary.IsEmpty() || ModeOneEqual(entityLibrary, "work")) entityLibrary = library;
   if (IsOneOf(entityLibrary, kUntrackedEntityLibraries)) return {};
 
-  const auto* keys = FindRegisteredKey(tables, Formatted("Architecture|%s", entity), entityLibrary, false);
+  const auto* keys = FindRegisteredKey(tables, Formatted("Architecture|%s", entity), entityLibrary, true);
   if (keys && architecture.IsEmpty()) return FirstOf(keys);
   if (keys) {
     Port::StringBase wanted = Qualify(entityLibrary, Formatted("Architecture|%s|%s", entity, architecture));
     for (const Port::StringBase& key : *keys) {
-      if (ModeOneEqual(key, wanted)) return key;
+      if (Host::SameVhdlName(key, wanted)) return key;
     }
     return {};
   }

@@ -10,6 +10,7 @@
 
 #include "CitI.h"
 #include "HdlSets.h"
+#include "Host/VhdlName.h"
 #include "Port/StringBase.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/TRefCountHelper.h"
@@ -152,7 +153,7 @@ class CParserConfigHolder final : public CitI::IInterface {
   Port::StringBase library_;
   std::shared_ptr<const SiblingPaths> siblingPaths_;
   Port::StringBase part_;
-  std::map<Port::StringBase, Port::StringBase> componentBindings_;
+  std::map<Port::StringBase, Port::StringBase, Host::VhdlNameLess> componentBindings_;
   TypeIds typeIds_;
   std::array<bool, kTypeSlotCount> typeEnabled_{};
   std::int32_t generateDepth_ = 0;

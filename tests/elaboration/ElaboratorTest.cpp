@@ -144,6 +144,25 @@ TEST_F(Elaborator, ModulesDifferingInCaseAreNoDuplicates) {
   EXPECT_EQ(Count("work:Module|TOP"), 0);
 }
 
+TEST_F(Elaborator, VhdlNamesResolveWithoutCaseExceptExtendedIdentifiers) {
+  CitI::IInterface* folded = Entity("\\Dup\\");
+  CitI::IInterface* exact = Entity("\\DUP\\");
+  CitI::IInterface* package = Package("My_Pkg");
+  CitI::IInterface* table = Package("\\Tab\\");
+  CitI::IInterface* user = Entity("user");
+  Uses(user, "WORK.my_pkg.all");
+  Uses(user, "work.\\TAB\\.all");
+  Uses(user, "work.\\Tab\\.all");
+  ASSERT_EQ(Resolve({folded, exact, package, table, user}), CitI::kOk);
+
+  EXPECT_TRUE(duplicates_.empty());
+  EXPECT_EQ(Depends("work:Entity|user"),
+            (std::vector<std::string>{"work:PackageDecl|My_Pkg", "work:PackageDecl|\\TAB\\",
+                                      "work:PackageDecl|\\Tab\\"}));
+  EXPECT_EQ(Count("work:PackageDecl|My_Pkg"), 1);
+  EXPECT_EQ(Count("work:PackageDecl|\\Tab\\"), 1);
+}
+
 TEST_F(Elaborator, GenericsAreNotRegistered) {
   CitI::IInterface* width = Keep(MakeUnit<Vad::generic>(work_.Get(), "WIDTH", nullptr));
   ASSERT_EQ(Resolve({width, Entity("e")}), CitI::kOk);
@@ -279,7 +298,8 @@ TEST_F(Elaborator, ProcessingAUnitTwiceIsReportedAndDoneAgain) {
 TEST_F(Elaborator, FindsElementsByQualifiedKeyInTheirLibraryOnly) {
   CitI::IInterface* mine = Entity("e");
   CitI::IInterface* theirs = Entity("f", other_.Get());
-  ASSERT_EQ(Resolve({mine, theirs}), CitI::kOk);
+  CitI::IInterface* module = Module("m");
+  ASSERT_EQ(Resolve({mine, theirs, module}), CitI::kOk);
   Vad::IHdlElement* found = nullptr;
   EXPECT_EQ(elaborator_.FindElementByKey(tables_, "Entity|e", true, &found), CitI::kOk);
   EXPECT_EQ(found, ElementOf(mine));
@@ -287,10 +307,13 @@ TEST_F(Elaborator, FindsElementsByQualifiedKeyInTheirLibraryOnly) {
   EXPECT_EQ(found, ElementOf(theirs));
   EXPECT_EQ(elaborator_.FindElementByKey(tables_, "work:Entity|f", true, &found), CitI::kOk);
   EXPECT_EQ(found, nullptr);
+  // An exact look-up follows each language: VHDL names without case, Verilog names with it.
   EXPECT_EQ(elaborator_.FindElementByKey(tables_, "work:Entity|E", true, &found), CitI::kOk);
-  EXPECT_EQ(found, nullptr);
-  EXPECT_EQ(elaborator_.FindElementByKey(tables_, "work:Entity|E", false, &found), CitI::kOk);
   EXPECT_EQ(found, ElementOf(mine));
+  EXPECT_EQ(elaborator_.FindElementByKey(tables_, "work:Module|M", true, &found), CitI::kOk);
+  EXPECT_EQ(found, nullptr);
+  EXPECT_EQ(elaborator_.FindElementByKey(tables_, "work:Module|M", false, &found), CitI::kOk);
+  EXPECT_EQ(found, ElementOf(module));
   EXPECT_EQ(elaborator_.FindElementByKey(tables_, "", true, &found), CitI::kInvalidArg);
   EXPECT_EQ(elaborator_.FindElementByKey(tables_, "Entity|e", true, nullptr), CitI::kInvalidArg);
 }

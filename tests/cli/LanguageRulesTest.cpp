@@ -1,0 +1,140 @@
+// The languages' own rules in resolution, end to end: VHDL names without letter case (extended
+// identifiers excepted).
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <fstream>
+#include <initializer_list>
+#include <nlohmann/json.hpp>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "CliRun.h"
+#include "ScopedTempDir.h"
+
+namespace cli_test {
+namespace {
+
+using Json = nlohmann::json;
+
+// A folder of HDL sources written for one test.
+class Sources {
+ public:
+  Sources(std::initializer_list<std::pair<const char*, const char*>> files) {
+    for (const auto& [name, text] : files) std::ofstream(dir_.Path(name), std::ios::binary) << text;
+  }
+  std::string operator()(const char* name) const { return dir_.Path(name); }
+
+ private:
+  ScopedTempDir dir_;
+};
+
+std::vector<std::string> With(std::vector<std::string> args, const std::vector<std::string>& more) {
+  args.insert(args.end(), more.begin(), more.end());
+  return args;
+}
+
+Json JsonOf(const CliResult& result) {
+  Json answer = Json::parse(result.out, nullptr, false);
+  EXPECT_FALSE(answer.is_discarded()) << result.out << result.err;
+  return answer;
+}
+
+Json TreeOf(const std::vector<std::string>& sources) {
+  CliResult result = RunQuillon(With({"-q", "--format", "json", "tree"}, sources));
+  EXPECT_EQ(result.status, 0) << result.err;
+  return JsonOf(result);
+}
+
+// Every node below the root as "name -> file" ("-" for a unit not in the project), depth first.
+void Bindings(const Json& node, std::vector<std::string>& lines) {
+  for (const Json& child : node["children"]) {
+    std::string file = child["file"].is_string() ? child["file"].get<std::string>() : "-";
+    lines.push_back(child["name"].get<std::string>() + " -> " + file.substr(file.rfind('/') + 1));
+    Bindings(child, lines);
+  }
+}
+
+std::vector<std::string> BindingsOf(const Json& tree) {
+  std::vector<std::string> lines;
+  Bindings(tree["root"], lines);
+  return lines;
+}
+
+bool Has(const std::vector<std::string>& lines, const std::string& line) {
+  for (const std::string& each : lines) {
+    if (each == line) return true;
+  }
+  return false;
+}
+
+TEST(VhdlNames, UseClausesAndPrimaryUnitsIgnoreLetterCase) {
+  Sources src{
+      {"pkg.vhd", "package My_Pkg is\n  constant width : integer := 4;\nend package;\n"},
+      {"vlib_pkg.vhd", "package ScoreBoardPkg_slv is\nend package ScoreBoardPkg_slv;\n"},
+      {"other.vhd", "entity Other is\nend entity;\n"},
+      {"user.vhd",
+       "library VLIB;\nuse VLIB.ScoreboardPkg_slv.all;\nuse work.my_pkg.all;\n"
+       "entity user is\nend entity;\narchitecture rtl of OTHER is\nbegin\nend architecture;\n"},
+  };
+  const std::vector<std::string> sources{src("user.vhd"), src("other.vhd"), src("pkg.vhd"), "-l", "vlib",
+                                         src("vlib_pkg.vhd")};
+  std::vector<std::string> bindings = BindingsOf(TreeOf(sources));
+  // The keys keep the spelling of the declarations; nothing is left outside the project.
+  EXPECT_TRUE(Has(bindings, "work:PackageDecl|My_Pkg -> pkg.vhd")) << testing::PrintToString(bindings);
+  EXPECT_TRUE(Has(bindings, "vlib:PackageDecl|ScoreBoardPkg_slv -> vlib_pkg.vhd"))
+      << testing::PrintToString(bindings);
+  EXPECT_TRUE(Has(bindings, "work:Entity|Other -> other.vhd")) << testing::PrintToString(bindings);
+  for (const std::string& line : bindings) EXPECT_EQ(line.find(" -> -"), std::string::npos) << line;
+
+  CliResult order = RunQuillon(With({"order"}, sources));
+  EXPECT_EQ(order.status, 0) << order.err;
+  std::vector<std::string> files = Lines(order.out);
+  ASSERT_EQ(files.size(), 4u);
+  EXPECT_EQ(files.back(), src("user.vhd"));
+}
+
+TEST(VhdlNames, ConfigurationsAndEntityInstancesIgnoreLetterCase) {
+  Sources src{
+      {"sub.vhd", "entity Sub is\nend entity;\narchitecture Rtl of Sub is\nbegin\nend architecture;\n"},
+      {"top.vhd",
+       "entity top is\nend entity;\narchitecture rtl of top is\n"
+       "  component MyComp is\n  end component;\n"
+       "  for all : MYCOMP use entity WORK.SUB;\n"
+       "begin\n  u_cfg : mycomp port map (a => open);\n"
+       "  u_direct : entity Work.sub(RTL) port map (a => open);\nend architecture;\n"},
+  };
+  std::vector<std::string> bindings = BindingsOf(TreeOf({src("top.vhd"), src("sub.vhd")}));
+  EXPECT_EQ(std::count(bindings.begin(), bindings.end(), "work:Architecture|Sub|Rtl -> sub.vhd"), 2)
+      << testing::PrintToString(bindings);
+}
+
+TEST(VhdlNames, ExtendedIdentifiersKeepTheirLetterCase) {
+  Sources src{
+      {"pkg.vhd", "package \\Tab\\ is\nend package;\n"},
+      {"core.vhd", "entity \\Core\\ is\nend entity;\nentity \\CORE\\ is\nend entity;\n"},
+      {"user.vhd", "use work.\\Tab\\.all;\nentity exact is\nend entity;\n"},
+      {"other.vhd", "use work.\\TAB\\.all;\nentity folded is\nend entity;\n"},
+  };
+  const std::vector<std::string> sources{src("pkg.vhd"), src("core.vhd"), src("user.vhd"), src("other.vhd")};
+  CliResult tree = RunQuillon(With({"--format", "json", "tree"}, sources));
+  EXPECT_EQ(tree.status, 0) << tree.err;
+  std::vector<std::string> bindings = BindingsOf(JsonOf(tree));
+  EXPECT_TRUE(Has(bindings, "work:PackageDecl|\\Tab\\ -> pkg.vhd")) << testing::PrintToString(bindings);
+  EXPECT_TRUE(Has(bindings, "work:PackageDecl|\\TAB\\ -> -")) << testing::PrintToString(bindings);
+  // Two entities, not one unit declared twice.
+  EXPECT_TRUE(Has(bindings, "Entity|\\Core\\ -> core.vhd")) << testing::PrintToString(bindings);
+  EXPECT_TRUE(Has(bindings, "Entity|\\CORE\\ -> core.vhd")) << testing::PrintToString(bindings);
+  EXPECT_EQ(tree.err.find("DUPLICATE"), std::string::npos) << tree.err;
+
+  // --top follows the same rule: a basic name in any case, an extended one only as written.
+  EXPECT_EQ(RunQuillon(With({"order", "--top", "EXACT"}, sources)).status, 0);
+  CliResult extended = RunQuillon(With({"order", "--top", "\\Core\\"}, sources));
+  EXPECT_EQ(extended.status, 0) << extended.err;
+  EXPECT_EQ(Lines(extended.out), std::vector<std::string>{src("core.vhd")});
+  EXPECT_EQ(RunQuillon(With({"order", "--top", "\\core\\"}, sources)).status, 2);
+}
+
+}  // namespace
+}  // namespace cli_test
