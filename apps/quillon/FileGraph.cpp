@@ -13,15 +13,21 @@ namespace {
 using FileIndex = std::map<std::string, std::size_t>;
 using EdgeSet = std::set<std::pair<std::size_t, std::size_t>>;
 
-void CollectEdges(const TreeNodeInfo& node, const FileIndex& files, EdgeSet& edges) {
+// Instances between Verilog files are no dependency: those files keep the order they were given.
+using VerilogFiles = std::vector<bool>;
+
+void CollectEdges(const TreeNodeInfo& node, const FileIndex& files, const VerilogFiles& verilog,
+                  EdgeSet& edges) {
   if (!node.file) return;
   auto from = files.find(*node.file);
   for (const TreeNodeInfo& child : node.children) {
     if (!child.file || from == files.end()) continue;
     auto to = files.find(*child.file);
-    if (to != files.end() && to->second != from->second) edges.insert({from->second, to->second});
+    if (to == files.end() || to->second == from->second) continue;
+    if (verilog[from->second] && verilog[to->second]) continue;
+    edges.insert({from->second, to->second});
   }
-  for (const TreeNodeInfo& child : node.children) CollectEdges(child, files, edges);
+  for (const TreeNodeInfo& child : node.children) CollectEdges(child, files, verilog, edges);
 }
 
 std::vector<int> ComponentOfEachFile(std::size_t fileCount, const EdgeSet& edges) {
@@ -37,14 +43,17 @@ std::vector<int> ComponentOfEachFile(std::size_t fileCount, const EdgeSet& edges
 FileGraphInfo FileGraph::Build(const TreeNodeInfo& root, const std::vector<OrderEntry>& order) {
   FileGraphInfo graph;
   FileIndex index;
+  VerilogFiles verilog;
   for (const OrderEntry& entry : order) {
-    if (index.emplace(entry.path, graph.files.size()).second) graph.files.push_back(entry.path);
+    if (!index.emplace(entry.path, graph.files.size()).second) continue;
+    graph.files.push_back(entry.path);
+    verilog.push_back(entry.plugin == "PLUGIN_Verilog");
   }
   EdgeSet edges;
   if (root.file) {
-    CollectEdges(root, index, edges);
+    CollectEdges(root, index, verilog, edges);
   } else {
-    for (const TreeNodeInfo& top : root.children) CollectEdges(top, index, edges);
+    for (const TreeNodeInfo& top : root.children) CollectEdges(top, index, verilog, edges);
   }
   std::vector<int> component = ComponentOfEachFile(graph.files.size(), edges);
   for (const auto& [from, to] : edges) graph.edges.push_back({from, to, component[from] == component[to]});

@@ -7,6 +7,7 @@
 #include <iterator>
 #include <limits>
 #include <memory>
+#include <utility>
 
 #include "DbObject.h"
 #include "NetListWalk.h"
@@ -22,6 +23,7 @@ namespace {
 constexpr const char* kRevision = "1.1";
 constexpr std::uint32_t kDeclarationUnits = DbType::kEntity | DbType::kPackageDecl;
 constexpr std::int32_t kUnreached = std::numeric_limits<std::int32_t>::max();
+constexpr const char* kVerilogPlugin = "PLUGIN_Verilog";
 
 std::unique_ptr<Port_MsgManData> Message(int line) {
   return Port_MsgManData::createObject(CompileOrderText::kCategory, CompileOrderText::kSource, line,
@@ -123,7 +125,22 @@ CitI::Result CCompileOrder::BuildFileGraph(IHdlNetListNode* node, bool relaxed) 
     if (AddNodeDependencies(current, relaxed, status)) return NetListWalk::Step::kDescend;
     return status == CitI::kOk ? NetListWalk::Step::kSkipChildren : NetListWalk::Step::kStop;
   });
+  if (status != CitI::kOk) return status;
+  ChainVerilogFiles();
   return status;
+}
+
+void CCompileOrder::ChainVerilogFiles() {
+  std::vector<Vertex> verilog;
+  for (Vertex vertex : boost::make_iterator_range(boost::vertices(graph_))) {
+    if (graph_[vertex].verilog) verilog.push_back(vertex);
+  }
+  // Equal keys (files added without one) by name, so the chain does not depend on addresses.
+  std::stable_sort(verilog.begin(), verilog.end(), [&](Vertex a, Vertex b) {
+    if (graph_[a].orderKey != graph_[b].orderKey) return graph_[a].orderKey > graph_[b].orderKey;
+    return graph_[a].displayName.view() < graph_[b].displayName.view();
+  });
+  for (std::size_t i = 1; i < verilog.size(); ++i) AddEdge(verilog[i], verilog[i - 1]);
 }
 
 bool CCompileOrder::AddNodeDependencies(IHdlNetListNode* node, bool relaxed, CitI::Result& status) {
@@ -139,6 +156,7 @@ bool CCompileOrder::AddNodeDependencies(IHdlNetListNode* node, bool relaxed, Cit
     status = GetFileVertex(childFile.Get(), &used);
     if (status != CitI::kOk) return false;
     if (used == user) continue;
+    if (graph_[user].verilog && graph_[used].verilog) continue;
     if (relaxed && !IsDeclarationUnit(child->GetElement())) continue;
     AddEdge(user, used);
   }
@@ -150,7 +168,14 @@ void CCompileOrder::AddEdge(Vertex from, Vertex to) { boost::add_edge(from, to, 
 CitI::Result CCompileOrder::GetFileVertex(IHdlFile* file, Vertex* out) {
   if (!file || !out) return CitI::kInvalidArg;
   auto [entry, added] = vertices_.try_emplace(file, 0);
-  if (added) entry->second = boost::add_vertex(FileVertex{DisplayNameOf(file), file}, graph_);
+  if (added) {
+    FileVertex vertex{DisplayNameOf(file), file};
+    Port::StringBase plugin;
+    file->getPluginName(&plugin);
+    vertex.verilog = plugin.Equals(kVerilogPlugin, Port::kCompareNoCase);
+    file->getOrderKey(&vertex.orderKey);
+    entry->second = boost::add_vertex(std::move(vertex), graph_);
+  }
   *out = entry->second;
   return CitI::kOk;
 }

@@ -53,6 +53,8 @@ class CCompileOrder {
   struct FileVertex {
     Port::StringBase displayName;
     IHdlFile* file = nullptr;  // borrowed from the tree's elements for the computation
+    bool verilog = false;
+    std::uint64_t orderKey = 0;  // the first source given has the largest
   };
   // Out-edges in insertion order (the depth-first searches follow it), all edges in one list;
   // parallel edges allowed, one per referencing node.
@@ -72,7 +74,8 @@ class CCompileOrder {
   // ---- the steps, in the order ComputeCompileOrder takes them ----
   // Adds the files below `node` and their dependencies to the graph; vertices are numbered in
   // pre-order (a node's file, its children's files, then the subtrees). With `relaxed` set only
-  // the dependencies on Entity and PackageDecl units become edges.
+  // the dependencies on Entity and PackageDecl units become edges. Verilog files depend on each
+  // other only through the order they were given in: each on the one given before it.
   CitI::Result BuildFileGraph(IHdlNetListNode* node, bool relaxed);
   // The vertex of `file`, added on first sight. kInvalidArg for a null file or out-parameter.
   CitI::Result GetFileVertex(IHdlFile* file, Vertex* out);
@@ -109,6 +112,9 @@ class CCompileOrder {
   // nothing added) when the node has no file. `status` receives a failing step's result.
   bool AddNodeDependencies(IHdlNetListNode* node, bool relaxed, CitI::Result& status);
   void AddEdge(Vertex from, Vertex to);
+  // Macros flow from file to file in the order the Verilog files were given, so that order is
+  // kept; instances between Verilog files impose none.
+  void ChainVerilogFiles();
   std::vector<std::int32_t> ComputeLevels(const std::vector<Vertex>& reverseTopological) const;
 
   Graph graph_;

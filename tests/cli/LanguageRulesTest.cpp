@@ -1,5 +1,5 @@
-// The languages' own rules in resolution, end to end: VHDL names without letter case (extended
-// identifiers excepted).
+// The languages' own rules in resolution and order, end to end: VHDL names without letter case
+// (extended identifiers excepted) and Verilog files in the order given.
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -134,6 +134,25 @@ TEST(VhdlNames, ExtendedIdentifiersKeepTheirLetterCase) {
   EXPECT_EQ(extended.status, 0) << extended.err;
   EXPECT_EQ(Lines(extended.out), std::vector<std::string>{src("core.vhd")});
   EXPECT_EQ(RunQuillon(With({"order", "--top", "\\core\\"}, sources)).status, 2);
+}
+
+TEST(VerilogOrder, FilesKeepTheOrderGivenWhateverTheyInstantiate) {
+  Sources src{
+      // top.v defines what mid.v needs, and each instantiates a module of the other.
+      {"top.v", "`define HAVE_TOP 1\nmodule top;\n  mid u_mid();\nendmodule\nmodule leaf;\nendmodule\n"},
+      {"mid.v", "`ifdef HAVE_TOP\nmodule mid;\n  leaf u_leaf();\n  vh u_vh();\nendmodule\n`endif\n"},
+      {"vh.vhd", "entity vh is\nend entity;\narchitecture rtl of vh is\nbegin\nend architecture;\n"},
+  };
+  CliResult order = RunQuillon({"order", src("top.v"), src("mid.v"), src("vh.vhd")});
+  EXPECT_EQ(order.status, 0) << order.err;
+  EXPECT_EQ(order.err, "");
+  // The VHDL entity that mid.v instantiates still comes first.
+  EXPECT_EQ(Lines(order.out), (std::vector<std::string>{src("vh.vhd"), src("top.v"), src("mid.v")}));
+
+  CliResult check = RunQuillon({"check", src("top.v"), src("mid.v"), src("vh.vhd")});
+  EXPECT_EQ(check.status, 0) << check.err;
+  EXPECT_EQ(check.err, "");
+  EXPECT_EQ(check.out, "3 files, 5 design units: 0 errors, 0 warnings\n");
 }
 
 }  // namespace
