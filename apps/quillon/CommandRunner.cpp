@@ -6,6 +6,7 @@
 #include <iostream>
 #include <optional>
 
+#include "ArchitectureCheck.h"
 #include "DotOutput.h"
 #include "ExitStatus.h"
 #include "FileGraph.h"
@@ -234,6 +235,10 @@ int CommandRunner::Ports(ProjectReader& reader, std::ostream& out) {
 int CommandRunner::Check(ProjectReader& reader, std::size_t fileCount, std::ostream& out) {
   std::vector<OrderEntry> order;
   CitI::Result result = reader.Order(order);
+  if (result == CitI::kOk) {
+    for (const std::string& warning : ArchitectureCheck::Warnings(reader.Files(), order))
+      log_->ReportWarning(warning);
+  }
   int status = result == CitI::kOk ? Finished() : Failed("the compile order is not available", result);
   std::size_t units = reader.designUnits() ? reader.designUnits()->GetCount() : 0;
   if (options_.format == Format::kJson) {

@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "Arch.h"
+#include "ArchitectureChoice.h"
 #include "CHdlElement.h"
 #include "CHdlFile.h"
 #include "CHdlProject.h"
@@ -261,15 +262,34 @@ CitI::Result CElaborator::AddInstanceLabel(CElabTables& tables, const Port::Stri
 }
 
 CitI::Result CElaborator::RegisterShortKey(CElabTables& tables, const Port::StringBase& shortKey,
-                                           const Port::StringBase& fullKey, const Port::StringBase& library) {
+                                           const Port::StringBase& fullKey, const Port::StringBase& library,
+                                           IHdlElement* element) {
   if (shortKey.IsEmpty() || library.IsEmpty()) return CitI::kInvalidArg;
+  Port::StringBase qualified = Qualify(library, fullKey);
   auto [first, last] = tables.m_sArchitectureMultiMapList.equal_range(shortKey);
   for (auto entry = first; entry != last; ++entry) {
-    if (SameUnitKey(entry->first, shortKey) && ModeOneEqual(entry->second.library, library)) return CitI::kOk;
+    if (!SameUnitKey(entry->first, shortKey) || !ModeOneEqual(entry->second.library, library)) continue;
+    CElabTables::RegisteredUnit& unit = entry->second;
+    // Only architectures share a short key without sharing the full key.
+    if (!SameUnitKey(fullKey, shortKey)) {
+      unit.keys.push_back(qualified);
+      unit.elements.push_back(element);
+    }
+    return CitI::kOk;
   }
-  tables.m_sArchitectureMultiMapList.emplace(
-      shortKey, CElabTables::RegisteredUnit{{Qualify(library, fullKey)}, library});
+  tables.m_sArchitectureMultiMapList.emplace(shortKey,
+                                             CElabTables::RegisteredUnit{{qualified}, library, {element}});
   return CitI::kOk;
+}
+
+void CElaborator::PutDefaultArchitecturesFirst(CElabTables& tables) {
+  for (auto& [shortKey, unit] : tables.m_sArchitectureMultiMapList) {
+    if (unit.elements.size() < 2) continue;
+    auto chosen = std::find(unit.elements.begin(), unit.elements.end(), ArchitectureChoice::Default(unit.elements));
+    auto index = chosen - unit.elements.begin();
+    std::rotate(unit.elements.begin(), chosen, chosen + 1);
+    std::rotate(unit.keys.begin(), unit.keys.begin() + index, unit.keys.begin() + index + 1);
+  }
 }
 
 // ---- registration --------------------------------------------------------------------------------
@@ -301,11 +321,12 @@ CitI::Result CElaborator::RegisterDesignUnits(CElabTables& tables, IHdlDesignUni
       duplicates.push_back(element);
     }
 
-    RegisterShortKey(tables, shortKey, fullKey, library);
+    RegisterShortKey(tables, shortKey, fullKey, library, element);
     tables.m_piHdlElementMultiMapNames.emplace(name, element);
     CitI::Result result = AddDependencyCountName(tables, Qualify(library, name));
     if (result != CitI::kOk) return result;
   }
+  PutDefaultArchitecturesFirst(tables);
   return CitI::kOk;
 }
 

@@ -59,9 +59,11 @@ struct ModeOneLess {
 // the duration of the run.
 struct CElabTables {
   // The units registered under one short key and library: their qualified full keys.
+  // The architectures of one entity all stand here, the one bound by default first.
   struct RegisteredUnit {
     std::vector<Port::StringBase> keys;
     Port::StringBase library;
+    std::vector<IHdlElement*> elements;  // one per key
   };
 
   // Qualified unit name -> instance labels, with an empty text per use-clause package and
@@ -205,9 +207,13 @@ class CElaborator final : public CitI::IInterface {
   // The target key of an instance, with its reference counted when it resolves.
   Port::StringBase InstanceTarget(CElabTables& tables, DbObject* child, const Port::StringBase& library,
                                   Port::StringBase& label);
-  // Registers `fullKey` under `shortKey` unless the library already has an entry.
+  // Registers `fullKey` under `shortKey` unless the library already has an entry; another
+  // architecture of an entity joins the entry of its entity's first one.
   CitI::Result RegisterShortKey(CElabTables& tables, const Port::StringBase& shortKey,
-                                const Port::StringBase& fullKey, const Port::StringBase& library);
+                                const Port::StringBase& fullKey, const Port::StringBase& library,
+                                IHdlElement* element);
+  // Puts the architecture VHDL binds by default (ArchitectureChoice) first in each entry.
+  static void PutDefaultArchitecturesFirst(CElabTables& tables);
   // Gives `child` the instance element stored under `instanceKey`, when there is one.
   static void AttachInstanceElement(const CElabTables& tables, CNetListNode* child,
                                     const Port::StringBase& instanceKey);

@@ -9,6 +9,9 @@
 #include <memory>
 #include <utility>
 
+#include "Arch.h"
+#include "ArchitectureChoice.h"
+#include "CHdlElement.h"
 #include "DbObject.h"
 #include "NetListWalk.h"
 #include "Port/InitObjects.h"
@@ -77,7 +80,13 @@ CitI::Result CCompileOrder::ComputeCompileOrder(IHdlNetListNode* node, IHdlFileI
   if (!node || !out) return CitI::kInvalidArg;
   *out = nullptr;
   ClearGraph();
+  orderArchitectures_ = true;
   CitI::Result status = BuildFileGraph(node, false);
+  if (status == CitI::kOk && architectureEdges_ > 0 && FindBackEdges()) {
+    orderArchitectures_ = false;
+    ClearGraph();
+    status = BuildFileGraph(node, false);
+  }
   if (status == CitI::kOk && FindBackEdges()) status = RelaxAfterStrictCycles(node);
   return status == CitI::kOk ? EmitOrder(out) : status;
 }
@@ -112,6 +121,8 @@ CitI::Result CCompileOrder::CutRelaxedCycles() {
 void CCompileOrder::ClearGraph() {
   graph_.clear();
   vertices_.clear();
+  architectures_.clear();
+  architectureEdges_ = 0;
   backEdges_.clear();
   cycleFound_ = false;
 }
@@ -127,7 +138,39 @@ CitI::Result CCompileOrder::BuildFileGraph(IHdlNetListNode* node, bool relaxed) 
   });
   if (status != CitI::kOk) return status;
   ChainVerilogFiles();
+  if (orderArchitectures_) OrderArchitectureFiles();
   return status;
+}
+
+void CCompileOrder::NoteArchitecture(IHdlElement* element) {
+  auto* architecture = Prjrep::ImplementationCast<Arch>(element);
+  auto* record = Prjrep::ImplementationCast<CHdlElement>(element);
+  if (!architecture || !record) return;
+  Port::StringBase library;
+  record->GetLibraryName(&library);
+  library.Append(':');
+  library.Append(architecture->GetEntityName().view());
+  std::vector<IHdlElement*>& candidates = architectures_[library];
+  if (std::find(candidates.begin(), candidates.end(), element) == candidates.end()) candidates.push_back(element);
+}
+
+void CCompileOrder::OrderArchitectureFiles() {
+  for (const auto& [entity, candidates] : architectures_) {
+    if (candidates.size() < 2) continue;
+    IHdlElement* chosen = ArchitectureChoice::Default(candidates);
+    Prjrep::AutoPtr<IHdlFile> chosenFile;
+    chosen->GetSourceFile(chosenFile.Out());
+    auto last = vertices_.find(chosenFile.Get());
+    if (last == vertices_.end()) continue;
+    for (IHdlElement* other : candidates) {
+      Prjrep::AutoPtr<IHdlFile> file;
+      other->GetSourceFile(file.Out());
+      auto before = vertices_.find(file.Get());
+      if (before == vertices_.end() || before->second == last->second) continue;
+      AddEdge(last->second, before->second);
+      ++architectureEdges_;
+    }
+  }
 }
 
 void CCompileOrder::ChainVerilogFiles() {
@@ -146,6 +189,7 @@ void CCompileOrder::ChainVerilogFiles() {
 bool CCompileOrder::AddNodeDependencies(IHdlNetListNode* node, bool relaxed, CitI::Result& status) {
   Prjrep::AutoPtr<IHdlFile> file = NetListWalk::SourceFileOf(node);
   if (!file) return false;
+  NoteArchitecture(node->GetElement());
   Vertex user = 0;
   status = GetFileVertex(file.Get(), &user);
   if (status != CitI::kOk) return false;

@@ -12,6 +12,7 @@
 
 #include "CitI.h"
 #include "HdlSets.h"
+#include "Host/VhdlName.h"
 #include "IHdlFile.h"
 #include "IHdlNetListNode.h"
 #include "Port/StringBase.h"
@@ -115,10 +116,20 @@ class CCompileOrder {
   // Macros flow from file to file in the order the Verilog files were given, so that order is
   // kept; instances between Verilog files impose none.
   void ChainVerilogFiles();
+  // Notes an architecture met in the walk, grouped by library and entity.
+  void NoteArchitecture(IHdlElement* element);
+  // The file of the architecture bound by default comes after the files of the entity's other
+  // architectures, so that it is the one analysed last, as the hierarchy assumes.
+  void OrderArchitectureFiles();
   std::vector<std::int32_t> ComputeLevels(const std::vector<Vertex>& reverseTopological) const;
 
   Graph graph_;
   std::map<IHdlFile*, Vertex> vertices_;
+  // "library:entity" -> its architectures in the tree, each once.
+  std::map<Port::StringBase, std::vector<IHdlElement*>, Host::VhdlNameLess> architectures_;
+  // Cleared when the default architectures cannot come last without a cycle.
+  bool orderArchitectures_ = true;
+  std::size_t architectureEdges_ = 0;
   std::vector<BackEdge> backEdges_;
   bool cycleFound_ = false;
 };

@@ -1,5 +1,5 @@
 // The languages' own rules in resolution and order, end to end: VHDL names without letter case
-// (extended identifiers excepted) and Verilog files in the order given.
+// (extended identifiers excepted), Verilog files in the order given, the default architecture.
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -153,6 +153,95 @@ TEST(VerilogOrder, FilesKeepTheOrderGivenWhateverTheyInstantiate) {
   EXPECT_EQ(check.status, 0) << check.err;
   EXPECT_EQ(check.err, "");
   EXPECT_EQ(check.out, "3 files, 5 design units: 0 errors, 0 warnings\n");
+}
+
+// Entity leaf with architectures alpha (z_alpha.vhd) and zeta (a_zeta.vhd); top binds leaf once
+// by default and once by naming alpha.
+const std::pair<const char*, const char*> kLeafSources[] = {
+    {"leaf.vhd", "entity leaf is\nend entity;\n"},
+    {"z_alpha.vhd", "architecture alpha of leaf is\nbegin\nend architecture;\n"},
+    {"a_zeta.vhd", "architecture zeta of leaf is\nbegin\nend architecture;\n"},
+    {"top.vhd",
+     "entity top is\nend entity;\narchitecture rtl of top is\nbegin\n"
+     "  u_default : entity work.leaf port map (a => open);\n"
+     "  u_alpha : entity work.leaf(alpha) port map (a => open);\nend architecture;\n"},
+};
+
+std::string BoundTo(const Json& tree, const std::string& label) {
+  for (const Json& top : tree["root"]["children"]) {
+    for (const Json& child : top["children"]) {
+      if (child["instance"] == label) return child["name"].get<std::string>() + " -> " +
+                                             child["file"].get<std::string>().substr(
+                                                 child["file"].get<std::string>().rfind('/') + 1);
+    }
+  }
+  return "none";
+}
+
+TEST(DefaultArchitecture, TheOneAnalysedLastIsBoundAndOrderedLast) {
+  Sources src{kLeafSources[0], kLeafSources[1], kLeafSources[2], kLeafSources[3]};
+  struct Case {
+    std::vector<std::string> given;
+    std::string bound;
+    std::string before;
+    std::string after;
+  };
+  const Case cases[] = {
+      {{src("leaf.vhd"), src("z_alpha.vhd"), src("a_zeta.vhd"), src("top.vhd")},
+       "work:Architecture|leaf|zeta -> a_zeta.vhd", src("z_alpha.vhd"), src("a_zeta.vhd")},
+      {{src("top.vhd"), src("a_zeta.vhd"), src("z_alpha.vhd"), src("leaf.vhd")},
+       "work:Architecture|leaf|alpha -> z_alpha.vhd", src("a_zeta.vhd"), src("z_alpha.vhd")},
+  };
+  for (const Case& each : cases) {
+    Json tree = TreeOf(each.given);
+    EXPECT_EQ(BoundTo(tree, "u_default"), each.bound);
+    // Naming an architecture binds that one, whichever is the default.
+    EXPECT_EQ(BoundTo(tree, "u_alpha"), "work:Architecture|leaf|alpha -> z_alpha.vhd");
+
+    CliResult order = RunQuillon(With({"order"}, each.given));
+    EXPECT_EQ(order.status, 0) << order.err;
+    std::vector<std::string> files = Lines(order.out);
+    auto at = [&](const std::string& path) { return std::find(files.begin(), files.end(), path) - files.begin(); };
+    EXPECT_LT(at(each.before), at(each.after)) << order.out;
+    EXPECT_LT(at(each.after), at(src("top.vhd"))) << order.out;
+    EXPECT_EQ(order.err, "");
+  }
+
+  CliResult check = RunQuillon(With({"check"}, cases[0].given));
+  EXPECT_EQ(check.status, 0) << check.err;
+  EXPECT_EQ(check.err, "WARNING: ambiguous-architecture: entity leaf (library work) has 2 architectures: alpha (" +
+                           src("z_alpha.vhd") + ":1), zeta (" + src("a_zeta.vhd") +
+                           ":1); an instance that names none is bound to zeta, the one analysed last\n");
+}
+
+TEST(DefaultArchitecture, NoCycleIsMadeWhenTheDefaultCannotComeLast) {
+  // user.vhd holds an architecture of leaf and an instance bound to the default one, later.vhd:
+  // later.vhd cannot come after user.vhd, and the order stays valid without warnings.
+  Sources src{
+      kLeafSources[0],
+      {"user.vhd",
+       "architecture early of leaf is\nbegin\nend architecture;\nentity user is\nend entity;\n"
+       "architecture rtl of user is\nbegin\n  u_default : entity work.leaf port map (a => open);\n"
+       "end architecture;\n"},
+      {"later.vhd", "architecture late of leaf is\nbegin\nend architecture;\n"},
+  };
+  const std::vector<std::string> given{src("leaf.vhd"), src("user.vhd"), src("later.vhd")};
+  EXPECT_EQ(BoundTo(TreeOf(given), "u_default"), "work:Architecture|leaf|late -> later.vhd");
+  CliResult order = RunQuillon(With({"order"}, given));
+  EXPECT_EQ(order.status, 0) << order.err;
+  EXPECT_EQ(order.err, "");
+  EXPECT_EQ(Lines(order.out), (std::vector<std::string>{src("leaf.vhd"), src("later.vhd"), src("user.vhd")}));
+}
+
+TEST(DefaultArchitecture, WithinOneFileTheLastArchitectureIsBound) {
+  Sources src{
+      {"both.vhd",
+       "entity leaf is\nend entity;\narchitecture first of leaf is\nbegin\nend architecture;\n"
+       "architecture second of leaf is\nbegin\nend architecture;\n"},
+      kLeafSources[3],
+  };
+  Json tree = TreeOf({src("both.vhd"), src("top.vhd")});
+  EXPECT_EQ(BoundTo(tree, "u_default"), "work:Architecture|leaf|second -> both.vhd");
 }
 
 }  // namespace

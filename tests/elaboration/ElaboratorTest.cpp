@@ -169,25 +169,27 @@ TEST_F(Elaborator, GenericsAreNotRegistered) {
   EXPECT_EQ(RegisteredNames(), std::vector<std::string>{"Entity|e"});
 }
 
-TEST_F(Elaborator, OnlyTheFirstArchitectureOfAnEntityIsRegisteredForResolution) {
-  CitI::IInterface* first = Architecture("sub", "one");
-  CitI::IInterface* second = Architecture("sub", "two");
+TEST_F(Elaborator, EveryArchitectureIsRegisteredWithTheOneAnalysedLastFirst) {
+  // A file given earlier has the larger order key (work.vhd has 0), so it is analysed first.
+  Prjrep::AutoPtr<Vad::IHdlFile> early = NewFile(project_.Get(), "/src/early.vhd", "work", "PLUGIN_Vhdl", 5);
+  CitI::IInterface* two = Architecture("SUB", "two", early.Get());
+  CitI::IInterface* one = Architecture("sub", "one");
   CitI::IInterface* top = Architecture("top", "rtl");
   EntityInstance(top, "u_any", "work.sub", "");
   EntityInstance(top, "u_two", "sub", "two");
   EntityInstance(top, "u_one", "sub", "ONE");
-  ASSERT_EQ(Resolve({first, second, top}), CitI::kOk);
+  ASSERT_EQ(Resolve({two, one, top}), CitI::kOk);
 
-  auto* keys = elaborator_.FindRegisteredKey(tables_, "Architecture|sub", "work", true);
+  auto* keys = elaborator_.FindRegisteredKey(tables_, "Architecture|Sub", "work", true);
   ASSERT_NE(keys, nullptr);
-  EXPECT_EQ(*keys, std::vector<StringBase>{"work:Architecture|sub|one"});
-  // Without an architecture the first one is taken; naming the second leaves it unresolved.
+  EXPECT_EQ(*keys, (std::vector<StringBase>{"work:Architecture|sub|one", "work:Architecture|SUB|two"}));
+  // Without an architecture the default is taken; a named one resolves whatever its position.
   EXPECT_EQ(Depends("work:Architecture|top|rtl"),
-            (std::vector<std::string>{"work:Architecture|sub|one", "work:Architecture|sub|two",
+            (std::vector<std::string>{"work:Architecture|sub|one", "work:Architecture|SUB|two",
                                       "work:Architecture|sub|one", "work:Entity|top"}));
   EXPECT_EQ(Labels("work:Architecture|top|rtl"), (std::vector<std::string>{"u_any", "u_two", "u_one"}));
   EXPECT_EQ(Count("work:Architecture|sub|one"), 2);
-  EXPECT_EQ(Count("work:Architecture|sub|two"), 0);
+  EXPECT_EQ(Count("work:Architecture|SUB|two"), 1);
 }
 
 TEST_F(Elaborator, UseClausesFollowProjectPackagesOnly) {

@@ -1,0 +1,23 @@
+// The warning of `check` for an entity with several architectures: an instance that names none
+// is bound to the one analysed last, which the compile order places after the others.
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "DesignModel.h"
+
+namespace quillon {
+
+class ArchitectureCheck {
+ public:
+  static constexpr const char* kCode = "ambiguous-architecture";
+
+  // One text per entity (by library) with more than one architecture, naming each with its file
+  // and line and the one bound by default: its file comes last in `order`, within one file the
+  // one further down.
+  static std::vector<std::string> Warnings(const std::vector<FileInfo>& files,
+                                           const std::vector<OrderEntry>& order);
+};
+
+}  // namespace quillon
