@@ -102,10 +102,11 @@ TEST_F(VhdlParse, InstancesAreRecordedByHowTheyNameWhatTheyInstantiate) {
                     "  u4 : entity work.adder(fast) port map (a => b);\n"
                     "  \\u5\\ : \\odd_cell\\ port map (a => b);\n"
                     "end;\n"),
+              // Extended identifiers keep their backslashes: they never match a basic identifier.
               ElementsAre("|Architecture||rtl|top|| line 3 architecture uses []",
+                          "|ComponentInstantiation||top|rtl|\\u5\\|\\odd_cell\\| line 9 instance" + kArch,
                           "|ComponentInstantiation||top|rtl|u1|adder| line 5 instance" + kArch,
                           "|ComponentInstantiation||top|rtl|u2|adder| line 6 instance" + kArch,
-                          "|ComponentInstantiation||top|rtl|u5|odd_cell| line 9 instance" + kArch,
                           "|EntityInstantiation||top|rtl|u3|work.adder|| line 7 instance" + kArch,
                           "|EntityInstantiation||top|rtl|u4|work.adder||fast line 8 instance" + kArch,
                           "|Entity||top line 2 entity uses []"));
@@ -123,7 +124,7 @@ TEST_F(VhdlParse, KeywordsMatchInAnyCaseAndNamesMayStartWithDigitsOrAKeyword) {
       ElementsAre("|Architecture||RTL|Mixed_Case|| line 2 architecture uses []",
                   "|ComponentInstantiation||Mixed_Case|RTL|2nd_stage|Adder| line 4 instance" + kArch,
                   "|ComponentInstantiation||Mixed_Case|RTL|beginning|endpoint| line 5 instance" + kArch,
-                  "|Entity||Mixed_Case line 1 entity uses []"));
+                  "|Entity||\\Mixed_Case\\ line 1 entity uses []"));
 }
 
 TEST_F(VhdlParse, EntityPortFlagFollowsItsPortClause) {
