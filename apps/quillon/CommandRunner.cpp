@@ -30,6 +30,10 @@ namespace {
 constexpr CitI::Result kNoOrderForKind = 4;
 constexpr CitI::Result kNotInHierarchy = 5;
 
+constexpr const char* kCutOrder =
+    "no valid compile order exists: the files of the cycles listed above use each other, and the order "
+    "breaks those dependencies";
+
 std::string ResultText(CitI::Result result) {
   char text[32];
   if (result >= -1 && result <= 0xFFFF) {
@@ -184,6 +188,7 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
     result = reader.OrderOf(unit, options_.byUnit, order);
   }
   bool ordered = result == CitI::kOk;
+  if (ordered && log_->OrderWasCut()) log_->ReportError(kCutOrder);
   int status = Finished();
   if (result == kNoOrderForKind) {
     status = Failed("a compile order of a single unit is given for entities, architectures and modules only",
@@ -238,6 +243,7 @@ int CommandRunner::Check(ProjectReader& reader, std::size_t fileCount, std::ostr
   if (result == CitI::kOk) {
     for (const std::string& warning : ArchitectureCheck::Warnings(reader.Files(), order))
       log_->ReportWarning(warning);
+    if (log_->OrderWasCut()) log_->ReportError(kCutOrder);
   }
   int status = result == CitI::kOk ? Finished() : Failed("the compile order is not available", result);
   std::size_t units = reader.designUnits() ? reader.designUnits()->GetCount() : 0;

@@ -71,6 +71,12 @@ bool MessageLog::HasErrors() const {
   return getErrCount() + getIntCount() + getFatalCount() + getUserFatalCount() > 0;
 }
 
+void MessageLog::deliverMsg(const Port_MsgRecord& record) {
+  std::vector<Port_MsgRecord> ready;
+  cycles_.Take(record, ready);
+  for (const Port_MsgRecord& each : ready) Port_MsgManDefault::deliverMsg(each);
+}
+
 void MessageLog::onMessage(const Port_MsgRecord& record) {
   messages_.push_back(
       {SeverityOf(record.type), WithoutTrailingLineEnds(record.text), record.sourceFile, record.line});

@@ -6,6 +6,7 @@
 #include <string_view>
 #include <vector>
 
+#include "CycleListings.h"
 #include "DesignModel.h"
 #include "Port/MsgManData.h"
 #include "Port/MsgManDefault.h"
@@ -31,6 +32,12 @@ class MessageLog : public Port_MsgManDefault {
   // True once an error (or worse) arrived.
   bool HasErrors() const;
 
+  // True once the module cut file dependency cycles to give an order that is not valid.
+  bool OrderWasCut() const { return cycles_.OrderWasCut(); }
+
+  // A cycle listing that repeats one given before (the relaxed rule meeting the strict rule's
+  // cycle again) is dropped.
+  void deliverMsg(const Port_MsgRecord& record) override;
   void onMessage(const Port_MsgRecord& record) override;
   void writeMsgLines(MsgType type, const wchar_t* const* lines, int count) override;
   void writeMsgEnd(MsgType type) override;
@@ -42,6 +49,7 @@ class MessageLog : public Port_MsgManDefault {
   bool sinkInstalled_ = false;
   Port_MsgManData::DebugSink previousSink_;
   std::vector<MessageInfo> messages_;
+  CycleListings cycles_;
 };
 
 }  // namespace quillon

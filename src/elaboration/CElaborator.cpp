@@ -458,10 +458,10 @@ Port::StringBase CElaborator::InstanceTarget(CElabTables& tables, DbObject* chil
       component && child->GetType() == DbType::kComponentInstantiation) {
     label = component->GetLabel();
     const Port::StringBase& name = component->GetComponentName();
-    target = component->GetDesignUnitTypeId() == VerilogInstanceTypeId()
-                 ? ResolveModuleRef(tables, name, library)
-                 : ResolveEntityRef(tables, name, {}, library);
-    if (target.IsEmpty()) return Qualify(library, Formatted("Architecture|%s", name));
+    bool verilog = component->GetDesignUnitTypeId() == VerilogInstanceTypeId();
+    target = verilog ? ResolveModuleRef(tables, name, library) : ResolveEntityRef(tables, name, {}, library);
+    // A unit missing from the project is named by the kind its reference implies.
+    if (target.IsEmpty()) return Qualify(library, Formatted(verilog ? "Module|%s" : "Architecture|%s", name));
   } else if (auto* entity = dynamic_cast<EntityInst*>(child);
              entity && child->GetType() == DbType::kEntityInstantiation) {
     label = entity->GetLabel();

@@ -1,5 +1,6 @@
 // The languages' own rules in resolution and order, end to end: VHDL names without letter case
-// (extended identifiers excepted), Verilog files in the order given, the default architecture.
+// (extended identifiers excepted), Verilog files in the order given, the default architecture,
+// and orders that cannot be valid.
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -136,6 +137,12 @@ TEST(VhdlNames, ExtendedIdentifiersKeepTheirLetterCase) {
   EXPECT_EQ(RunQuillon(With({"order", "--top", "\\core\\"}, sources)).status, 2);
 }
 
+std::size_t Count(const std::string& text, const std::string& what) {
+  std::size_t count = 0;
+  for (std::size_t at = text.find(what); at != std::string::npos; at = text.find(what, at + 1)) ++count;
+  return count;
+}
+
 TEST(VerilogOrder, FilesKeepTheOrderGivenWhateverTheyInstantiate) {
   Sources src{
       // top.v defines what mid.v needs, and each instantiates a module of the other.
@@ -153,6 +160,13 @@ TEST(VerilogOrder, FilesKeepTheOrderGivenWhateverTheyInstantiate) {
   EXPECT_EQ(check.status, 0) << check.err;
   EXPECT_EQ(check.err, "");
   EXPECT_EQ(check.out, "3 files, 5 design units: 0 errors, 0 warnings\n");
+}
+
+TEST(VerilogOrder, ModuleMissingFromTheProjectIsLabelledAModule) {
+  Sources src{{"top.v", "module top;\n  lost u_lost();\nendmodule\n"}};
+  CliResult tree = RunQuillon({"tree", src("top.v")});
+  EXPECT_EQ(tree.status, 0) << tree.err;
+  EXPECT_NE(tree.out.find("  u_lost: lost [work:Module] (not in the project)\n"), std::string::npos) << tree.out;
 }
 
 // Entity leaf with architectures alpha (z_alpha.vhd) and zeta (a_zeta.vhd); top binds leaf once
@@ -242,6 +256,36 @@ TEST(DefaultArchitecture, WithinOneFileTheLastArchitectureIsBound) {
   };
   Json tree = TreeOf({src("both.vhd"), src("top.vhd")});
   EXPECT_EQ(BoundTo(tree, "u_default"), "work:Architecture|leaf|second -> both.vhd");
+}
+
+TEST(InvalidOrder, CutOrderIsPrintedButFailsAndCheckListsEachCycleOnce) {
+  // Each file's architecture uses the other file's package: no order of the two can be valid.
+  const std::string tangled = std::string(QUILLON_TEST_DATA_DIR) + "/order/tangled/";
+  const std::vector<std::string> sources{tangled + "x.vhd", tangled + "y.vhd"};
+  CliResult order = RunQuillon(With({"order"}, sources));
+  EXPECT_EQ(order.status, 1);
+  EXPECT_EQ(Lines(order.out).size(), 2u);
+  EXPECT_EQ(Count(order.err, "ERROR: "), 1u) << order.err;
+  EXPECT_NE(order.err.find("ERROR: no valid compile order exists"), std::string::npos) << order.err;
+
+  CliResult check = RunQuillon(With({"check"}, sources));
+  EXPECT_EQ(check.status, 1);
+  EXPECT_EQ(Count(check.err, "Found circular dependency consisting of the following files:"), 1u) << check.err;
+  EXPECT_EQ(Count(check.err, tangled + "x.vhd"), 1u) << check.err;
+
+  // A cycle that the relaxed rule resolves leaves a valid order.
+  Sources src{
+      {"f1.vhd", "entity a is\nend entity;\narchitecture rtl of a is\nbegin\n"
+                 "  u : entity work.b port map (x => open);\nend architecture;\n"},
+      {"f2.vhd", "entity b is\nend entity;\n"},
+      {"f3.vhd", "architecture rtl of b is\nbegin\n  u : entity work.a port map (x => open);\nend architecture;\n"},
+  };
+  CliResult valid = RunQuillon({"order", src("f1.vhd"), src("f2.vhd"), src("f3.vhd")});
+  EXPECT_EQ(valid.status, 0) << valid.err;
+  EXPECT_NE(valid.err.find("A valid compile order was produced using the relaxed file dependency."),
+            std::string::npos)
+      << valid.err;
+  EXPECT_EQ(Count(valid.err, "ERROR: "), 0u) << valid.err;
 }
 
 }  // namespace
