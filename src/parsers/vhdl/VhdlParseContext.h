@@ -71,6 +71,10 @@ class VhdlTextStore {
   std::string buffer_;
 };
 
+// The declaration whose end the grammar looks for: a context declaration holds only context
+// items, a configuration nests block and component configurations that each end with "end for".
+enum class VhdlDeclaration { kNone, kContext, kConfiguration };
+
 struct VhdlParseContext {
   VhdlParseContext(CParserConfigHolder& recorder, Port::Stream& source, bool synthesisTarget)
       : holder(recorder), input(source), synthesis(synthesisTarget) {}
@@ -96,6 +100,31 @@ struct VhdlParseContext {
   bool holdsName = false;
   VhdlText heldName{0, 0};
   VhdlTextStore texts;
+
+  // The last token scanned and the one before it, dropped ones included (0 before the first).
+  int lastToken = 0;
+  int tokenBeforeLast = 0;
+  // Open parentheses; a label inside them names an interface object, not an instance.
+  std::uint32_t parenDepth = 0;
+  // Between "record" and the next "end": element declarations look like instances.
+  bool inRecord = false;
+  // Between the two words "process" of a process statement: no instance can stand there.
+  bool inProcess = false;
+  // Set as a held name goes to the grammar before a colon: whether it stands where a concurrent
+  // statement begins (after ";", "begin", "generate" or "=>", outside parentheses, records and
+  // processes).
+  bool labelBeginsStatement = false;
+  bool heldNameBeginsStatement = false;
+  // The line of the package header being read.
+  std::uint32_t unitLine = 1;
+  VhdlDeclaration openDeclaration = VhdlDeclaration::kNone;
+  // Block and component configurations open inside the configuration.
+  std::uint32_t configurationDepth = 0;
+  std::string configuredEntity;
+  bool awaitsConfiguredArchitecture = false;
+  // The line of the "for" of the configuration item being read: a block configuration is reduced
+  // only after the token that follows it.
+  std::uint32_t forLine = 1;
 };
 
 // Runs the scanner and grammar over the context's input until the end of input, a parse-stack
