@@ -45,6 +45,7 @@ Json UnitObject(const UnitInfo& unit) {
   PutWhenSet(object, "library", unit.library);
   PutWhenSet(object, "package", unit.package);
   PutWhenSet(object, "item", unit.item);
+  if (unit.uses) object["uses"] = *unit.uses;
   return object;
 }
 
