@@ -63,8 +63,9 @@ TEST_F(VhdlDependencyOrder, PackageInstancesComeAfterTheirGenericPackageAndItsFo
             "end package;\n");
   AddSource("c_inst.vhd", "library ieee;\npackage fifo8 is new work.generic_fifo generic map (math => work.m8);\n");
   AddSource("d_user.vhd", "use work.fifo8.all;\nentity user is end;\n");
+  AddSource("e_m8.vhd", "package m8 is new work.generic_math generic map (W => 8);\n");
   Root();
-  EXPECT_EQ(ProjectOrder(), (Strings{"a_math.vhd", "b_fifo.vhd", "c_inst.vhd", "d_user.vhd"}));
+  EXPECT_EQ(ProjectOrder(), (Strings{"a_math.vhd", "e_m8.vhd", "b_fifo.vhd", "c_inst.vhd", "d_user.vhd"}));
 }
 
 TEST_F(VhdlDependencyOrder, ConfigurationsComeAfterWhatTheyConfigureAndBeforeTheirInstances) {

@@ -5,6 +5,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <initializer_list>
+#include <set>
 #include <string>
 #include <string_view>
 
@@ -122,10 +123,25 @@ struct VhdlParseContext {
   std::uint32_t configurationDepth = 0;
   std::string configuredEntity;
   bool awaitsConfiguredArchitecture = false;
+  // The generic map of a package instance: its actuals may name package instances, which the
+  // instance then uses. Read by the scanner, token by token, after the grammar saw the header.
+  enum class Actuals { kNone, kAwaitingMap, kReading };
+  Actuals actuals = Actuals::kNone;
+  std::uint32_t actualsDepth = 0;  // the parentheses open outside the map
+  bool readingActual = false;      // since "=>": a selected name so far
+  bool actualWantsName = false;
+  std::string actual;
+  // The libraries of this file's library clauses, in lower case: "lib.name" in a generic map
+  // names a unit only when lib is one of them or work.
+  std::set<std::string> libraries;
   // The line of the "for" of the configuration item being read: a block configuration is reduced
   // only after the token that follows it.
   std::uint32_t forLine = 1;
 };
+
+// Records the selected name of a generic map's actual as a use of the unit being declared when
+// it names a unit of a library (see VhdlParseContext::libraries).
+void RecordGenericActual(VhdlParseContext& context, std::string_view name);
 
 // Runs the scanner and grammar over the context's input until the end of input, a parse-stack
 // overflow, or memory running out. False only in that last case. What was recorded before stays

@@ -24,6 +24,8 @@ const bool* VhdlTokensBeginningConstructs();
 
 %code {
 #include <array>
+#include <cctype>
+#include <string>
 
 #include "CParserConfigHolder.h"
 #include "VhdlParser.h"
@@ -48,6 +50,17 @@ void RecordArchitecture(VhdlParseContext& ctx, VhdlText archName, VhdlText entit
   ctx.inProcess = false;
   ctx.inRecord = false;
   ctx.holder.AddArch(StringOf(ctx, archName), StringOf(ctx, entityName), ctx.line, TypeIds::Architecture());
+}
+
+std::string Lower(std::string_view text) {
+  std::string lower(text);
+  for (char& c : lower) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+  return lower;
+}
+
+void RecordLibrary(VhdlParseContext& ctx, VhdlText name) {
+  ctx.libraries.insert(Lower(TextOf(ctx, name)));
+  ctx.holder.AddLibrary(StringOf(ctx, name), ctx.line, TypeIds::Library());
 }
 
 void RecordEntity(VhdlParseContext& ctx, VhdlText name, bool portFlag) {
@@ -127,6 +140,7 @@ void RecordPackage(VhdlParseContext& ctx, VhdlText name) {
 // an entity, architecture or configuration is declared there: both are uses of the unit around
 // them. Any other is a library unit of its own.
 void RecordPackageInstance(VhdlParseContext& ctx, VhdlText name, VhdlText genericPackage) {
+  ctx.actuals = VhdlParseContext::Actuals::kAwaitingMap;
   if (ctx.parenDepth > 0 || ctx.holder.HasCurrentUnit()) {
     ctx.holder.AddUnitUse(StringOf(ctx, genericPackage), ctx.line, TypeIds::Use());
     return;
@@ -236,10 +250,8 @@ library
 
 /* Right recursive: a list is recorded from its last name back to its first. */
 lib_ident
-  : ident
-      { ctx.holder.AddLibrary(StringOf(ctx, $1), ctx.line, TypeIds::Library()); }
-  | ident COMMA lib_ident
-      { ctx.holder.AddLibrary(StringOf(ctx, $1), ctx.line, TypeIds::Library()); }
+  : ident { RecordLibrary(ctx, $1); }
+  | ident COMMA lib_ident { RecordLibrary(ctx, $1); }
   ;
 
 arch
@@ -391,6 +403,14 @@ std::array<bool, YYMAXUTOK + 1> TokensBeginningConstructs() {
 }
 
 }  // namespace
+
+void RecordGenericActual(VhdlParseContext& context, std::string_view name) {
+  std::size_t dot = name.find('.');
+  if (dot == std::string_view::npos) return;
+  std::string library = Lower(name.substr(0, dot));
+  if (library != "work" && !context.libraries.contains(library)) return;
+  context.holder.AddUnitUse(Port::StringBase(name), context.line, TypeIds::Use());
+}
 
 const bool* VhdlTokensBeginningConstructs() {
   static const std::array<bool, YYMAXUTOK + 1> begins = TokensBeginningConstructs();

@@ -113,6 +113,17 @@ TEST_F(VhdlParse, PackageInstancesAndFormalPackagesUseTheirGenericPackage) {
                           "||Use|work|generic_fifo|| line 2 use", "||Use|work|generic_math|| line 6 use"));
 }
 
+TEST_F(VhdlParse, GenericMapActualsNamingUnitsOfKnownLibrariesAreUsesOfThePackageInstance) {
+  EXPECT_THAT(Parse("library shapes;\n"
+                    "package fifo8 is new work.generic_fifo\n"
+                    "  generic map (DEPTH => 8, math => work.math8, rec => r.field,\n"
+                    "               sizes => shapes.sizes_pkg.WIDE, W => f(work.k), z => ieee.c);\n"),
+              ElementsAre("|PackageDecl||fifo8| line 2 package uses [||Use|work|generic_fifo|| "
+                          "||Use|work|math8|| ||Use|shapes|sizes_pkg|WIDE|]",
+                          "||Library|shapes| line 1 library", "||Use|shapes|sizes_pkg|WIDE| line 4 use",
+                          "||Use|work|generic_fifo|| line 2 use", "||Use|work|math8|| line 3 use"));
+}
+
 TEST_F(VhdlParse, ConfigurationDependsOnTheArchitectureAndBindingsItConfigures) {
   const std::string kCfg = " parent |PackageDecl||top_cfg|";
   EXPECT_THAT(Parse("use work.cfg_pkg.all;\n"
