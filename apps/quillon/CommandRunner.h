@@ -7,7 +7,6 @@
 #include <vector>
 
 #include "Diagnostic.h"
-
 #include "MessageLog.h"
 #include "Options.h"
 #include "ProjectReader.h"

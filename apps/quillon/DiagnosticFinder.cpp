@@ -1,8 +1,8 @@
 #include "DiagnosticFinder.h"
 
+#include <algorithm>
 #include <boost/graph/adjacency_list.hpp>
 #include <boost/graph/strong_components.hpp>
-#include <algorithm>
 #include <cctype>
 #include <map>
 #include <utility>
@@ -13,8 +13,8 @@ namespace {
 
 // Libraries that every project may name without having them: the standard libraries and the
 // maker's cell libraries, which the module does not track either.
-const std::set<std::string> kLibrariesWithoutUnits = {"ieee", "std", "basecell", "timecell", "blockcell",
-                                                      "corvanecorelib"};
+const std::set<std::string> kLibrariesWithoutUnits = {"ieee",     "std",       "basecell",
+                                                      "timecell", "blockcell", "corvanecorelib"};
 
 std::string Lower(std::string text) {
   std::transform(text.begin(), text.end(), text.begin(),
@@ -51,8 +51,9 @@ class UnitIndex {
   explicit UnitIndex(const std::vector<FileInfo>& files) {
     for (const FileInfo& file : files) {
       for (const UnitInfo& unit : file.units) {
-        if (IsPrimaryOrSecondaryUnit(unit.type))
-          units_.emplace(Key(file.library, unit.key), Place{file.path, unit.line});
+        if (!IsPrimaryOrSecondaryUnit(unit.type)) continue;
+        units_.insert(Key(file.library, unit.key));
+        anyLibrary_.insert(Lower(unit.key));
       }
     }
   }
@@ -61,13 +62,7 @@ class UnitIndex {
     return units_.count(Key(library, key)) != 0;
   }
   // In any library: a component binds to an entity or module wherever the project has it.
-  bool HasAnywhere(const std::string& key) const {
-    const std::string wanted = Lower(key);
-    for (const auto& [unitKey, place] : units_) {
-      if (unitKey.second == wanted) return true;
-    }
-    return false;
-  }
+  bool HasAnywhere(const std::string& key) const { return anyLibrary_.count(Lower(key)) != 0; }
   bool HasInstantiable(const std::string& library, const std::string& name) const {
     return Has(library, "Entity|" + name) || Has(library, "Module|" + name) ||
            Has(library, "PackageDecl|" + name);
@@ -78,8 +73,19 @@ class UnitIndex {
     return {Lower(library), Lower(key)};
   }
 
-  std::multimap<std::pair<std::string, std::string>, Place> units_;
+  std::set<std::pair<std::string, std::string>> units_;
+  std::set<std::string> anyLibrary_;
 };
+
+// "work:Architecture|and2|" -> "and2", as the module reads a missing node's unit name.
+std::string CellNameOf(const std::string& unit) {
+  std::size_t colon = unit.rfind(':');
+  std::string name = colon == std::string::npos ? unit : unit.substr(colon + 1);
+  const std::string prefix = "Architecture|";
+  if (name.compare(0, prefix.size(), prefix) == 0) name.erase(0, prefix.size());
+  name.erase(std::remove(name.begin(), name.end(), '|'), name.end());
+  return Lower(name);
+}
 
 // The unit names of the tree's library-cell nodes, in lower case.
 std::set<std::string> LibraryCells(const TreeNodeInfo* root) {
@@ -89,10 +95,7 @@ std::set<std::string> LibraryCells(const TreeNodeInfo* root) {
   while (!stack.empty()) {
     const TreeNodeInfo* node = stack.back();
     stack.pop_back();
-    if (node->libraryCell) {
-      std::string name = node->unit.substr(node->unit.rfind(':') == std::string::npos ? 0 : node->unit.rfind(':') + 1);
-      cells.insert(Lower(name.substr(name.rfind('|') == std::string::npos ? 0 : name.rfind('|') + 1)));
-    }
+    if (node->libraryCell) cells.insert(CellNameOf(node->unit));
     for (const TreeNodeInfo& child : node->children) stack.push_back(&child);
   }
   return cells;
@@ -123,8 +126,8 @@ class FileChecker {
       if (unit.type != "Library" && unit.type != "Use") hasUnits = true;
     }
     if (!hasUnits && IsHdlPlugin(file.plugin))
-      Report(Diagnostic::Severity::kError, DiagnosticCode::kEmptySource, "no design unit was found in " + file.path,
-             0);
+      Report(Diagnostic::Severity::kError, DiagnosticCode::kEmptySource,
+             "no design unit was found in " + file.path, 0);
   }
 
  private:
@@ -156,7 +159,8 @@ class FileChecker {
     if (package.empty() || Lower(package) == "all") return;
     if (!units_.Has(Resolved(library), "PackageDecl|" + package))
       Report(Diagnostic::Severity::kError, DiagnosticCode::kUnresolvedPackage,
-             "package '" + package + "' of a use clause is not in library '" + Resolved(library) + "'", use.line);
+             "package '" + package + "' of a use clause is not in library '" + Resolved(library) + "'",
+             use.line);
   }
 
   void CheckEntityInstance(const UnitInfo& instance) {
@@ -182,10 +186,11 @@ class FileChecker {
     if (units_.HasAnywhere("Entity|" + component) || units_.HasAnywhere("Module|" + component) ||
         cells_.count(Lower(component)) != 0)
       return;
-    Report(settings_.strict ? Diagnostic::Severity::kError : Diagnostic::Severity::kWarning,
-           DiagnosticCode::kBlackBox,
-           "instance '" + instance.name + "': the project has no unit '" + component + "', it stays a black box",
-           instance.line);
+    Report(
+        settings_.strict ? Diagnostic::Severity::kError : Diagnostic::Severity::kWarning,
+        DiagnosticCode::kBlackBox,
+        "instance '" + instance.name + "': the project has no unit '" + component + "', it stays a black box",
+        instance.line);
   }
 
   void Report(Diagnostic::Severity severity, const char* code, std::string text, std::uint32_t line) {
@@ -211,8 +216,8 @@ void FindDuplicates(const std::vector<FileInfo>& files, std::vector<Diagnostic>&
       auto [found, inserted] = first.emplace(std::make_pair(Lower(file.library), key), place);
       if (inserted) continue;
       out.push_back({Diagnostic::Severity::kError, DiagnosticCode::kDuplicateUnit,
-                     unit.key + " of library '" + file.library + "' is defined twice: at " + Where(found->second) +
-                         " and at " + Where(place),
+                     unit.key + " of library '" + file.library + "' is defined twice: at " +
+                         Where(found->second) + " and at " + Where(place),
                      file.path, unit.line});
     }
   }
@@ -220,7 +225,8 @@ void FindDuplicates(const std::vector<FileInfo>& files, std::vector<Diagnostic>&
 
 // Files that use each other through entities and packages: the cycles that the module's relaxed
 // rule keeps, so that no order can put every file after what it uses.
-void FindCycles(const TreeNodeInfo& root, const std::vector<OrderEntry>& order, std::vector<Diagnostic>& out) {
+void FindCycles(const TreeNodeInfo& root, const std::vector<OrderEntry>& order,
+                std::vector<Diagnostic>& out) {
   std::map<std::string, std::size_t> index;
   std::vector<std::string> paths;
   for (const OrderEntry& entry : order) {

@@ -20,7 +20,8 @@ std::vector<Diagnostic> DiagnosticReport::AsWarnings(std::vector<Diagnostic> dia
   return diagnostics;
 }
 
-std::size_t DiagnosticReport::Count(const std::vector<Diagnostic>& diagnostics, Diagnostic::Severity severity) {
+std::size_t DiagnosticReport::Count(const std::vector<Diagnostic>& diagnostics,
+                                    Diagnostic::Severity severity) {
   return static_cast<std::size_t>(std::count_if(diagnostics.begin(), diagnostics.end(),
                                                 [&](const Diagnostic& d) { return d.severity == severity; }));
 }

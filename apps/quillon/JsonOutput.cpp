@@ -118,7 +118,9 @@ void JsonOutput::Order(const std::vector<OrderEntry>* order, const std::vector<M
       list.push_back({{"path", entry.path}, {"library", entry.library}, {"plugin", entry.plugin}});
     }
   }
-  Write({{"order", std::move(list)}, {"messages", MessageList(messages)}, {"diagnostics", DiagnosticList(diagnostics)}},
+  Write({{"order", std::move(list)},
+         {"messages", MessageList(messages)},
+         {"diagnostics", DiagnosticList(diagnostics)}},
         out);
 }
 

@@ -263,8 +263,9 @@ PackageDecl* CParserConfigHolder::AddConfigurationDecl(const Port::StringBase& n
 }
 
 PackageDecl* CParserConfigHolder::AddPackageInstance(const Port::StringBase& name,
-                                                     const Port::StringBase& genericPackage, std::uint32_t line,
-                                                     const Port::XUID& packageType, const Port::XUID& useType) {
+                                                     const Port::StringBase& genericPackage,
+                                                     std::uint32_t line, const Port::XUID& packageType,
+                                                     const Port::XUID& useType) {
   PackageDecl* package = AddPackageDecl(name, line, packageType);
   if (package) AddUnitUse(genericPackage, line, useType);
   return package;

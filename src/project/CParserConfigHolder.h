@@ -102,7 +102,8 @@ class CParserConfigHolder final : public CitI::IInterface {
   PackageDecl* AddContextDecl(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
   PackageDecl* AddConfigurationDecl(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
   PackageDecl* AddPackageInstance(const Port::StringBase& name, const Port::StringBase& genericPackage,
-                                  std::uint32_t line, const Port::XUID& packageType, const Port::XUID& useType);
+                                  std::uint32_t line, const Port::XUID& packageType,
+                                  const Port::XUID& useType);
   // A use of a package that the unit recorded last needs whatever the begin flag says: a formal
   // package of its generic clause or a package instantiated inside it. Pending without a unit.
   Use* AddUnitUse(const Port::StringBase& dottedName, std::uint32_t line, const Port::XUID& type);

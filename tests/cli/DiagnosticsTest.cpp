@@ -75,6 +75,11 @@ TEST(Diagnostics, EntityInstanceMissingFromItsLibraryIsAnErrorWithFileAndLine) {
                                           {"file", top},
                                           {"line", 4}}));
 
+  Checked tree = RunJson("tree", broken);
+  EXPECT_EQ(tree.status, 0);
+  ASSERT_EQ(CodesOf(tree.diagnostics), std::vector<std::string>{"unresolved-instance"});
+  EXPECT_EQ(tree.diagnostics[0]["severity"], "warning");
+
   broken.Add("sub.vhd", kSub);
   Checked twin = RunJson("check", broken);
   EXPECT_EQ(twin.status, 0) << twin.diagnostics.dump(2);
@@ -100,7 +105,8 @@ TEST(Diagnostics, LibraryTheProjectDoesNotHaveIsAnErrorUnlessExternal) {
   broken.Add("user.vhd", "library common;\nuse common.pkg.all;\nentity user is end;\n");
   Checked checked = RunJson("check", broken);
   EXPECT_EQ(checked.status, 1);
-  EXPECT_EQ(CodesOf(checked.diagnostics), std::vector<std::string>{"unknown-library"}) << "reported once a file";
+  EXPECT_EQ(CodesOf(checked.diagnostics), std::vector<std::string>{"unknown-library"})
+      << "reported once a file";
   EXPECT_EQ(checked.diagnostics[0]["line"], 1);
 
   Checked external = RunJson("check", broken, {"--external-library", "Common"});
@@ -153,6 +159,32 @@ TEST(Diagnostics, PackagesThatUseEachOtherLeaveNoValidOrder) {
   EXPECT_EQ(RunJson("check", twin).status, 0);
 }
 
+TEST(Diagnostics, ACycleListingIsPrintedOnceWithoutEmptyLines) {
+  Project cyclic;
+  std::string a = cyclic.Add("a.vhd", "use work.pkg_b.all;\npackage pkg_a is end;\n");
+  std::string b = cyclic.Add("b.vhd", "use work.pkg_a.all;\npackage pkg_b is end;\n");
+  CliResult result = RunQuillon({"order", a, b});
+  EXPECT_EQ(result.status, 0);
+  std::vector<std::string> lines = Lines(result.err);
+  auto count = [&](const std::string& wanted) {
+    std::size_t n = 0;
+    for (const std::string& line : lines) n += line == wanted;
+    return n;
+  };
+  EXPECT_EQ(count("WARNING: Found circular dependency consisting of the following files:"), 1u) << result.err;
+  EXPECT_EQ(count("WARNING:           " + a), 1u) << result.err;
+  EXPECT_EQ(count("WARNING: "), 0u) << result.err;
+  EXPECT_EQ(count("WARNING: Breaking file dependency loop(s) to create a compile order."), 1u) << result.err;
+
+  // The JSON answer keeps every message of the module as it was issued.
+  CliResult json = RunQuillon({"-q", "--format", "json", "order", a, b});
+  Json answer = Json::parse(json.out, nullptr, false);
+  std::size_t listings = 0;
+  for (const Json& message : answer["messages"])
+    listings += message["text"] == "Found circular dependency consisting of the following files:";
+  EXPECT_EQ(listings, 2u);
+}
+
 TEST(Diagnostics, SourceInWhichNothingWasFoundIsAnError) {
   Project broken;
   std::string notes = broken.Add("notes.vhd", "These are my notes, not VHDL.\n");
@@ -180,6 +212,9 @@ TEST(Diagnostics, ComponentWithoutAnEntityIsABlackBoxWarningAndAnErrorWhenStrict
   EXPECT_EQ(RunJson("check", broken, {"--warnings-as-errors"}).status, 1);
 
   broken.Add("core.vhd", "entity core is end;\n");
+  broken.Add("cells.vhd",
+             "library basecell;\nuse basecell.vcomponents.all;\nentity tie is end;\n"
+             "architecture rtl of tie is\nbegin\n  u : QL_TIEHI port map (o => x);\nend;\n");
   Checked twin = RunJson("check", broken, {"--strict", "--warnings-as-errors"});
   EXPECT_EQ(twin.status, 0) << twin.diagnostics.dump(2);
   EXPECT_TRUE(twin.diagnostics.empty());

@@ -40,8 +40,10 @@ TEST_F(VhdlDependencyOrder, MaplessInstancesPutTheInstantiatedFileFirst) {
     SCOPED_TRACE(std::string(instance));
     project_ = Prjrep::CreateInstanceAs<Vad::IHdlProject>(Vad::ClassIds::CHdlProject());
     AddSource("sub.vhd", kSub);
-    AddSource("top.vhd", "entity top is end;\narchitecture rtl of top is\n"
-                         "  component sub end component;\nbegin\n  " + std::string(instance) + "\nend;\n");
+    AddSource("top.vhd",
+              "entity top is end;\narchitecture rtl of top is\n"
+              "  component sub end component;\nbegin\n  " +
+                  std::string(instance) + "\nend;\n");
     Root();
     EXPECT_EQ(ProjectOrder(), (Strings{"sub.vhd", "top.vhd"}));
   }
@@ -61,7 +63,8 @@ TEST_F(VhdlDependencyOrder, PackageInstancesComeAfterTheirGenericPackageAndItsFo
             "package generic_fifo is\n"
             "  generic (package math is new work.generic_math generic map (<>));\n"
             "end package;\n");
-  AddSource("c_inst.vhd", "library ieee;\npackage fifo8 is new work.generic_fifo generic map (math => work.m8);\n");
+  AddSource("c_inst.vhd",
+            "library ieee;\npackage fifo8 is new work.generic_fifo generic map (math => work.m8);\n");
   AddSource("d_user.vhd", "use work.fifo8.all;\nentity user is end;\n");
   AddSource("e_m8.vhd", "package m8 is new work.generic_math generic map (W => 8);\n");
   Root();
@@ -76,8 +79,9 @@ TEST_F(VhdlDependencyOrder, ConfigurationsComeAfterWhatTheyConfigureAndBeforeThe
             "end configuration;\n");
   AddSource("b_sub_rtl.vhd", "architecture rtl of sub is begin end;\n");
   AddSource("c_sub.vhd", "entity sub is end;\n");
-  AddSource("d_top.vhd",
-            "entity top is end;\narchitecture rtl of top is\nbegin\n  u : configuration work.sub_cfg;\nend;\n");
+  AddSource(
+      "d_top.vhd",
+      "entity top is end;\narchitecture rtl of top is\nbegin\n  u : configuration work.sub_cfg;\nend;\n");
   Root();
   EXPECT_EQ(ProjectOrder(), (Strings{"c_sub.vhd", "b_sub_rtl.vhd", "a_cfg.vhd", "d_top.vhd"}));
 }
