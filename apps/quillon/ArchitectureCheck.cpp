@@ -22,23 +22,27 @@ bool AnalysedAfter(const Candidate& a, const Candidate& b) {
   return a.line > b.line;
 }
 
-// The candidates in the order they are analysed, so the one bound by default comes last.
-std::string Describe(const std::string& entity, const std::string& library, std::vector<Candidate> candidates) {
+// The candidates in the order they are analysed, so the one bound by default comes last; the
+// diagnostic stands at that one.
+Diagnostic Describe(const std::string& entity, const std::string& library, std::vector<Candidate> candidates) {
   std::stable_sort(candidates.begin(), candidates.end(),
                    [](const Candidate& a, const Candidate& b) { return AnalysedAfter(b, a); });
-  std::string text = std::string(ArchitectureCheck::kCode) + ": entity " + entity + " (library " + library +
-                     ") has " + std::to_string(candidates.size()) + " architectures:";
+  std::string text = "entity " + entity + " (library " + library + ") has " + std::to_string(candidates.size()) +
+                     " architectures:";
   for (const Candidate& candidate : candidates) {
     text += (&candidate == &candidates.front() ? " " : ", ") + candidate.name + " (" + candidate.path + ":" +
             std::to_string(candidate.line) + ")";
   }
-  return text + "; an instance that names none is bound to " + candidates.back().name + ", the one analysed last";
+  const Candidate& chosen = candidates.back();
+  text += "; an instance that names none is bound to " + chosen.name + ", the one analysed last";
+  return {Diagnostic::Severity::kWarning, DiagnosticCode::kAmbiguousArchitecture, std::move(text), chosen.path,
+          chosen.line};
 }
 
 }  // namespace
 
-std::vector<std::string> ArchitectureCheck::Warnings(const std::vector<FileInfo>& files,
-                                                     const std::vector<OrderEntry>& order) {
+std::vector<Diagnostic> ArchitectureCheck::Find(const std::vector<FileInfo>& files,
+                                                const std::vector<OrderEntry>& order) {
   std::map<std::string, std::size_t> position;
   for (std::size_t i = 0; i < order.size(); ++i) position.emplace(order[i].path, i);
 
@@ -58,11 +62,11 @@ std::vector<std::string> ArchitectureCheck::Warnings(const std::vector<FileInfo>
           {*unit.architecture, file.path, unit.line, placed == position.end() ? 0 : placed->second});
     }
   }
-  std::vector<std::string> warnings;
+  std::vector<Diagnostic> diagnostics;
   for (const auto& [key, entity] : entities) {
-    if (entity.candidates.size() > 1) warnings.push_back(Describe(entity.name, entity.library, entity.candidates));
+    if (entity.candidates.size() > 1) diagnostics.push_back(Describe(entity.name, entity.library, entity.candidates));
   }
-  return warnings;
+  return diagnostics;
 }
 
 }  // namespace quillon

@@ -1,5 +1,7 @@
 #include "CommandRunner.h"
 
+#include <algorithm>
+#include <cctype>
 #include <cinttypes>
 #include <cstdio>
 #include <fstream>
@@ -7,6 +9,8 @@
 #include <optional>
 
 #include "ArchitectureCheck.h"
+#include "DiagnosticFinder.h"
+#include "DiagnosticReport.h"
 #include "DotOutput.h"
 #include "ExitStatus.h"
 #include "FileGraph.h"
@@ -33,6 +37,10 @@ constexpr CitI::Result kNotInHierarchy = 5;
 constexpr const char* kCutOrder =
     "no valid compile order exists: the files of the cycles listed above use each other, and the order "
     "breaks those dependencies";
+
+bool HasCode(const std::vector<Diagnostic>& diagnostics, std::string_view code) {
+  return std::any_of(diagnostics.begin(), diagnostics.end(), [&](const Diagnostic& d) { return d.code == code; });
+}
 
 std::string ResultText(CitI::Result result) {
   char text[32];
@@ -91,6 +99,9 @@ int CommandRunner::RunOnProject() {
   ProjectSources sources;
   std::string error;
   if (!ProjectLoader(sources).Load(options_, error)) return BadInput(error);
+  externalLibraries_ = sources.externalLibraries;
+  externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
+                            options_.externalLibraries.end());
 
   std::ofstream file;
   if (!options_.outputPath.empty()) {
@@ -139,13 +150,13 @@ int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount,
     case Command::kUnits:
       return Units(reader, out);
     case Command::kTree:
-      return Tree(project, out);
+      return Tree(reader, project, out);
     case Command::kOrder:
       return Order(reader, project, out);
     case Command::kPorts:
       return Ports(reader, out);
     case Command::kCheck:
-      return Check(reader, fileCount, out);
+      return Check(reader, project, fileCount, out);
     case Command::kFactories:
       break;
   }
@@ -162,13 +173,16 @@ int CommandRunner::Units(ProjectReader& reader, std::ostream& out) {
   return Finished();
 }
 
-int CommandRunner::Tree(Vad::IHdlProject* project, std::ostream& out) {
+int CommandRunner::Tree(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out) {
   TreeNodeInfo root;
   CitI::Result result = TreeReader::Read(project, root);
   int status = result == CitI::kOk ? Finished() : Failed("the design hierarchy is not available", result);
   bool built = result == CitI::kOk;
+  // The order is not asked for: its cycle messages belong to the order command.
+  std::vector<Diagnostic> diagnostics = DiagnosticReport::AsWarnings(Diagnose(reader, project, nullptr));
+  ShowDiagnostics(diagnostics);
   if (options_.format == Format::kJson) {
-    JsonOutput::Tree(built ? &root : nullptr, log_->messages(), out);
+    JsonOutput::Tree(built ? &root : nullptr, log_->messages(), out, diagnostics);
   } else if (built && options_.format == Format::kDot) {
     DotOutput::Tree(root, out);
   } else if (built) {
@@ -199,8 +213,11 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
     status = Failed("the compile order is not available", result);
   }
 
+  std::vector<Diagnostic> diagnostics =
+      DiagnosticReport::AsWarnings(Diagnose(reader, project, ordered ? &order : nullptr));
+  ShowDiagnostics(diagnostics);
   if (options_.format == Format::kJson) {
-    JsonOutput::Order(ordered ? &order : nullptr, log_->messages(), out);
+    JsonOutput::Order(ordered ? &order : nullptr, log_->messages(), out, diagnostics);
   } else if (ordered && options_.format == Format::kDot) {
     TreeNodeInfo root;
     TreeReader::Read(project, root);
@@ -237,22 +254,51 @@ int CommandRunner::Ports(ProjectReader& reader, std::ostream& out) {
   return status;
 }
 
-int CommandRunner::Check(ProjectReader& reader, std::size_t fileCount, std::ostream& out) {
+// A design with any error diagnostic fails, and with --warnings-as-errors one with any warning.
+int CommandRunner::Check(ProjectReader& reader, Vad::IHdlProject* project, std::size_t fileCount,
+                         std::ostream& out) {
   std::vector<OrderEntry> order;
   CitI::Result result = reader.Order(order);
-  if (result == CitI::kOk) {
-    for (const std::string& warning : ArchitectureCheck::Warnings(reader.Files(), order))
-      log_->ReportWarning(warning);
-    if (log_->OrderWasCut()) log_->ReportError(kCutOrder);
-  }
   int status = result == CitI::kOk ? Finished() : Failed("the compile order is not available", result);
+  std::vector<Diagnostic> diagnostics = Diagnose(reader, project, result == CitI::kOk ? &order : nullptr);
+  if (result == CitI::kOk) {
+    for (Diagnostic& ambiguous : ArchitectureCheck::Find(reader.Files(), order))
+      diagnostics.push_back(std::move(ambiguous));
+    if (log_->OrderWasCut() && !HasCode(diagnostics, DiagnosticCode::kNoValidOrder))
+      diagnostics.push_back({Diagnostic::Severity::kError, DiagnosticCode::kNoValidOrder, kCutOrder, "", 0});
+  }
+  ShowDiagnostics(diagnostics);
+  std::size_t errors = DiagnosticReport::Count(diagnostics, Diagnostic::Severity::kError);
+  std::size_t warnings = DiagnosticReport::Count(diagnostics, Diagnostic::Severity::kWarning);
+  if (errors > 0 || (options_.warningsAsErrors && (warnings > 0 || log_->getWarnCount() > 0)))
+    status = kExitFailed;
   std::size_t units = reader.designUnits() ? reader.designUnits()->GetCount() : 0;
   if (options_.format == Format::kJson) {
-    JsonOutput::Check(fileCount, units, log_->messages(), out);
+    JsonOutput::Check(fileCount, units, log_->messages(), diagnostics, out);
   } else {
-    TextOutput::CheckSummary(fileCount, units, log_->getErrCount(), log_->getWarnCount(), out);
+    TextOutput::CheckSummary(fileCount, units, log_->getErrCount() + static_cast<int>(errors),
+                             log_->getWarnCount() + static_cast<int>(warnings), out);
   }
   return status;
+}
+
+std::vector<Diagnostic> CommandRunner::Diagnose(ProjectReader& reader, Vad::IHdlProject* project,
+                                                const std::vector<OrderEntry>* order) const {
+  DiagnosticFinder::Settings settings;
+  for (const std::string& library : externalLibraries_) {
+    std::string lower = library;
+    for (char& c : lower) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+    settings.externalLibraries.insert(lower);
+  }
+  settings.strict = options_.strict;
+  TreeNodeInfo root;
+  bool built = TreeReader::Read(project, root) == CitI::kOk;
+  return DiagnosticFinder(std::move(settings)).Find(reader.Files(), built ? &root : nullptr, order);
+}
+
+void CommandRunner::ShowDiagnostics(const std::vector<Diagnostic>& diagnostics) const {
+  log_->FlushListing();
+  if (!options_.quiet) DiagnosticReport::Write(diagnostics, std::cerr);
 }
 
 }  // namespace quillon

@@ -4,7 +4,9 @@
 
 #include <ostream>
 #include <string>
+#include <vector>
 
+#include "Diagnostic.h"
 #include "MessageLog.h"
 #include "Options.h"
 #include "ProjectReader.h"
@@ -24,10 +26,16 @@ class CommandRunner {
   int RunCommand(Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out);
   int ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount, Progress& progress, std::ostream& out);
   int Units(ProjectReader& reader, std::ostream& out);
-  int Tree(Vad::IHdlProject* project, std::ostream& out);
+  int Tree(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out);
   int Order(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out);
   int Ports(ProjectReader& reader, std::ostream& out);
-  int Check(ProjectReader& reader, std::size_t fileCount, std::ostream& out);
+  int Check(ProjectReader& reader, Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out);
+
+  // quillon's own findings about the design; `order` may be null.
+  std::vector<Diagnostic> Diagnose(ProjectReader& reader, Vad::IHdlProject* project,
+                                   const std::vector<OrderEntry>* order) const;
+  // Writes the diagnostics to standard error unless quiet.
+  void ShowDiagnostics(const std::vector<Diagnostic>& diagnostics) const;
 
   // Reports the module's failure of `what` and returns kExitFailed.
   int Failed(const std::string& what, CitI::Result result);
@@ -38,6 +46,8 @@ class CommandRunner {
 
   const Options& options_;
   MessageLog* log_ = nullptr;
+  // From the command line and the project file.
+  std::vector<std::string> externalLibraries_;
 };
 
 }  // namespace quillon

@@ -35,6 +35,7 @@ struct UnitInfo {
   std::optional<std::string> library;
   std::optional<std::string> package;
   std::optional<std::string> item;
+  std::optional<std::vector<std::string>> uses;  // store keys of the use records of a VHDL unit
 };
 
 struct FileInfo {

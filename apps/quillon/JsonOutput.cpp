@@ -29,6 +29,19 @@ Json MessageList(const std::vector<MessageInfo>& messages) {
   return list;
 }
 
+// A line of 0 (no line) is null.
+Json DiagnosticList(const std::vector<Diagnostic>& diagnostics) {
+  Json list = Json::array();
+  for (const Diagnostic& diagnostic : diagnostics) {
+    list.push_back({{"severity", diagnostic.SeverityText()},
+                    {"code", diagnostic.code},
+                    {"text", diagnostic.text},
+                    {"file", diagnostic.file},
+                    {"line", diagnostic.line == 0 ? Json(nullptr) : Json(diagnostic.line)}});
+  }
+  return list;
+}
+
 Json UnitObject(const UnitInfo& unit) {
   Json object = {{"type", unit.type},
                  {"name", unit.name},
@@ -45,6 +58,7 @@ Json UnitObject(const UnitInfo& unit) {
   PutWhenSet(object, "library", unit.library);
   PutWhenSet(object, "package", unit.package);
   PutWhenSet(object, "item", unit.item);
+  if (unit.uses) object["uses"] = *unit.uses;
   return object;
 }
 
@@ -87,12 +101,16 @@ void JsonOutput::Units(const std::vector<FileInfo>& files, const std::vector<Mes
   Write({{"files", std::move(list)}, {"messages", MessageList(messages)}}, out);
 }
 
-void JsonOutput::Tree(const TreeNodeInfo* root, const std::vector<MessageInfo>& messages, std::ostream& out) {
-  Write({{"root", root ? NodeObject(*root) : Json(nullptr)}, {"messages", MessageList(messages)}}, out);
+void JsonOutput::Tree(const TreeNodeInfo* root, const std::vector<MessageInfo>& messages, std::ostream& out,
+                      const std::vector<Diagnostic>& diagnostics) {
+  Write({{"root", root ? NodeObject(*root) : Json(nullptr)},
+         {"messages", MessageList(messages)},
+         {"diagnostics", DiagnosticList(diagnostics)}},
+        out);
 }
 
 void JsonOutput::Order(const std::vector<OrderEntry>* order, const std::vector<MessageInfo>& messages,
-                       std::ostream& out) {
+                       std::ostream& out, const std::vector<Diagnostic>& diagnostics) {
   Json list = nullptr;
   if (order) {
     list = Json::array();
@@ -100,12 +118,19 @@ void JsonOutput::Order(const std::vector<OrderEntry>* order, const std::vector<M
       list.push_back({{"path", entry.path}, {"library", entry.library}, {"plugin", entry.plugin}});
     }
   }
-  Write({{"order", std::move(list)}, {"messages", MessageList(messages)}}, out);
+  Write({{"order", std::move(list)},
+         {"messages", MessageList(messages)},
+         {"diagnostics", DiagnosticList(diagnostics)}},
+        out);
 }
 
 void JsonOutput::Check(std::size_t files, std::size_t units, const std::vector<MessageInfo>& messages,
-                       std::ostream& out) {
-  Write({{"files", files}, {"units", units}, {"messages", MessageList(messages)}}, out);
+                       const std::vector<Diagnostic>& diagnostics, std::ostream& out) {
+  Write({{"files", files},
+         {"units", units},
+         {"messages", MessageList(messages)},
+         {"diagnostics", DiagnosticList(diagnostics)}},
+        out);
 }
 
 void JsonOutput::Ports(const std::string& unit, const std::vector<PortInfo>* ports,

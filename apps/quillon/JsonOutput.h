@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "DesignModel.h"
+#include "Diagnostic.h"
 
 namespace quillon {
 
@@ -14,11 +15,13 @@ class JsonOutput {
  public:
   static void Units(const std::vector<FileInfo>& files, const std::vector<MessageInfo>& messages,
                     std::ostream& out);
-  static void Tree(const TreeNodeInfo* root, const std::vector<MessageInfo>& messages, std::ostream& out);
+  // Tree, Order and Check also list quillon's own diagnostics under "diagnostics".
+  static void Tree(const TreeNodeInfo* root, const std::vector<MessageInfo>& messages, std::ostream& out,
+                   const std::vector<Diagnostic>& diagnostics = {});
   static void Order(const std::vector<OrderEntry>* order, const std::vector<MessageInfo>& messages,
-                    std::ostream& out);
+                    std::ostream& out, const std::vector<Diagnostic>& diagnostics = {});
   static void Check(std::size_t files, std::size_t units, const std::vector<MessageInfo>& messages,
-                    std::ostream& out);
+                    const std::vector<Diagnostic>& diagnostics, std::ostream& out);
   // "low", "high" and "span" are null for a port without a range; "ports" is null when the
   // module handed out none.
   static void Ports(const std::string& unit, const std::vector<PortInfo>* ports,

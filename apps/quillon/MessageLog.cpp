@@ -52,6 +52,7 @@ MessageLog::MessageLog(bool quiet, bool verbose) : Port_MsgManDefault("quillon")
 }
 
 MessageLog::~MessageLog() {
+  FlushListing();
   if (sinkInstalled_) Port_MsgManData::setDebugSink(previousSink_);
   Port_MsgDispatcher::removeMsgMan(this);
   if (defaultWasRegistered_) Port_MsgDispatcher::addMsgMan(Port_MsgDispatcher::getDefaultMsgMan());
@@ -83,9 +84,22 @@ void MessageLog::onMessage(const Port_MsgRecord& record) {
 }
 
 void MessageLog::writeMsgLines(MsgType type, const wchar_t* const* lines, int count) {
-  if (quiet_) return;
+  if (quiet_ || !lines || count < 1) return;
+  ListingFilter::Message message{type, {}};
+  for (int i = 0; i < count; ++i) message.lines.emplace_back(lines[i] ? lines[i] : L"");
+  Write(listings_.Take(std::move(message)));
+}
+
+void MessageLog::FlushListing() { Write(listings_.Flush()); }
+
+void MessageLog::Write(const std::vector<ListingFilter::Message>& messages) {
+  if (messages.empty()) return;
   if (progress_) progress_->Clear();
-  Port_MsgManDefault::writeMsgLines(type, lines, count);
+  for (const ListingFilter::Message& message : messages) {
+    std::vector<const wchar_t*> lines;
+    for (const std::wstring& line : message.lines) lines.push_back(line.c_str());
+    Port_MsgManDefault::writeMsgLines(message.type, lines.data(), static_cast<int>(lines.size()));
+  }
 }
 
 void MessageLog::writeMsgEnd(MsgType type) {

@@ -38,6 +38,11 @@ constexpr const char* kUsage =
     "  --unit UNIT           the order for UNIT alone\n"
     "  --with-library        text output: the library before each path\n"
     "\n"
+    "diagnostics:\n"
+    "  --external-library NAME  a library outside the project: its units are black boxes\n"
+    "  --strict              instances of units the project lacks are errors, not warnings\n"
+    "  --warnings-as-errors  check fails on warnings too\n"
+    "\n"
     "output:\n"
     "  --format text|json|dot, -o FILE, -q (no messages), -v (developer texts too)\n"
     "\n"
@@ -127,6 +132,9 @@ void Parser::Declare() {
   app_.add_option("-o", options_.outputPath);
   app_.add_flag("-q", options_.quiet);
   app_.add_flag("-v", options_.verbose);
+  AddRepeated(app_, "--external-library", options_.externalLibraries);
+  app_.add_flag("--strict", options_.strict);
+  app_.add_flag("--warnings-as-errors", options_.warningsAsErrors);
 }
 
 Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& error) {

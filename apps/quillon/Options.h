@@ -47,6 +47,12 @@ class Options {
   std::string outputPath;
   bool quiet = false;
   bool verbose = false;
+
+  // Diagnostics: libraries whose units are black boxes, black boxes as errors, and (for check)
+  // warnings as errors.
+  std::vector<std::string> externalLibraries;
+  bool strict = false;
+  bool warningsAsErrors = false;
 };
 
 }  // namespace quillon

@@ -1,5 +1,6 @@
 #include "ProjectLoader.h"
 
+#include <algorithm>
 #include <fstream>
 #include <iterator>
 #include <nlohmann/json.hpp>
@@ -146,6 +147,14 @@ bool ProjectLoader::AddProjectFile(const SourceArgument& argument, std::string& 
       if (!value.is_string()) return malformed("the value of property \"" + name + "\" must be a string");
       sources_.properties[name] = value.get<std::string>();
     }
+  }
+
+  auto external = project.find("externalLibraries");
+  if (external != project.end()) {
+    auto isText = [](const nlohmann::json& value) { return value.is_string(); };
+    if (!external->is_array() || !std::all_of(external->begin(), external->end(), isText))
+      return malformed("\"externalLibraries\" must be an array of texts");
+    for (const auto& name : *external) sources_.externalLibraries.push_back(name.get<std::string>());
   }
 
   auto files = project.find("files");

@@ -16,6 +16,8 @@ struct SourceFile {
 struct ProjectSources {
   std::map<std::string, std::string> properties;
   std::vector<SourceFile> files;  // in the order given
+  // Libraries that the sources name but the project does not hold ("externalLibraries").
+  std::vector<std::string> externalLibraries;
 };
 
 }  // namespace quillon

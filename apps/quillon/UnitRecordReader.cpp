@@ -5,6 +5,7 @@
 #include <variant>
 #include <vector>
 
+#include "IHdlUseClauses.h"
 #include "IName.h"
 #include "Port/MsgManData.h"
 #include "Prjrep/AutoPtr.h"
@@ -161,6 +162,19 @@ void TakeKindFields(const RecordFields& fields, UnitInfo& info) {
   }
 }
 
+// The records do not persist their use lists; the VHDL units tell them through IHdlUseClauses.
+std::optional<std::vector<std::string>> UseStoreKeysOf(CitI::IInterface* unit) {
+  auto* useClauses = Prjrep::QueryAs<Vad::IHdlUseClauses>(unit);
+  std::uint32_t count = 0;
+  if (!useClauses || useClauses->GetUseCount(&count) != CitI::kOk) return std::nullopt;
+  std::vector<std::string> keys;
+  for (std::uint32_t index = 0; index < count; ++index) {
+    Port::StringBase key;
+    if (useClauses->GetUseStoreKey(index, &key) == CitI::kOk) keys.push_back(key.str());
+  }
+  return keys;
+}
+
 std::string DesignUnitKeyOf(CitI::IInterface* unit) {
   Port::StringBase key;
   auto* name = Prjrep::QueryAs<Prjrep::IName>(unit);
@@ -209,6 +223,7 @@ bool UnitRecordReader::Read(CitI::IInterface* unit, UnitInfo& info) {
     RecordFields parent;
     if (ReadFields(fields.parent, parent) || !parent.storeKey.empty()) info.parent = parent.storeKey;
   }
+  info.uses = UseStoreKeysOf(unit);
   TakeKindFields(fields, info);
   return complete;
 }

@@ -385,6 +385,9 @@ Port::StringBase CElaborator::ResolveEntityRef(const CElabTables& tables, const 
       FirstOf(FindRegisteredKey(tables, Formatted("Module|%s", entity), entityLibrary, true));
   if (target.IsEmpty())
     target = FirstOf(FindRegisteredKey(tables, Formatted("Module|%s", entity), entityLibrary, false));
+  // An instance of a configuration ("u : configuration lib.cfg") names the package declaration
+  // that keeps the configuration.
+  if (target.IsEmpty()) target = ResolvePackage(tables, entity, entityLibrary);
   return target;
 }
 

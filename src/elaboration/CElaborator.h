@@ -27,8 +27,9 @@ class CNetListNode;
 namespace ElabMask {
 // Entity, Architecture, PackageDecl, PackageBody.
 inline constexpr std::uint32_t kVhdlUnit = 0xC6;
-// Architecture, Module.
-inline constexpr std::uint32_t kContainsInstances = 0x2004;
+// Architecture, Module, and PackageDecl: a configuration declaration is kept as a package
+// declaration whose entity instances are the architectures it configures.
+inline constexpr std::uint32_t kContainsInstances = 0x2044;
 // Architecture, PackageBody.
 inline constexpr std::uint32_t kHasPrimaryUnit = 0x84;
 // kVhdlUnit plus Module and Generic.

@@ -139,6 +139,8 @@ void CParserConfigHolder::ResetForNextUnit() {
 void CParserConfigHolder::ForgetParseState() {
   pendingContext_.clear();
   currentUnit_ = nullptr;
+  openContext_ = nullptr;
+  lastUnit_ = nullptr;
   ResetInstanceState();
 }
 
@@ -181,7 +183,8 @@ bool CParserConfigHolder::RegisterUnit(const Port::StringBase& key, CHdlElement*
 Library* CParserConfigHolder::AddLibrary(const Port::StringBase& name, std::uint32_t line,
                                          const Port::XUID& type) {
   ResetForNextUnit();
-  currentUnit_ = nullptr;
+  // Library clauses inside a context declaration belong to it.
+  if (!openContext_ || currentUnit_ != openContext_) currentUnit_ = nullptr;
   auto* library = new Library(name.view(), nullptr);
   const Port::StringBase key = StoreKeyOf(library);
   if (auto* existing = dynamic_cast<Library*>(FindRecorded(key))) {
@@ -191,33 +194,86 @@ Library* CParserConfigHolder::AddLibrary(const Port::StringBase& name, std::uint
   return Enter(library, key, line, type) ? library : nullptr;
 }
 
-Use* CParserConfigHolder::AddUse(const Port::StringBase& dottedName, std::uint32_t line,
-                                 const Port::XUID& type, bool inBody) {
-  ResetForNextUnit();
+Use* CParserConfigHolder::RecordUse(const Port::StringBase& dottedName, std::uint32_t line,
+                                    const Port::XUID& type) {
   auto* use = new Use(dottedName.view(), nullptr);
   const Port::StringBase key = StoreKeyOf(use);
   if (auto* existing = dynamic_cast<Use*>(FindRecorded(key))) {
     Prjrep::AutoRelease<CitI::IInterface> discarded(use);
-    use = existing;
-  } else if (!Enter(use, key, line, type)) {
-    return nullptr;
+    return existing;
   }
-  AttachUse(use, inBody);
+  return Enter(use, key, line, type) ? use : nullptr;
+}
+
+namespace {
+
+void AppendUse(CHdlElement* unit, Use* use) {
+  auto* vhdlUnit = dynamic_cast<CVhdlDU*>(unit);
+  if (!vhdlUnit) return;
+  std::vector<DbObject*> uses;
+  vhdlUnit->GetUses(uses);
+  uses.push_back(use);
+  vhdlUnit->SetUses(uses);
+}
+
+}  // namespace
+
+Use* CParserConfigHolder::AddUse(const Port::StringBase& dottedName, std::uint32_t line,
+                                 const Port::XUID& type, bool inBody) {
+  ResetForNextUnit();
+  Use* use = RecordUse(dottedName, line, type);
+  if (use) AttachUse(use, inBody);
   return use;
 }
 
 void CParserConfigHolder::AttachUse(Use* use, bool inBody) {
-  if (currentUnit_ && !inBody) {
-    if (auto* vhdlUnit = dynamic_cast<CVhdlDU*>(currentUnit_)) {
-      std::vector<DbObject*> uses;
-      vhdlUnit->GetUses(uses);
-      uses.push_back(use);
-      vhdlUnit->SetUses(uses);
-    }
+  if (currentUnit_ && (!inBody || currentUnit_ == openContext_)) {
+    AppendUse(currentUnit_, use);
     return;
   }
   pendingContext_.push_back(use);
   currentUnit_ = nullptr;
+}
+
+Use* CParserConfigHolder::AddUnitUse(const Port::StringBase& dottedName, std::uint32_t line,
+                                     const Port::XUID& type) {
+  Use* use = RecordUse(dottedName, line, type);
+  if (!use) return nullptr;
+  if (lastUnit_) {
+    AppendUse(lastUnit_, use);
+  } else {
+    pendingContext_.push_back(use);
+  }
+  return use;
+}
+
+PackageDecl* CParserConfigHolder::AddContextDecl(const Port::StringBase& name, std::uint32_t line,
+                                                 const Port::XUID& type) {
+  PackageDecl* context = AddPackageDecl(name, line, type);
+  currentUnit_ = context;
+  openContext_ = context;
+  return context;
+}
+
+PackageDecl* CParserConfigHolder::AddConfigurationDecl(const Port::StringBase& name, std::uint32_t line,
+                                                       const Port::XUID& type) {
+  PackageDecl* configuration = AddPackageDecl(name, line, type);
+  currentUnit_ = configuration;
+  return configuration;
+}
+
+PackageDecl* CParserConfigHolder::AddPackageInstance(const Port::StringBase& name,
+                                                     const Port::StringBase& genericPackage,
+                                                     std::uint32_t line, const Port::XUID& packageType,
+                                                     const Port::XUID& useType) {
+  PackageDecl* package = AddPackageDecl(name, line, packageType);
+  if (package) AddUnitUse(genericPackage, line, useType);
+  return package;
+}
+
+void CParserConfigHolder::EndDeclaration() {
+  currentUnit_ = nullptr;
+  openContext_ = nullptr;
 }
 
 EntityDecl* CParserConfigHolder::AddEntityDecl(const Port::StringBase& name, std::uint32_t line,
@@ -229,6 +285,7 @@ EntityDecl* CParserConfigHolder::AddEntityDecl(const Port::StringBase& name, std
   if (!Enter(entity, StoreKeyOf(entity), line, type)) return nullptr;
   TakePendingContext(entity);
   currentUnit_ = entity;
+  lastUnit_ = entity;
   return entity;
 }
 
@@ -240,6 +297,7 @@ Arch* CParserConfigHolder::AddArch(const Port::StringBase& archName, const Port:
   if (!Enter(architecture, StoreKeyOf(architecture), line, type)) return nullptr;
   TakePendingContext(architecture);
   currentUnit_ = architecture;
+  lastUnit_ = architecture;
   return architecture;
 }
 
@@ -253,6 +311,7 @@ module* CParserConfigHolder::AddModule(const Port::StringBase& name, std::uint32
   if (!Enter(unit, StoreKeyOf(unit), line, type)) return nullptr;
   pendingContext_.clear();
   currentUnit_ = unit;
+  lastUnit_ = unit;
   return unit;
 }
 
@@ -264,6 +323,7 @@ PackageBody* CParserConfigHolder::AddPackageBody(const Port::StringBase& name, s
   if (!Enter(body, StoreKeyOf(body), line, type)) return nullptr;
   TakePendingContext(body);
   currentUnit_ = nullptr;
+  lastUnit_ = body;
   return body;
 }
 
@@ -275,6 +335,7 @@ PackageDecl* CParserConfigHolder::AddPackageDecl(const Port::StringBase& name, s
   if (!Enter(package, StoreKeyOf(package), line, type)) return nullptr;
   TakePendingContext(package);
   currentUnit_ = nullptr;
+  lastUnit_ = package;
   return package;
 }
 

@@ -95,6 +95,23 @@ class CParserConfigHolder final : public CitI::IInterface {
                     const Port::StringBase& partition);
   PackageBody* AddPackageBody(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
   PackageDecl* AddPackageDecl(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
+  // VHDL-2008 primary units kept as package declarations, so that stored files and hosts know
+  // them. A context declaration stays the current unit until EndDeclaration, also across library
+  // clauses, and collects the use clauses and context references inside it. A configuration
+  // stays the current unit so that the entity and architectures it configures are recorded as
+  // its entity instances. A package instance uses the generic package it instantiates.
+  PackageDecl* AddContextDecl(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
+  PackageDecl* AddConfigurationDecl(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
+  PackageDecl* AddPackageInstance(const Port::StringBase& name, const Port::StringBase& genericPackage,
+                                  std::uint32_t line, const Port::XUID& packageType,
+                                  const Port::XUID& useType);
+  // A use of a package that the unit recorded last needs whatever the begin flag says: a formal
+  // package of its generic clause or a package instantiated inside it. Pending without a unit.
+  Use* AddUnitUse(const Port::StringBase& dottedName, std::uint32_t line, const Port::XUID& type);
+  // The end of a context declaration or configuration: later use clauses wait for the next unit.
+  void EndDeclaration();
+  // Whether an entity, architecture or configuration is the current unit.
+  bool HasCurrentUnit() const { return currentUnit_ != nullptr; }
   generic* AddGeneric(const Port::StringBase& name, std::uint32_t line, const Port::XUID& type);
   CompInst* AddCompInst(const Port::StringBase& label, const Port::StringBase& component, std::uint32_t line,
                         const Port::XUID& type, const Port::StringBase& partition);
@@ -140,6 +157,8 @@ class CParserConfigHolder final : public CitI::IInterface {
   // The new unit's use list becomes the pending context, which is emptied.
   void TakePendingContext(CHdlElement* unit);
   void AttachUse(Use* use, bool inBody);
+  // The use record of this selected name: the one recorded before or a new one.
+  Use* RecordUse(const Port::StringBase& dottedName, std::uint32_t line, const Port::XUID& type);
   bool IsLibraryCell(const Port::StringBase& component) const;
   // Paths of the listed files whose plug-in name is this file's, ignoring case, in list order.
   // Shared between the files of one project list (see CProjectFileList).
@@ -161,6 +180,10 @@ class CParserConfigHolder final : public CitI::IInterface {
   Prjrep::AutoPtr<IHdlDesignUnitSet> unitSet_;
   std::vector<Use*> pendingContext_;
   CHdlElement* currentUnit_ = nullptr;
+  // The open context declaration (also the current unit while it is open), or null.
+  CHdlElement* openContext_ = nullptr;
+  // The entity, architecture, package, package body, context or configuration recorded last.
+  CHdlElement* lastUnit_ = nullptr;
   CompInst* lastCompInst_ = nullptr;
   EntityInst* lastEntityInst_ = nullptr;
   std::uint32_t labelCount_ = 0;

@@ -6,6 +6,23 @@ namespace Vad {
 
 CVhdlDU::CVhdlDU(std::string_view name, DbObject* parent) : CHdlElement(name, parent) {}
 
+CitI::IInterface* CVhdlDU::QueryInterface(const Port::XUID& id) {
+  if (id == IHdlUseClauses::Iid()) return &useClausesFace_;
+  return CHdlElement::QueryInterface(id);
+}
+
+CitI::Result CVhdlDU::CVhdlDU_IHdlUseClauses::GetUseCount(std::uint32_t* count) {
+  if (!count) return CitI::kInvalidArg;
+  *count = static_cast<std::uint32_t>(owner()->uses_.size());
+  return CitI::kOk;
+}
+
+CitI::Result CVhdlDU::CVhdlDU_IHdlUseClauses::GetUseStoreKey(std::uint32_t index, Port::StringBase* key) {
+  if (!key || index >= owner()->uses_.size()) return CitI::kInvalidArg;
+  *key = owner()->uses_[index]->GetKey();
+  return CitI::kOk;
+}
+
 CitI::Result CVhdlDU::Load(Prjrep::IArchive* archive) {
   CitI::Result result = CHdlElement::Load(archive);
   if (result != CitI::kOk) return result;

@@ -1,6 +1,7 @@
 #include "EntityInst.h"
 
 #include "Arch.h"
+#include "PackageDecl.h"
 #include "Port/InitObjects.h"
 
 namespace Vad {
@@ -42,6 +43,10 @@ void EntityInst::ComposeStoreKey(Port::StringBase& key) {
   if (parentArchitecture) {
     entity = parentArchitecture->GetEntityName().c_str();
     architecture = parentArchitecture->GetArchitectureName().c_str();
+  } else if (auto* configuration = dynamic_cast<PackageDecl*>(parent)) {
+    // A configuration declaration, kept as a package declaration, binds these instances.
+    entity = configuration->GetPackageName().c_str();
+    architecture = "";
   }
   Port::StringBase prefix;
   AppendKeyPrefix(prefix);

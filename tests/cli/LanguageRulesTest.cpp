@@ -223,9 +223,10 @@ TEST(DefaultArchitecture, TheOneAnalysedLastIsBoundAndOrderedLast) {
 
   CliResult check = RunQuillon(With({"check"}, cases[0].given));
   EXPECT_EQ(check.status, 0) << check.err;
-  EXPECT_EQ(check.err, "WARNING: ambiguous-architecture: entity leaf (library work) has 2 architectures: alpha (" +
+  EXPECT_EQ(check.err, src("a_zeta.vhd") + ":1: warning: entity leaf (library work) has 2 architectures: alpha (" +
                            src("z_alpha.vhd") + ":1), zeta (" + src("a_zeta.vhd") +
-                           ":1); an instance that names none is bound to zeta, the one analysed last\n");
+                           ":1); an instance that names none is bound to zeta, the one analysed last "
+                           "[ambiguous-architecture]\n");
 }
 
 TEST(DefaultArchitecture, NoCycleIsMadeWhenTheDefaultCannotComeLast) {

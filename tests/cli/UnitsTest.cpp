@@ -4,6 +4,7 @@
 
 #include <fstream>
 #include <iterator>
+#include <map>
 #include <nlohmann/json.hpp>
 #include <string>
 #include <vector>
@@ -150,6 +151,26 @@ TEST(Units, VerboseAddsTheDeveloperTexts) {
   CliResult shown = RunQuillon(CliRun{verbose, {}, noDebugVariable});
   EXPECT_EQ(shown.status, 0) << shown.err;
   EXPECT_NE(shown.err.find(text), std::string::npos) << shown.err;
+}
+
+TEST(Units, VhdlUnitsListTheStoreKeysOfTheirUseClauses) {
+  ScopedTextFile source(
+      "library ieee;\n"
+      "use ieee.std_logic_1164.all;\n"
+      "entity e is end;\n"
+      "architecture a of e is\n"
+      "  use work.p.all;\n"
+      "begin\n"
+      "end;\n",
+      "e.vhd");
+  Json units = UnitsOf({source.path()});
+  ASSERT_EQ(units["files"].size(), 1u);
+  std::map<std::string, Json> usesByType;
+  for (const Json& unit : units["files"][0]["units"]) usesByType[unit["type"]] = unit.value("uses", Json());
+  EXPECT_EQ(usesByType["Entity"], Json::array({"||Use|ieee|std_logic_1164|all|"}));
+  EXPECT_EQ(usesByType["Architecture"], Json::array({"||Use|work|p|all|"}));
+  EXPECT_TRUE(usesByType["Library"].is_null());
+  EXPECT_TRUE(usesByType["Use"].is_null());
 }
 
 }  // namespace

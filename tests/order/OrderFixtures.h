@@ -65,12 +65,15 @@ class OrderTest : public testing::Test {
 
   Prjrep::AutoPtr<Vad::IHdlFile> AddFile(std::string_view folder, std::string_view name,
                                          std::string_view plugin = "PLUGIN_Vhdl") {
+    return AddFileAt(DataPath(folder, name), plugin);
+  }
+  Prjrep::AutoPtr<Vad::IHdlFile> AddFileAt(const std::string& path, std::string_view plugin = "PLUGIN_Vhdl") {
     Prjrep::AutoPtr<Vad::IHdlFile> file;
     EXPECT_EQ(project_->createNewFile(file.Out()), CitI::kOk);
     auto fileType = Host::FileType::Create("HDL", {"vhd"});
     EXPECT_EQ(Prjrep::QueryAs<Vad::ICompAdmin>(file.Get())->InitializeAfterCreate(nullptr, fileType.Get()),
               CitI::kOk);
-    EXPECT_EQ(file->setFilePath(Port::StringBase(DataPath(folder, name)), Port::StringBase()), CitI::kOk);
+    EXPECT_EQ(file->setFilePath(Port::StringBase(path), Port::StringBase()), CitI::kOk);
     file->setPluginName(Port::StringBase(plugin));
     EXPECT_EQ(Prjrep::QueryAs<Vad::IHdlFileSet>(project_.Get())->Add(file.Get()), CitI::kOk);
     return file;

@@ -9,6 +9,7 @@
 #include "DatabaseFixtures.h"
 #include "EntityDecl.h"
 #include "EntityInst.h"
+#include "IHdlUseClauses.h"
 #include "Library.h"
 #include "PackageBody.h"
 #include "PackageDecl.h"
@@ -209,6 +210,40 @@ TEST(Records, VhdlUnitsKeepTheirUsesOutOfTheArchive) {
   loaded->GetUses(uses);
   EXPECT_EQ(uses, std::vector<Vad::DbObject*>{a.Get()}) << "loading reads no uses into the list";
   EXPECT_EQ(loaded->GetArchitectureName(), "rtl");
+}
+
+TEST(Records, VhdlUnitsTellTheStoreKeysOfTheirUsesThroughAnInterface) {
+  Owned<Vad::EntityDecl> entity(new Vad::EntityDecl("counter", nullptr));
+  Owned<Vad::Use> a(new Vad::Use("ieee.std_logic_1164.all", nullptr));
+  Owned<Vad::Use> b(new Vad::Use("work.types", nullptr));
+  Port::StringBase key;
+  a->ComposeStoreKey(key);
+  b->ComposeStoreKey(key);
+  entity->SetUses({a.Get(), b.Get()});
+
+  auto* useClauses = Prjrep::QueryAs<Vad::IHdlUseClauses>(entity.Get());
+  ASSERT_NE(useClauses, nullptr);
+  std::uint32_t count = 0;
+  ASSERT_EQ(useClauses->GetUseCount(&count), CitI::kOk);
+  EXPECT_EQ(count, 2u);
+  Port::StringBase first, second;
+  EXPECT_EQ(useClauses->GetUseStoreKey(0, &first), CitI::kOk);
+  EXPECT_EQ(useClauses->GetUseStoreKey(1, &second), CitI::kOk);
+  EXPECT_EQ(first, "||Use|ieee|std_logic_1164|all|");
+  EXPECT_EQ(second, "||Use|work|types||");
+  EXPECT_EQ(useClauses->GetUseStoreKey(2, &first), CitI::kInvalidArg);
+  EXPECT_EQ(useClauses->GetUseStoreKey(0, nullptr), CitI::kInvalidArg);
+  EXPECT_EQ(useClauses->GetUseCount(nullptr), CitI::kInvalidArg);
+  EXPECT_EQ(Prjrep::QueryAs<Vad::IHdlUseClauses>(a.Get()), nullptr) << "only VHDL units have use clauses";
+}
+
+TEST(Records, InstancesOfAConfigurationNameItInTheirStoreKeys) {
+  Owned<Vad::PackageDecl> configuration(new Vad::PackageDecl("top_cfg", nullptr));
+  Owned<Vad::EntityInst> block(new Vad::EntityInst("top", configuration.Get()));
+  block->SetLabel("top");
+  block->SetEntityName("top");
+  block->SetArchitectureName("rtl");
+  EXPECT_EQ(StoreKeyOf(*block), "|EntityInstantiation||top_cfg||top|top||rtl");
 }
 
 TEST(Records, VhdlUnitsReadPastUsesThatAnArchiveLists) {

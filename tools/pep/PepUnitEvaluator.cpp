@@ -14,8 +14,9 @@ void PepUnitEvaluator::EvaluateConstants() {
     if (constant.hasDefault) value = evaluator_.Evaluate(constant.defaultValue);
     // Assigned after evaluating, so a default that names its own constant finds no value.
     values_[constant.key] = value;
-    bool defined = constant.hasDefault && (value.has_value() || !constant.needsValue);
-    if (constant.isGeneric && !defined) allGenericsDefined_ = false;
+    // A default the evaluator cannot compute (a concatenation, a macro, a function it does not
+    // know) still gives the generic a value: only the ranges that use it stay unknown.
+    if (constant.isGeneric && !constant.hasDefault) allGenericsDefined_ = false;
   }
 }
 

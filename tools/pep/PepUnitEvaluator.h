@@ -24,8 +24,9 @@ class PepUnitEvaluator {
   PepUnitEvaluator(const PepUnitEvaluator&) = delete;
   PepUnitEvaluator& operator=(const PepUnitEvaluator&) = delete;
 
-  // True when every generic (not localparam) has a default, and that default evaluated when the
-  // generic needs an integer value.
+  // True when every generic (not localparam) has a default, whether the evaluator can compute it
+  // or not: a port whose range needs an uncomputable default comes without its range, the others
+  // with theirs.
   bool AllGenericsDefined() const { return allGenericsDefined_; }
   std::vector<PepPort> Ports() const;
 

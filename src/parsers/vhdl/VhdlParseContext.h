@@ -5,6 +5,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <initializer_list>
+#include <set>
 #include <string>
 #include <string_view>
 
@@ -71,6 +72,10 @@ class VhdlTextStore {
   std::string buffer_;
 };
 
+// The declaration whose end the grammar looks for: a context declaration holds only context
+// items, a configuration nests block and component configurations that each end with "end for".
+enum class VhdlDeclaration { kNone, kContext, kConfiguration };
+
 struct VhdlParseContext {
   VhdlParseContext(CParserConfigHolder& recorder, Port::Stream& source, bool synthesisTarget)
       : holder(recorder), input(source), synthesis(synthesisTarget) {}
@@ -96,7 +101,47 @@ struct VhdlParseContext {
   bool holdsName = false;
   VhdlText heldName{0, 0};
   VhdlTextStore texts;
+
+  // The last token scanned and the one before it, dropped ones included (0 before the first).
+  int lastToken = 0;
+  int tokenBeforeLast = 0;
+  // Open parentheses; a label inside them names an interface object, not an instance.
+  std::uint32_t parenDepth = 0;
+  // Between "record" and the next "end": element declarations look like instances.
+  bool inRecord = false;
+  // Between the two words "process" of a process statement: no instance can stand there.
+  bool inProcess = false;
+  // Set as a held name goes to the grammar before a colon: whether it stands where a concurrent
+  // statement begins (after ";", "begin", "generate" or "=>", outside parentheses, records and
+  // processes).
+  bool labelBeginsStatement = false;
+  bool heldNameBeginsStatement = false;
+  // The line of the package header being read.
+  std::uint32_t unitLine = 1;
+  VhdlDeclaration openDeclaration = VhdlDeclaration::kNone;
+  // Block and component configurations open inside the configuration.
+  std::uint32_t configurationDepth = 0;
+  std::string configuredEntity;
+  bool awaitsConfiguredArchitecture = false;
+  // The generic map of a package instance: its actuals may name package instances, which the
+  // instance then uses. Read by the scanner, token by token, after the grammar saw the header.
+  enum class Actuals { kNone, kAwaitingMap, kReading };
+  Actuals actuals = Actuals::kNone;
+  std::uint32_t actualsDepth = 0;  // the parentheses open outside the map
+  bool readingActual = false;      // since "=>": a selected name so far
+  bool actualWantsName = false;
+  std::string actual;
+  // The libraries of this file's library clauses, in lower case: "lib.name" in a generic map
+  // names a unit only when lib is one of them or work.
+  std::set<std::string> libraries;
+  // The line of the "for" of the configuration item being read: a block configuration is reduced
+  // only after the token that follows it.
+  std::uint32_t forLine = 1;
 };
+
+// Records the selected name of a generic map's actual as a use of the unit being declared when
+// it names a unit of a library (see VhdlParseContext::libraries).
+void RecordGenericActual(VhdlParseContext& context, std::string_view name);
 
 // Runs the scanner and grammar over the context's input until the end of input, a parse-stack
 // overflow, or memory running out. False only in that last case. What was recorded before stays

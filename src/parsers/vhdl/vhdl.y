@@ -1,6 +1,7 @@
 /* Partial VHDL grammar: recognises only the constructs that place design units in a project
-   (library and use clauses, unit headers, instantiations, configuration specifications,
-   generate statements, port clauses) and lets error recovery swallow everything else. */
+   (library, use and context clauses, unit headers, package instances, instantiations,
+   configurations, generate statements, port clauses) and lets error recovery swallow everything
+   else. */
 
 %code top {
 /* The stack never grows: an overflow ends the parse of the file. */
@@ -23,6 +24,8 @@ const bool* VhdlTokensBeginningConstructs();
 
 %code {
 #include <array>
+#include <cctype>
+#include <string>
 
 #include "CParserConfigHolder.h"
 #include "VhdlParser.h"
@@ -43,7 +46,21 @@ Port::StringBase StringOf(const VhdlParseContext& ctx, VhdlText text) { return c
 
 void RecordArchitecture(VhdlParseContext& ctx, VhdlText archName, VhdlText entityName) {
   ctx.begin = false;
+  ctx.parenDepth = 0;
+  ctx.inProcess = false;
+  ctx.inRecord = false;
   ctx.holder.AddArch(StringOf(ctx, archName), StringOf(ctx, entityName), ctx.line, TypeIds::Architecture());
+}
+
+std::string Lower(std::string_view text) {
+  std::string lower(text);
+  for (char& c : lower) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+  return lower;
+}
+
+void RecordLibrary(VhdlParseContext& ctx, VhdlText name) {
+  ctx.libraries.insert(Lower(TextOf(ctx, name)));
+  ctx.holder.AddLibrary(StringOf(ctx, name), ctx.line, TypeIds::Library());
 }
 
 void RecordEntity(VhdlParseContext& ctx, VhdlText name, bool portFlag) {
@@ -61,10 +78,88 @@ void RecordEntityInstance(VhdlParseContext& ctx, VhdlText label, VhdlText entity
                            ctx.line, TypeIds::Instance());
 }
 
+// Inside a configuration declaration a binding is a unit the configuration depends on; in an
+// architecture it is a configuration specification.
 void RecordConfigBinding(VhdlParseContext& ctx, VhdlText instances, VhdlText component, VhdlText entity,
                          std::string_view architecture) {
+  if (ctx.openDeclaration == Vad::VhdlDeclaration::kConfiguration) {
+    RecordEntityInstance(ctx, instances, entity, architecture);
+    return;
+  }
   ctx.holder.AddConfigBinding(StringOf(ctx, instances), StringOf(ctx, component), StringOf(ctx, entity),
                               Port::StringBase(architecture));
+}
+
+// "u : name;" is also the form of an object declaration without a value and of a labelled
+// procedure call; only a label where a concurrent statement begins counts as an instance.
+void RecordMaplessComponentInstance(VhdlParseContext& ctx, VhdlText label, VhdlText component) {
+  if (ctx.labelBeginsStatement && ctx.begin) RecordComponentInstance(ctx, label, component);
+}
+
+void RecordContextReference(VhdlParseContext& ctx, VhdlText name) {
+  ctx.holder.AddUse(StringOf(ctx, name), ctx.line, TypeIds::Use(), ctx.begin);
+}
+
+void OpenDeclaration(VhdlParseContext& ctx, Vad::VhdlDeclaration declaration) {
+  ctx.openDeclaration = declaration;
+  ctx.configurationDepth = 0;
+  ctx.parenDepth = 0;
+  ctx.begin = false;
+}
+
+void RecordContextDeclaration(VhdlParseContext& ctx, VhdlText name) {
+  OpenDeclaration(ctx, Vad::VhdlDeclaration::kContext);
+  ctx.holder.AddContextDecl(StringOf(ctx, name), ctx.line, TypeIds::Package());
+}
+
+void RecordConfiguration(VhdlParseContext& ctx, VhdlText name, VhdlText entity) {
+  OpenDeclaration(ctx, Vad::VhdlDeclaration::kConfiguration);
+  ctx.configuredEntity.assign(TextOf(ctx, entity));
+  ctx.awaitsConfiguredArchitecture = true;
+  ctx.holder.AddConfigurationDecl(StringOf(ctx, name), ctx.line, TypeIds::Package());
+}
+
+// The block configuration that opens a configuration names the architecture it configures.
+void RecordConfiguredArchitecture(VhdlParseContext& ctx, VhdlText architecture) {
+  if (ctx.openDeclaration != Vad::VhdlDeclaration::kConfiguration || !ctx.awaitsConfiguredArchitecture) return;
+  ctx.awaitsConfiguredArchitecture = false;
+  Port::StringBase entity(ctx.configuredEntity);
+  ctx.holder.AddEntityInst(entity, entity, StringOf(ctx, architecture), ctx.forLine, TypeIds::Instance());
+}
+
+void RecordPackageHeader(VhdlParseContext& ctx) {
+  ctx.unitLine = ctx.line;
+}
+
+void RecordPackage(VhdlParseContext& ctx, VhdlText name) {
+  ctx.parenDepth = 0;
+  ctx.holder.AddPackageDecl(StringOf(ctx, name), ctx.unitLine, TypeIds::Package());
+}
+
+// A package instance inside parentheses is a formal package of a generic clause, and one inside
+// an entity, architecture or configuration is declared there: both are uses of the unit around
+// them. Any other is a library unit of its own.
+void RecordPackageInstance(VhdlParseContext& ctx, VhdlText name, VhdlText genericPackage) {
+  ctx.actuals = VhdlParseContext::Actuals::kAwaitingMap;
+  if (ctx.parenDepth > 0 || ctx.holder.HasCurrentUnit()) {
+    ctx.holder.AddUnitUse(StringOf(ctx, genericPackage), ctx.line, TypeIds::Use());
+    return;
+  }
+  ctx.holder.AddPackageInstance(StringOf(ctx, name), StringOf(ctx, genericPackage), ctx.unitLine,
+                                TypeIds::Package(), TypeIds::Use());
+}
+
+// A context declaration ends at its first "end", a configuration at the "end" outside every
+// block and component configuration.
+void RecordEnd(VhdlParseContext& ctx, bool namesDeclaration) {
+  bool ends = ctx.openDeclaration == Vad::VhdlDeclaration::kContext ||
+              (ctx.openDeclaration == Vad::VhdlDeclaration::kConfiguration &&
+               (namesDeclaration || ctx.configurationDepth == 0));
+  if (!ends) return;
+  ctx.openDeclaration = Vad::VhdlDeclaration::kNone;
+  ctx.awaitsConfiguredArchitecture = false;
+  ctx.begin = true;
+  ctx.holder.EndDeclaration();
 }
 
 }  // namespace
@@ -80,8 +175,11 @@ void RecordConfigBinding(VhdlParseContext& ctx, VhdlText instances, VhdlText com
 %parse-param {void* scanner} {Vad::VhdlParseContext& ctx}
 
 %token ARCHITECTURE IS ENTITY COMPONENT GENERIC MAP PORT TOK_BEGIN TOK_END ATTRIBUTE OF PACKAGE BODY
-%token USE CONFIGURATION FOR ALL GENERATE LIBRARY IDENT STRING
+%token USE CONFIGURATION FOR ALL GENERATE LIBRARY IDENT STRING CONTEXT NEW
 %token COLON PERIOD BSLASH OPEN_PAREN CLOSE_PAREN COMMA SEMICOLON EQUAL SLASH
+/* A lone "end" gives way to the words that can follow it in one construct. */
+%precedence END_ALONE
+%precedence FOR CONTEXT CONFIGURATION GENERATE
 /* Known to the grammar but never produced by the scanner. */
 %token INT_NUM INTEGER OTHERS CR
 
@@ -95,6 +193,7 @@ input
       {
         /* Nothing of the completed construct is referenced any more; only a lookahead token
            already read keeps its text. Without one, the next token is read between constructs. */
+        ctx.labelBeginsStatement = false;
         if (yychar == VHDL_VHDL_EMPTY) {
           ctx.texts.Clear();
           ctx.betweenConstructs = true;
@@ -118,6 +217,8 @@ all
   | compdecl
   | port
   | begin
+  | context
+  | end
   | error { yyclearin; yyerrok; }
   ;
 
@@ -130,9 +231,14 @@ use
       { ctx.holder.AddUse(StringOf(ctx, $2), ctx.line, TypeIds::Use(), ctx.begin); }
   ;
 
+/* The header is reduced before the next token is read, so the line is the header's own. */
+package_header
+  : PACKAGE ident IS { RecordPackageHeader(ctx); $$ = $2; }
+  ;
+
 package
-  : PACKAGE ident IS
-      { ctx.holder.AddPackageDecl(StringOf(ctx, $2), ctx.line, TypeIds::Package()); }
+  : package_header { RecordPackage(ctx, $1); }
+  | package_header NEW ext_ident { RecordPackageInstance(ctx, $1, $3); }
   | PACKAGE BODY ident IS
       { ctx.holder.AddPackageBody(StringOf(ctx, $3), ctx.line, TypeIds::PackageBody()); }
   ;
@@ -144,10 +250,8 @@ library
 
 /* Right recursive: a list is recorded from its last name back to its first. */
 lib_ident
-  : ident
-      { ctx.holder.AddLibrary(StringOf(ctx, $1), ctx.line, TypeIds::Library()); }
-  | ident COMMA lib_ident
-      { ctx.holder.AddLibrary(StringOf(ctx, $1), ctx.line, TypeIds::Library()); }
+  : ident { RecordLibrary(ctx, $1); }
+  | ident COMMA lib_ident { RecordLibrary(ctx, $1); }
   ;
 
 arch
@@ -170,11 +274,36 @@ entity
 
 instantiation
   : ident COLON ext_ident map { RecordComponentInstance(ctx, $1, $3); }
-  | ident COLON COMPONENT ext_ident map { RecordComponentInstance(ctx, $1, $4); }
-  | ident COLON ENTITY ext_ident map { RecordEntityInstance(ctx, $1, $4, {}); }
-  | ident COLON ENTITY ext_ident OPEN_PAREN ext_ident CLOSE_PAREN map
+  | ident COLON ext_ident SEMICOLON { RecordMaplessComponentInstance(ctx, $1, $3); }
+  | ident COLON COMPONENT ext_ident map_or_end { RecordComponentInstance(ctx, $1, $4); }
+  | ident COLON ENTITY ext_ident map_or_end { RecordEntityInstance(ctx, $1, $4, {}); }
+  | ident COLON ENTITY ext_ident OPEN_PAREN ext_ident CLOSE_PAREN map_or_end
       { RecordEntityInstance(ctx, $1, $4, TextOf(ctx, $6)); }
+  | ident COLON CONFIGURATION ext_ident map_or_end { RecordEntityInstance(ctx, $1, $4, {}); }
   | ident COLON error { yyclearin; yyerrok; }
+  ;
+
+map_or_end
+  : map
+  | SEMICOLON
+  ;
+
+/* "context lib.ctx;" references a context declaration and is recorded as a use clause. */
+context
+  : CONTEXT ident IS { RecordContextDeclaration(ctx, $2); }
+  | CONTEXT context_names SEMICOLON
+  ;
+
+context_names
+  : ext_ident { RecordContextReference(ctx, $1); }
+  | context_names COMMA ext_ident { RecordContextReference(ctx, $3); }
+  ;
+
+end
+  : TOK_END %prec END_ALONE { RecordEnd(ctx, false); }
+  | TOK_END FOR { if (ctx.configurationDepth > 0) --ctx.configurationDepth; }
+  | TOK_END CONTEXT { RecordEnd(ctx, true); }
+  | TOK_END CONFIGURATION { RecordEnd(ctx, true); }
   ;
 
 port
@@ -214,12 +343,21 @@ attribute
   ;
 
 configuration
-  : CONFIGURATION ident OF ident IS
-  | FOR ident
-  | FOR inst_list COLON ident USE CONFIGURATION ext_ident
-  | FOR inst_list COLON ident USE ENTITY ext_ident { RecordConfigBinding(ctx, $2, $4, $7, {}); }
-  | FOR inst_list COLON ident USE ENTITY ext_ident OPEN_PAREN ident CLOSE_PAREN
+  : CONFIGURATION ident OF ident IS { RecordConfiguration(ctx, $2, $4); }
+  | for_keyword ident { RecordConfiguredArchitecture(ctx, $2); }
+  | for_keyword inst_list COLON ident USE CONFIGURATION ext_ident
+      {
+        if (ctx.openDeclaration == Vad::VhdlDeclaration::kConfiguration)
+          RecordEntityInstance(ctx, $2, $7, {});
+      }
+  | for_keyword inst_list COLON ident USE ENTITY ext_ident { RecordConfigBinding(ctx, $2, $4, $7, {}); }
+  | for_keyword inst_list COLON ident USE ENTITY ext_ident OPEN_PAREN ident CLOSE_PAREN
       { RecordConfigBinding(ctx, $2, $4, $7, TextOf(ctx, $9)); }
+  ;
+
+/* Reduced as soon as "for" is read, so that its line is known. */
+for_keyword
+  : FOR { ctx.forLine = ctx.line; }
   ;
 
 inst_list
@@ -265,6 +403,14 @@ std::array<bool, YYMAXUTOK + 1> TokensBeginningConstructs() {
 }
 
 }  // namespace
+
+void RecordGenericActual(VhdlParseContext& context, std::string_view name) {
+  std::size_t dot = name.find('.');
+  if (dot == std::string_view::npos) return;
+  std::string library = Lower(name.substr(0, dot));
+  if (library != "work" && !context.libraries.contains(library)) return;
+  context.holder.AddUnitUse(Port::StringBase(name), context.line, TypeIds::Use());
+}
 
 const bool* VhdlTokensBeginningConstructs() {
   static const std::array<bool, YYMAXUTOK + 1> begins = TokensBeginningConstructs();

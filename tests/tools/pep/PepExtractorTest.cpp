@@ -256,8 +256,28 @@ end;
   verilog.addDesignFile("work", dir_.Path("calls.v").c_str(), PepExtractor::kVerilog);
   verilog.Parse(PepExtractor::kVerilog);
   ASSERT_EQ(verilog.findDesignUnit("work", "topmodule", PepExtractor::kSearchTop), PepExtractor::kUnitFound);
-  EXPECT_FALSE(verilog.hasAllGenericsDefined()) << "$bits is no function the extractor evaluates";
+  EXPECT_TRUE(verilog.hasAllGenericsDefined()) << "C has a default, though not one the extractor computes";
   ExpectPorts(verilog.getPorts(), {{"sel", "wire", kIn, true, 3, 0}});
+}
+
+TEST_F(PortExtractorTest, DefaultsThatCannotBeComputedLeaveOnlyThePortsThatUseThemWithoutRange) {
+  Add("cpu.v", R"(
+`define XLEN 32
+module cpu #(parameter RESET_VECTOR = {16'h0, 16'h100}, WIDTH = `XLEN, DEPTH = 4,
+             parameter [7:0] MODE = "A")
+  (input clk,
+   input [DEPTH-1:0] irq,
+   output [WIDTH-1:0] addr,
+   output [$clog2(DEPTH):0] level);
+endmodule
+)",
+      PepExtractor::kVerilog);
+  ParseAndFindTop();
+  EXPECT_TRUE(extractor_.hasAllGenericsDefined());
+  ExpectPorts(extractor_.getPorts(), {{"clk", "wire", kIn, false, 0, 0},
+                                      {"irq", "wire", kIn, true, 3, 0},
+                                      {"addr", "wire", kOut, false, 0, 0},
+                                      {"level", "wire", kOut, true, 2, 0}});
 }
 
 TEST_F(PortExtractorTest, RangesThatCannotBeEvaluatedLeaveThePortWithoutRange) {
@@ -275,7 +295,7 @@ endmodule
 )",
       PepExtractor::kVerilog);
   ParseAndFindTop();
-  EXPECT_FALSE(extractor_.hasAllGenericsDefined()) << "HUGE does not fit 32 bits";
+  EXPECT_TRUE(extractor_.hasAllGenericsDefined()) << "HUGE does not fit 32 bits, but it has a default";
   ExpectPorts(extractor_.getPorts(), {{"by_macro", "wire", kIn, false, 0, 0},
                                       {"by_zero", "wire", kIn, false, 0, 0},
                                       {"too_big", "wire", kIn, false, 0, 0},
@@ -384,7 +404,7 @@ TEST_F(PortExtractorTest, BadInputNeverCrashesAndReadsWhatItCan) {
   ExpectPorts(extractor_.getPorts(), {{"a", "bit_vector", kIn, false, 0, 0}, {"b", "bit", kIn, false, 0, 0}});
   ASSERT_EQ(extractor_.findDesignUnit("work", "deep_v", PepExtractor::kSearchExactName),
             PepExtractor::kUnitFound);
-  EXPECT_FALSE(extractor_.hasAllGenericsDefined());
+  EXPECT_TRUE(extractor_.getPorts().empty()) << "the unclosed default takes the port list with it";
   ASSERT_EQ(extractor_.findDesignUnit("work", "strings", PepExtractor::kSearchExactName),
             PepExtractor::kUnitFound);
   ExpectPorts(extractor_.getPorts(), {{"s", "string", kIn, false, 0, 0}, {"t", "bit", kIn, false, 0, 0}});
