@@ -88,6 +88,14 @@ CParserConfigHolder* CHdlFile::GetHolder() const {
   return Prjrep::ObjectCast<CParserConfigHolder>(holder_.Get());
 }
 
+void CHdlFile::ExtractPorts(IHdlDesignUnit* unit, IHdlPortIterator** out) {
+  CParserConfigHolder* holder = GetHolder();
+  if (!holder) return;
+  // The holder stays for the whole extraction even if the file is let go meanwhile.
+  Prjrep::AutoPtr<CitI::IInterface> heldHolder(holder);
+  holder->ExtractPorts(unit, out);
+}
+
 IHdlDesignUnitSet* CHdlFile::GetUnitSet() const {
   CParserConfigHolder* holder = GetHolder();
   return holder ? holder->GetUnitSet() : nullptr;

@@ -19,6 +19,7 @@
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/TFace.h"
 #include "Prjrep/TRefCountHelper.h"
+#include "SourceFileLink.h"
 
 namespace Vad {
 
@@ -29,7 +30,7 @@ class CParserConfigHolder;
 // QueryInterface answers, in this order, IInterface (the object itself), IHdlFile, IHdlFileV3,
 // IFileCompReference, Prjrep::IRefCount, ICompAdmin, Prjrep::IFileNameHelper and
 // ISourceLibraryMember.
-class CHdlFile final : public CitI::IInterface {
+class CHdlFile final : public CitI::IInterface, public SourceFileLink {
  public:
   // Needs a parse; makes its holder and, through the registry, its file-name helper.
   CHdlFile();
@@ -54,9 +55,11 @@ class CHdlFile final : public CitI::IInterface {
   CParserConfigBase* GetParserConfig() const;
   CParserConfigHolder* GetHolder() const;
   // The units of the last parse (no reference added), or null without a holder.
-  IHdlDesignUnitSet* GetUnitSet() const;
+  IHdlDesignUnitSet* GetUnitSet() const override;
   // The file type with one reference for the caller, or null.
-  Prjrep::AutoPtr<IFileType> GetFileType() const { return fileType_; }
+  Prjrep::AutoPtr<IFileType> GetFileType() const override { return fileType_; }
+  // Through the holder's parser factory; nothing without a holder.
+  void ExtractPorts(IHdlDesignUnit* unit, IHdlPortIterator** out) override;
 
   // Path parts from the file-name helper; empty without one.
   void GetFullPath(Port::StringBase& out) const;
@@ -65,7 +68,7 @@ class CHdlFile final : public CitI::IInterface {
   // The base name, plus "." and the extension when there is one.
   void GetFileNamePart(Port::StringBase& out) const;
   // Directory followed by file name, as getFileName gives them; false without a helper.
-  bool GetFullFileName(Port::StringBase& out) const;
+  bool GetFullFileName(Port::StringBase& out) const override;
   // The source library's name; "work" when the file has none.
   void GetLibraryName(Port::StringBase& out) const;
   const Port::StringBase& GetPluginName() const { return pluginName_; }

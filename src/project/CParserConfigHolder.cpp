@@ -18,7 +18,7 @@
 #include "Library.h"
 #include "PackageBody.h"
 #include "PackageDecl.h"
-#include "Parser.h"
+#include "ParserFactory.h"
 #include "Port/InitObjects.h"
 #include "Prjrep/TSequenceSetHelper.h"
 #include "Use.h"
@@ -429,6 +429,12 @@ void CParserConfigHolder::SetEntityPortFlag(bool flag) {
 
 // ---- the parse run -------------------------------------------------------------------------------
 
+void CParserConfigHolder::InstallParserFactory(const ParserFactory* factory) { parserFactory_ = factory; }
+
+void CParserConfigHolder::ExtractPorts(IHdlDesignUnit* unit, IHdlPortIterator** out) {
+  if (parserFactory_) parserFactory_->ExtractPorts(*this, unit, out);
+}
+
 const SiblingPaths& CParserConfigHolder::GetSiblingPaths() const {
   static const SiblingPaths kNone;
   return siblingPaths_ ? *siblingPaths_ : kNone;
@@ -465,12 +471,7 @@ void CParserConfigHolder::EndParse() {
 
 CitI::Result CParserConfigHolder::Parse(IHdlFileIterator* projectFiles) {
   BeginParse(projectFiles);
-  Port::StringBase edifSelection;
-  GetEdifSelection(edifSelection);
-  std::unique_ptr<Parser> parser = CreateParser(edifSelection, *this);
-  if (!parser) return CitI::kFail;
-  parser->Parse(*this);
-  parser.reset();
+  if (!parserFactory_ || !parserFactory_->Parse(*this)) return CitI::kFail;
   EndParse();
   return CitI::kOk;
 }

@@ -32,6 +32,9 @@ class generic;
 class CompInst;
 class EntityInst;
 class IHdlFileIterator;
+class IHdlDesignUnit;
+class IHdlPortIterator;
+class ParserFactory;
 
 class CParserConfigHolder final : public CitI::IInterface {
  public:
@@ -113,8 +116,14 @@ class CParserConfigHolder final : public CitI::IInterface {
   // The record entered under exactly `key` during the running parse, or null.
   CHdlElement* FindRecorded(const Port::StringBase& key) const;
 
-  // The parse run: BeginParse, the file's parser, EndParse. `projectFiles` may be null.
+  // The factory every holder's parse and port query goes to; the module's entry installs it
+  // (not owned; it lives as long as the module).
+  static void InstallParserFactory(const ParserFactory* factory);
+  // The parse run: BeginParse, the file's parser, EndParse. `projectFiles` may be null. 0 when no
+  // parser could be made.
   CitI::Result Parse(IHdlFileIterator* projectFiles);
+  // The ports of `unit` as the parser of the file's plug-in name extracts them.
+  void ExtractPorts(IHdlDesignUnit* unit, IHdlPortIterator** out);
   void BeginParse(IHdlFileIterator* projectFiles);
   void EndParse();
   // Whether the last parse is still valid for this project file list (null: none).
@@ -146,6 +155,8 @@ class CParserConfigHolder final : public CitI::IInterface {
   // Re-registers an instance under its first label.
   void RenameInstance(CHdlElement* instance, const Port::StringBase& label);
   void CopyInstance(const Port::StringBase& label);
+
+  static inline const ParserFactory* parserFactory_ = nullptr;
 
   CHdlFile* file_ = nullptr;
   Port::StringBase signature_;

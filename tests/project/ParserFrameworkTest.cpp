@@ -15,6 +15,7 @@
 #include "Parser.h"
 #include "PipelineFixtures.h"
 #include "PlxParser.h"
+#include "PluginParserFactory.h"
 #include "Port/Env.h"
 #include "Port/MsgManData.h"
 #include "SchematicParser.h"
