@@ -10,7 +10,6 @@
 #include "EdifParser.h"
 #include "EdifParserEx.h"
 #include "EdifParserPlx.h"
-#include "FsmdrawParser.h"
 #include "GenericParser.h"
 #include "HrfParser.h"
 #include "PlxParser.h"
@@ -78,7 +77,7 @@ const PluginEntry kPlugins[] = {
     {"PLUGIN_AbelVector", [](const Port::StringBase&) { return Make<AbelVectorParser>(); }},
     {"PLUGIN_Schematic", [](const Port::StringBase&) { return Make<SchematicParser>(); }},
     {"PLUGIN_Waver", [](const Port::StringBase&) { return Make<WaverParser>(); }},
-    {"PLUGIN_Fsmdraw", [](const Port::StringBase&) { return Make<FsmdrawParser>(); }},
+    {"PLUGIN_Fsmdraw", [](const Port::StringBase&) { return Make<SingleModuleParser>(); }},
     {"PLUGIN_General", [](const Port::StringBase&) { return Make<GenericParser>(); }},
 };
 
