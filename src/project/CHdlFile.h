@@ -18,6 +18,7 @@
 #include "Port/StringBase.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/TFace.h"
+#include "Prjrep/TFileNameHelperFace.h"
 #include "Prjrep/TRefCountHelper.h"
 #include "SourceFileLink.h"
 
@@ -141,33 +142,6 @@ class CHdlFile final : public CitI::IInterface, public SourceFileLink {
     CitI::Result Reserved5() override { return CitI::kNotImpl; }
   };
 
-  // Hands every operation to the file's own helper; kFail when the file has none.
-  class XIFileNameHelper final : public Prjrep::TFace<Prjrep::IFileNameHelper, CHdlFile> {
-   public:
-    using TFace::TFace;
-    CitI::Result SetFilePath(const Port::StringBase& path, const Port::StringBase& baseDir,
-                             const Port::StringBase& cwd) override;
-    CitI::Result GetFilePath(Port::StringBase* out) override;
-    CitI::Result GetDirectory(Port::StringBase* out) override;
-    CitI::Result GetFileName(Port::StringBase* out) override;
-    CitI::Result IsAbsolute(bool* out) override;
-    CitI::Result Exists(bool* out) override;
-    CitI::Result GetFullPath(Port::StringBase* out) override;
-    CitI::Result GetModificationTime(std::int64_t* seconds) override;
-    CitI::Result GetRelativePath(const Port::StringBase& baseDir, Port::StringBase* out) override;
-    CitI::Result GetBaseName(Port::StringBase* out) override;
-    CitI::Result GetExtension(Port::StringBase* out) override;
-    CitI::Result SetExtension(const Port::StringBase& extension) override;
-    CitI::Result HasExtension(const Port::StringBase& extension, bool* out) override;
-    CitI::Result IsEmpty(bool* out) override;
-    CitI::Result Clear() override;
-    CitI::Result IsSameFile(Prjrep::IFileNameHelper* other, bool* out) override;
-
-   private:
-    template <class Call>
-    CitI::Result Forward(Call call);
-  };
-
   class XISourceLibraryMember final : public Prjrep::TFace<ISourceLibraryMember, CHdlFile> {
    public:
     using TFace::TFace;
@@ -181,7 +155,7 @@ class CHdlFile final : public CitI::IInterface, public SourceFileLink {
   CHdlProject* project_ = nullptr;
   Port::StringBase pluginName_;
   bool needsParse_ = true;
-  Prjrep::AutoPtr<CitI::IInterface> holder_;
+  Prjrep::AutoPtr<CParserConfigHolder> holder_;
   Prjrep::AutoPtr<Prjrep::IFileNameHelper> fileNameHelper_;
   std::uint64_t orderKey_ = 0;
   Prjrep::AutoPtr<IFileType> fileType_;
@@ -191,7 +165,8 @@ class CHdlFile final : public CitI::IInterface, public SourceFileLink {
   XIHdlFileV3 hdlFileV3Face_{this};
   XIFileCompReference fileCompReferenceFace_{this};
   XICompAdmin compAdminFace_{this};
-  XIFileNameHelper fileNameHelperFace_{this};
+  // Hands every operation to the file's own helper; kFail when the file has none.
+  Prjrep::TFileNameHelperFace<CHdlFile> fileNameHelperFace_{this, &fileNameHelper_};
   Prjrep::AutoPtr<ISourceLibrary> sourceLibrary_;
   XISourceLibraryMember sourceLibraryMemberFace_{this};
 };
