@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <utility>
 
+#include "Prjrep/RefCounting.h"
+
 namespace RavA {
 namespace {
 
@@ -14,20 +16,6 @@ struct Entry {
 std::vector<Entry>& Registry() {
   static std::vector<Entry> entries;
   return entries;
-}
-
-void AddRefFactory(CitI::IFactory* factory) {
-  if (auto* count = static_cast<CommonI::IRefCount*>(factory->QueryInterface(CommonI::IRefCount::Iid())))
-    count->AddRef();
-  else if (auto* shared = static_cast<Prjrep::IRefCount*>(factory->QueryInterface(Prjrep::IRefCount::Iid())))
-    shared->AddRef();
-}
-
-void ReleaseFactory(CitI::IFactory* factory) {
-  if (auto* count = static_cast<CommonI::IRefCount*>(factory->QueryInterface(CommonI::IRefCount::Iid())))
-    count->Release();
-  else if (auto* shared = static_cast<Prjrep::IRefCount*>(factory->QueryInterface(Prjrep::IRefCount::Iid())))
-    shared->Release();
 }
 
 std::vector<Entry>::iterator Find(const Port::XUID& classId) {
@@ -47,11 +35,11 @@ struct RegistryCleanup {
 
 bool Factory::RegisterFactory(const Port::XUID& classId, CitI::IFactory* factory) {
   if (!factory) return false;
-  AddRefFactory(factory);
+  Prjrep::AddRefOf(factory);
   auto it = Find(classId);
   if (it != Registry().end()) {
     CitI::IFactory* old = std::exchange(it->factory, factory);
-    ReleaseFactory(old);
+    Prjrep::ReleaseOf(old);
   } else {
     Registry().push_back({classId, factory});
   }
@@ -63,7 +51,7 @@ bool Factory::UnregisterFactory(const Port::XUID& classId) {
   if (it == Registry().end()) return false;
   CitI::IFactory* factory = it->factory;
   Registry().erase(it);
-  ReleaseFactory(factory);
+  Prjrep::ReleaseOf(factory);
   return true;
 }
 
@@ -84,7 +72,7 @@ std::vector<Port::XUID> Factory::RegisteredClasses() {
 void Factory::Clear() {
   std::vector<Entry> entries;
   entries.swap(Registry());
-  for (Entry& e : entries) ReleaseFactory(e.factory);
+  for (Entry& e : entries) Prjrep::ReleaseOf(e.factory);
 }
 
 }  // namespace RavA

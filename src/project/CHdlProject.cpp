@@ -130,16 +130,13 @@ CitI::Result CHdlProject::getElaborator(CElaborator** out) {
   if (!out) return CitI::kInvalidArg;
   *out = nullptr;
   if (!elaborator_) elaborator_.Attach(new (std::nothrow) CElaborator());
-  auto* elaborator = Prjrep::ObjectCast<CElaborator>(elaborator_.Get());
-  if (!elaborator) return CitI::kFail;
-  Prjrep::AddRefOf(elaborator);
-  *out = elaborator;
-  return CitI::kOk;
+  if (!elaborator_) return CitI::kFail;
+  return elaborator_.CopyTo(out);
 }
 
 CLibRefs* CHdlProject::getLibraryReferences() {
   if (!libraryReferences_) libraryReferences_.Attach(new CLibRefs());
-  auto* libraryReferences = Prjrep::ImplementationCast<CLibRefs>(libraryReferences_.Get());
+  CLibRefs* libraryReferences = libraryReferences_.Get();
   if (CParserConfigBase* config = GetParserConfigObject()) {
     Port::StringBase family;
     config->GetPropertyValue(kFamilyProperty, family);
