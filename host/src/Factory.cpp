@@ -20,8 +20,7 @@ std::vector<Entry>& Registry() {
 
 std::vector<Entry>::iterator Find(const Port::XUID& classId) {
   auto& entries = Registry();
-  return std::find_if(entries.begin(), entries.end(),
-                      [&](const Entry& e) { return e.classId == classId; });
+  return std::find_if(entries.begin(), entries.end(), [&](const Entry& e) { return e.classId == classId; });
 }
 
 // Releases the remaining factories when the host library is unloaded.

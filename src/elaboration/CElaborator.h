@@ -106,7 +106,8 @@ class CElaborator final : public CitI::IInterface {
   // project, asking `libraryReferences` (the project's, at its device family) about units the
   // project does not hold. On success `root` receives the unnamed root with one reference for
   // the caller.
-  CitI::Result Elaborate(CLibRefs* libraryReferences, IHdlDesignUnitIterator* elements, IHdlNetListNode** root);
+  CitI::Result Elaborate(CLibRefs* libraryReferences, IHdlDesignUnitIterator* elements,
+                         IHdlNetListNode** root);
   // Puts one placeholder node per VHDL or Verilog file without design units in front of the
   // root's children, in ascending order key. kInvalidArg without a root; without files nothing
   // is added.

@@ -17,13 +17,13 @@
 #include "PackageBody.h"
 #include "PackageDecl.h"
 #include "PluginParserFactory.h"
-#include "Use.h"
-#include "generic.h"
-#include "module.h"
 #include "Port/InitObjects.h"
 #include "Prjrep/AutoPtr.h"
 #include "RavA/Factory.h"
 #include "TFactory.h"
+#include "Use.h"
+#include "generic.h"
+#include "module.h"
 
 namespace Vad {
 namespace {

@@ -81,7 +81,6 @@ const PluginEntry kPlugins[] = {
     {"PLUGIN_General", [](const Port::StringBase&) { return Make<GenericParser>(); }},
 };
 
-
 std::unique_ptr<Parser> CreateParserOfHolder(CParserConfigHolder& holder) {
   Port::StringBase edifSelection;
   GetEdifSelection(edifSelection);

@@ -72,9 +72,9 @@ Port::StringBase CCompileOrder::DisplayNameOf(IHdlFile* file) {
   return directory;
 }
 
-CitI::Result CCompileOrder::OrderBelow(CElaborator& elaborator, CLibRefs* libraryReferences, IHdlNetListNode* start,
-                                       IHdlNetListNode* top, IHdlParserConfig* parserConfig, bool byUnit,
-                                       IHdlFileIterator** out) {
+CitI::Result CCompileOrder::OrderBelow(CElaborator& elaborator, CLibRefs* libraryReferences,
+                                       IHdlNetListNode* start, IHdlNetListNode* top,
+                                       IHdlParserConfig* parserConfig, bool byUnit, IHdlFileIterator** out) {
   if (!start || !out) return CitI::kInvalidArg;
   CCompileOrder order;
   if (!top || NetListWalk::Identity(top) == NetListWalk::Identity(start)) {
@@ -82,7 +82,8 @@ CitI::Result CCompileOrder::OrderBelow(CElaborator& elaborator, CLibRefs* librar
   }
   if (!byUnit) return order.ComputeCompileOrder(top, out);
   Prjrep::AutoPtr<IHdlNetListNode> tree;
-  CitI::Result status = CUnitTree(elaborator).BuildUnitTree(libraryReferences, start, top, parserConfig, tree);
+  CitI::Result status =
+      CUnitTree(elaborator).BuildUnitTree(libraryReferences, start, top, parserConfig, tree);
   if (status != CitI::kOk) return status;
   return order.ComputeCompileOrder(tree.Get(), out);
 }

@@ -41,8 +41,8 @@ Prjrep::AutoRelease<IHdlDesignUnitIterator> IterateMarkedUnits(const UnitMarks& 
 
 }  // namespace
 
-CitI::Result CUnitTree::BuildUnitTree(CLibRefs* libraryReferences, IHdlNetListNode* start, IHdlNetListNode* top,
-                                      IHdlParserConfig* parserConfig,
+CitI::Result CUnitTree::BuildUnitTree(CLibRefs* libraryReferences, IHdlNetListNode* start,
+                                      IHdlNetListNode* top, IHdlParserConfig* parserConfig,
                                       Prjrep::AutoPtr<IHdlNetListNode>& tree) {
   if (!libraryReferences || !start || !top || !parserConfig) return CitI::kInvalidArg;
   ElementSet extra;

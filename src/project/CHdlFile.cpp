@@ -83,9 +83,7 @@ CParserConfigBase* CHdlFile::GetParserConfig() const {
   return project_ ? project_->GetParserConfigObject() : nullptr;
 }
 
-CParserConfigHolder* CHdlFile::GetHolder() const {
-  return holder_.Get();
-}
+CParserConfigHolder* CHdlFile::GetHolder() const { return holder_.Get(); }
 
 void CHdlFile::ExtractPorts(IHdlDesignUnit* unit, IHdlPortIterator** out) {
   CParserConfigHolder* holder = GetHolder();

@@ -321,8 +321,8 @@ CitI::Result CHdlProject::getCompileOrder(IHdlNetListNode* top, IHdlFileIterator
   Prjrep::AutoRelease<CElaborator> elaborator;
   status = getElaborator(elaborator.Out());
   if (status != CitI::kOk) return status;
-  return CCompileOrder::OrderBelow(*elaborator.Get(), getLibraryReferences(), root.Get(), top, parserConfig_.Get(), true,
-                                   out);
+  return CCompileOrder::OrderBelow(*elaborator.Get(), getLibraryReferences(), root.Get(), top,
+                                   parserConfig_.Get(), true, out);
 }
 
 CitI::Result CHdlProject::getCompileOrderByDU(IHdlDesignUnit* unit, bool byUnit, IHdlFileIterator** out) {
@@ -343,13 +343,15 @@ CitI::Result CHdlProject::getCompileOrderByDU(IHdlDesignUnit* unit, bool byUnit,
 
   CLibRefs* references = getLibraryReferences();
   IHdlParserConfig* config = parserConfig_.Get();
-  if (!byUnit) return CCompileOrder::OrderBelow(*elaborator.Get(), references, root.Get(), node, config, true, out);
+  if (!byUnit)
+    return CCompileOrder::OrderBelow(*elaborator.Get(), references, root.Get(), node, config, true, out);
   switch (element->GetType()) {
     case DbType::kModule:
       *out = IterateOwnFile(element).Detach();
       return CitI::kOk;
     case DbType::kEntity:
-      return CCompileOrder::OrderBelow(*elaborator.Get(), references, root.Get(), root.Get(), config, false, out);
+      return CCompileOrder::OrderBelow(*elaborator.Get(), references, root.Get(), root.Get(), config, false,
+                                       out);
     case DbType::kArchitecture: {
       IHdlNetListNode* entity = FirstEntityChild(node);
       if (!entity) return kUnitNotInTree;

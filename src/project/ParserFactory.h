@@ -17,7 +17,8 @@ class ParserFactory {
   // parser could be made.
   virtual bool Parse(CParserConfigHolder& holder) const = 0;
   // Has that parser fill the port set of one unit of the holder's file; its result is not used.
-  virtual void ExtractPorts(CParserConfigHolder& holder, IHdlDesignUnit* unit, IHdlPortIterator** out) const = 0;
+  virtual void ExtractPorts(CParserConfigHolder& holder, IHdlDesignUnit* unit,
+                            IHdlPortIterator** out) const = 0;
 
  protected:
   ParserFactory() = default;

@@ -20,7 +20,9 @@ namespace {
 constexpr std::uint32_t kKindsWithUnitFlag = DbType::kEntity | DbType::kArchitecture | DbType::kModule;
 
 // Queries that need the unit's source file; a file link that is no source file answers nothing.
-SourceFileLink* SourceFileOf(CitI::IInterface* fileLink) { return Prjrep::ObjectCast<SourceFileLink>(fileLink); }
+SourceFileLink* SourceFileOf(CitI::IInterface* fileLink) {
+  return Prjrep::ObjectCast<SourceFileLink>(fileLink);
+}
 
 bool IsSourceFile(CitI::IInterface* fileLink) { return SourceFileOf(fileLink) != nullptr; }
 

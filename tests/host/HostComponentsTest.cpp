@@ -11,13 +11,13 @@
 #include "IDesignUnitTypeStore.h"
 #include "IEventSender.h"
 #include "IFile.h"
-#include "ScopedTempDir.h"
 #include "IFileNameHelper.h"
 #include "IName.h"
 #include "ISourceLibrary.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/Casts.h"
 #include "RavA/Factory.h"
+#include "ScopedTempDir.h"
 
 namespace {
 

@@ -9,7 +9,6 @@
 #include <string_view>
 #include <vector>
 
-#include "ScopedEnv.h"
 #include "CLibLoader.h"
 #include "CLibRefs.h"
 #include "Host/PropertyInstance.h"
@@ -18,6 +17,7 @@
 #include "Port/StringBase.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/Casts.h"
+#include "ScopedEnv.h"
 #include "rudiva/RudIva.h"
 
 namespace libref_test {
