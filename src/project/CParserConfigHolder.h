@@ -142,8 +142,9 @@ class CParserConfigHolder final : public CitI::IInterface {
   // Clears every plain pointer into the recorded units.
   void ForgetParseState();
   bool IsEnabled(TypeSlot slot) const { return typeEnabled_[slot]; }
-  // Gives the new `record` (whose creation reference this call ends) its file, line and type and
-  // registers it under `key`. False, with the record gone unless a parent keeps it, when refused.
+  // Gives the new `record` its file, line and type and registers it under `key`, where the holder
+  // keeps a reference of its own. False when refused: the record then lives only as long as its
+  // creator's reference (or a parent's).
   bool Enter(CHdlElement* record, const Port::StringBase& key, std::uint32_t line, const Port::XUID& type);
   // The new unit's use list becomes the pending context, which is emptied.
   void TakePendingContext(CHdlElement* unit);
