@@ -4,8 +4,8 @@
 #include <cstdint>
 
 #include "CitI.h"
-#include "Identifiers.h"
 #include "IPersist.h"
+#include "Identifiers.h"
 #include "Port/StringBase.h"
 
 namespace Prjrep {

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <utility>
 
+#include "Prjrep/RefCounting.h"
+
 namespace RavA {
 namespace {
 
@@ -16,24 +18,9 @@ std::vector<Entry>& Registry() {
   return entries;
 }
 
-void AddRefFactory(CitI::IFactory* factory) {
-  if (auto* count = static_cast<CommonI::IRefCount*>(factory->QueryInterface(CommonI::IRefCount::Iid())))
-    count->AddRef();
-  else if (auto* shared = static_cast<Prjrep::IRefCount*>(factory->QueryInterface(Prjrep::IRefCount::Iid())))
-    shared->AddRef();
-}
-
-void ReleaseFactory(CitI::IFactory* factory) {
-  if (auto* count = static_cast<CommonI::IRefCount*>(factory->QueryInterface(CommonI::IRefCount::Iid())))
-    count->Release();
-  else if (auto* shared = static_cast<Prjrep::IRefCount*>(factory->QueryInterface(Prjrep::IRefCount::Iid())))
-    shared->Release();
-}
-
 std::vector<Entry>::iterator Find(const Port::XUID& classId) {
   auto& entries = Registry();
-  return std::find_if(entries.begin(), entries.end(),
-                      [&](const Entry& e) { return e.classId == classId; });
+  return std::find_if(entries.begin(), entries.end(), [&](const Entry& e) { return e.classId == classId; });
 }
 
 // Releases the remaining factories when the host library is unloaded.
@@ -47,11 +34,11 @@ struct RegistryCleanup {
 
 bool Factory::RegisterFactory(const Port::XUID& classId, CitI::IFactory* factory) {
   if (!factory) return false;
-  AddRefFactory(factory);
+  Prjrep::AddRefOf(factory);
   auto it = Find(classId);
   if (it != Registry().end()) {
     CitI::IFactory* old = std::exchange(it->factory, factory);
-    ReleaseFactory(old);
+    Prjrep::ReleaseOf(old);
   } else {
     Registry().push_back({classId, factory});
   }
@@ -63,7 +50,7 @@ bool Factory::UnregisterFactory(const Port::XUID& classId) {
   if (it == Registry().end()) return false;
   CitI::IFactory* factory = it->factory;
   Registry().erase(it);
-  ReleaseFactory(factory);
+  Prjrep::ReleaseOf(factory);
   return true;
 }
 
@@ -84,7 +71,7 @@ std::vector<Port::XUID> Factory::RegisteredClasses() {
 void Factory::Clear() {
   std::vector<Entry> entries;
   entries.swap(Registry());
-  for (Entry& e : entries) ReleaseFactory(e.factory);
+  for (Entry& e : entries) Prjrep::ReleaseOf(e.factory);
 }
 
 }  // namespace RavA

@@ -44,9 +44,9 @@ bool XUID::Parse(std::string_view text, XUID& out) {
 
 XUID XUID::New() {
   static std::atomic<std::uint64_t> sequence{0};
-  thread_local std::mt19937_64 engine{std::random_device{}() ^
-                                      static_cast<std::uint64_t>(
-                                          std::chrono::steady_clock::now().time_since_epoch().count())};
+  thread_local std::mt19937_64 engine{
+      std::random_device{}() ^
+      static_cast<std::uint64_t>(std::chrono::steady_clock::now().time_since_epoch().count())};
   // The sequence number guarantees uniqueness within the process; the random words make
   // collisions across processes unlikely.
   std::uint64_t high = engine();
@@ -61,8 +61,7 @@ std::string XUID::ToString() const {
   char text[39];
   std::snprintf(text, sizeof text, "{%08X-%04X-%04X-%04X-%012llX}", static_cast<unsigned>(high_ >> 32),
                 static_cast<unsigned>((high_ >> 16) & 0xFFFF), static_cast<unsigned>(high_ & 0xFFFF),
-                static_cast<unsigned>(low_ >> 48),
-                static_cast<unsigned long long>(low_ & 0xFFFFFFFFFFFFull));
+                static_cast<unsigned>(low_ >> 48), static_cast<unsigned long long>(low_ & 0xFFFFFFFFFFFFull));
   return text;
 }
 

@@ -7,8 +7,6 @@
 #include "Arch.h"
 #include "ArchitectureChoice.h"
 #include "CHdlElement.h"
-#include "CHdlFile.h"
-#include "CHdlProject.h"
 #include "CLibRefs.h"
 #include "CNetListNode.h"
 #include "CVhdlDU.h"
@@ -23,6 +21,7 @@
 #include "Port/InitObjects.h"
 #include "Port/MsgManData.h"
 #include "Prjrep/Casts.h"
+#include "SourceFileLink.h"
 #include "Use.h"
 
 namespace Vad {
@@ -555,13 +554,10 @@ CitI::Result CElaborator::ProcessElement(CElabTables& tables, const Port::String
 
 // ---- the run -------------------------------------------------------------------------------------
 
-CitI::Result CElaborator::Elaborate(CitI::IInterface* project, IHdlDesignUnitIterator* elements,
+CitI::Result CElaborator::Elaborate(CLibRefs* libraryReferences, IHdlDesignUnitIterator* elements,
                                     IHdlNetListNode** root) {
   Prjrep::AutoOut<IHdlNetListNode> out(root);
-  if (!project || !elements || out.IsMissing()) return CitI::kInvalidArg;
-  auto* hdlProject = Prjrep::ObjectCast<CHdlProject>(project);
-  CLibRefs* libraryReferences = hdlProject ? hdlProject->getLibraryReferences() : nullptr;
-  if (!libraryReferences) return CitI::kFail;
+  if (!libraryReferences || !elements || out.IsMissing()) return CitI::kInvalidArg;
 
   CElabTables tables;
   DuplicateList duplicates;
@@ -591,7 +587,7 @@ struct MissingFile {
   Port::StringBase fullName;
 };
 
-bool HasNoDesignUnit(CHdlFile* file) {
+bool HasNoDesignUnit(SourceFileLink* file) {
   IHdlDesignUnitSet* units = file->GetUnitSet();
   Prjrep::AutoRelease<IHdlDesignUnitIterator> unit;
   if (!units || units->CreateIterator(unit.Out()) != CitI::kOk || !unit) return true;
@@ -607,15 +603,15 @@ std::vector<MissingFile> FilesWithoutUnits(IHdlFileIterator* files) {
   std::vector<MissingFile> missing;
   for (files->First(); !files->IsDone(); files->Next()) {
     IHdlFile* file = files->Current();
-    auto* hdlFile = Prjrep::ObjectCast<CHdlFile>(file);
-    if (!hdlFile) continue;
+    auto* sourceFile = Prjrep::ObjectCast<SourceFileLink>(file);
+    if (!sourceFile) continue;
     Port::StringBase plugin;
     file->getPluginName(&plugin);
     if (plugin != "PLUGIN_Vhdl" && plugin != "PLUGIN_Verilog") continue;
-    if (!HasNoDesignUnit(hdlFile)) continue;
+    if (!HasNoDesignUnit(sourceFile)) continue;
     MissingFile entry{file, 0, {}};
     file->getOrderKey(&entry.orderKey);
-    hdlFile->GetFullFileName(entry.fullName);
+    sourceFile->GetFullFileName(entry.fullName);
     missing.push_back(std::move(entry));
   }
   // Ascending order key; equal keys by name, so the result does not depend on addresses.

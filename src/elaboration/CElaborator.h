@@ -106,18 +106,15 @@ class CElaborator final : public CitI::IInterface {
 
   // ---- what the project calls ----
   // Registers and resolves every unit of `elements` and builds the hierarchy tree of the
-  // project (`project`: the CHdlProject, which supplies the library references). On success
-  // `root` receives the unnamed root with one reference for the caller.
-  CitI::Result Elaborate(CitI::IInterface* project, IHdlDesignUnitIterator* elements, IHdlNetListNode** root);
+  // project, asking `libraryReferences` (the project's, at its device family) about units the
+  // project does not hold. On success `root` receives the unnamed root with one reference for
+  // the caller.
+  CitI::Result Elaborate(CLibRefs* libraryReferences, IHdlDesignUnitIterator* elements,
+                         IHdlNetListNode** root);
   // Puts one placeholder node per VHDL or Verilog file without design units in front of the
   // root's children, in ascending order key. kInvalidArg without a root; without files nothing
   // is added.
   CitI::Result AddMissingFileNodes(IHdlNetListNode* root, IHdlFileIterator* files);
-  // The compile order of the source files below `start` (or below `top` when it is given and
-  // differs; with `byUnit` set, below the reduced tree of the unit at `top`). `out` receives an
-  // iterator over the ordered files. Start node and out-parameter are required (kInvalidArg).
-  CitI::Result GetCompileOrder(IHdlProject* project, IHdlNetListNode* start, IHdlNetListNode* top,
-                               IHdlParserConfig* parserConfig, bool byUnit, IHdlFileIterator** out);
 
   // ---- the phases of an elaboration, on one tables object ----
   // Registers every unit of `elements` except generics; renamed duplicates go to `duplicates`.

@@ -7,7 +7,6 @@
 #include "IHdlFile.h"
 #include "Identifiers.h"
 #include "Port/InitObjects.h"
-#include "Prjrep/RefCounting.h"
 
 namespace Vad {
 namespace {
@@ -29,8 +28,10 @@ CitI::Result CopyText(const Port::StringBase& text, Port::StringBase* out) {
 template <bool kHoldsReferences>
 CitI::Result TNetListNodeList<kHoldsReferences>::Insert(std::size_t index, IHdlNetListNode* node) {
   if (!node) return CitI::kInvalidArg;
-  if constexpr (kHoldsReferences) Prjrep::AddRefOf(node);
-  nodes_.insert(nodes_.begin() + static_cast<std::ptrdiff_t>(std::min(index, nodes_.size())), node);
+  const auto offset = static_cast<std::ptrdiff_t>(std::min(index, nodes_.size()));
+  if constexpr (kHoldsReferences)
+    references_.insert(references_.begin() + offset, Prjrep::AutoPtr<IHdlNetListNode>(node));
+  nodes_.insert(nodes_.begin() + offset, node);
   return CitI::kOk;
 }
 
@@ -38,19 +39,22 @@ template <bool kHoldsReferences>
 CitI::Result TNetListNodeList<kHoldsReferences>::Remove(IHdlNetListNodeIterator* position) {
   auto* own = Prjrep::OwnIterator(this, position);
   if (!own) return CitI::kFail;
-  IHdlNetListNode* node = nodes_[own->position()];
-  nodes_.erase(nodes_.begin() + static_cast<std::ptrdiff_t>(own->position()));
-  if constexpr (kHoldsReferences) Prjrep::ReleaseOf(node);
+  const auto offset = static_cast<std::ptrdiff_t>(own->position());
+  nodes_.erase(nodes_.begin() + offset);
+  if constexpr (kHoldsReferences) {
+    // Released after the entry is gone, as the node may take the list's owner with it.
+    Prjrep::AutoPtr<IHdlNetListNode> released = std::move(references_[offset]);
+    references_.erase(references_.begin() + offset);
+  }
   return CitI::kOk;
 }
 
 template <bool kHoldsReferences>
 CitI::Result TNetListNodeList<kHoldsReferences>::Clear() {
-  std::vector<IHdlNetListNode*> released;
-  released.swap(nodes_);
-  if constexpr (kHoldsReferences) {
-    for (IHdlNetListNode* node : released) Prjrep::ReleaseOf(node);
-  }
+  nodes_.clear();
+  // Released after the list is empty, in list order.
+  std::vector<Prjrep::AutoPtr<IHdlNetListNode>> released;
+  released.swap(references_);
   return CitI::kOk;
 }
 

@@ -57,6 +57,8 @@ class TNetListNodeList : public Prjrep::TSetHelper<IHdlNetListNodeSet> {
   CitI::Result Insert(std::size_t index, IHdlNetListNode* node);
 
   std::vector<IHdlNetListNode*> nodes_;
+  // The child list's references, entry for entry beside nodes_; empty in a parent list.
+  std::vector<Prjrep::AutoPtr<IHdlNetListNode>> references_;
 };
 
 extern template class TNetListNodeList<true>;

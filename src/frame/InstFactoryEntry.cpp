@@ -16,13 +16,14 @@
 #include "Library.h"
 #include "PackageBody.h"
 #include "PackageDecl.h"
-#include "Use.h"
-#include "generic.h"
-#include "module.h"
+#include "PluginParserFactory.h"
 #include "Port/InitObjects.h"
 #include "Prjrep/AutoPtr.h"
 #include "RavA/Factory.h"
 #include "TFactory.h"
+#include "Use.h"
+#include "generic.h"
+#include "module.h"
 
 namespace Vad {
 namespace {
@@ -86,9 +87,16 @@ void RegisterClass(const ClassEntry& entry) {
   if (RavA::Factory::RegisterFactory(entry.classId(), asFactory)) RegisteredHere().push_back(entry.classId());
 }
 
+// The parsers live above the project; every holder made from here on parses through them.
+void InstallParsers() {
+  static const PluginParserFactory parsers;
+  CParserConfigHolder::InstallParserFactory(&parsers);
+}
+
 }  // namespace
 }  // namespace Vad
 
 extern "C" __attribute__((visibility("default"))) void InstFactoryEntry() {
+  Vad::InstallParsers();
   for (const Vad::ClassEntry& entry : Vad::kClasses) Vad::RegisterClass(entry);
 }

@@ -5,29 +5,35 @@
 
 namespace Vad {
 
-CBasecellLoader::CBasecellLoader() : CLibLoader("basecell", "chdp.ini", RudIva::kSynthesisLibraries) {}
+struct BasecellLibrary {
+  static constexpr const char* kName = "basecell";
+  static constexpr const char* kMappingFile = "chdp.ini";
+  static constexpr int kNodeFileMode = RudIva::kSynthesisLibraries;
 
-Port::StringBase CBasecellLoader::FamilyTestFile(const Port::StringBase& family) const {
-  Port::StringBase name;
-  name.Format("../%s/vhdl/syn/basecell/arch.vho", family.c_str());
-  return name;
-}
+  static Port::StringBase FamilyTestFile(const Port::StringBase& family) {
+    Port::StringBase name;
+    name.Format("../%s/vhdl/syn/basecell/arch.vho", family.c_str());
+    return name;
+  }
 
-Port::StringBase CBasecellLoader::FamilyDirectory(const Port::StringBase& family) const {
-  Port::StringBase directory;
-  directory.Format("$CORVANE/%s/vhdl/syn/basecell", family.c_str());
-  return directory;
-}
+  static Port::StringBase FamilyDirectory(const Port::StringBase& family) {
+    Port::StringBase directory;
+    directory.Format("$CORVANE/%s/vhdl/syn/basecell", family.c_str());
+    return directory;
+  }
 
-Port::StringBase CBasecellLoader::DefaultDirectory() const { return "$CORVANE/vhdl/syn/basecell"; }
+  static Port::StringBase DefaultDirectory() { return "$CORVANE/vhdl/syn/basecell"; }
 
-Port::StringBase CBasecellLoader::MappingTextFor(const Port::StringBase& libraryDirectory) const {
-  Port::StringBase text;
-  AppendMapping(text, "std", "$CORVANE/vhdl/syn/std");
-  AppendMapping(text, "ieee", "$CORVANE/vhdl/syn/ieee");
-  AppendMapping(text, "basecell", libraryDirectory);
-  AppendFurtherSynthesisLibraries(text);
-  return text;
-}
+  static Port::StringBase MappingTextFor(const Port::StringBase& libraryDirectory) {
+    Port::StringBase text;
+    CLibLoader::AppendMapping(text, "std", "$CORVANE/vhdl/syn/std");
+    CLibLoader::AppendMapping(text, "ieee", "$CORVANE/vhdl/syn/ieee");
+    CLibLoader::AppendMapping(text, "basecell", libraryDirectory);
+    CLibLoader::AppendFurtherSynthesisLibraries(text);
+    return text;
+  }
+};
+
+template class TCellLibraryLoader<BasecellLibrary>;
 
 }  // namespace Vad

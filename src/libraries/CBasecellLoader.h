@@ -5,15 +5,8 @@
 
 namespace Vad {
 
-class CBasecellLoader final : public CLibLoader {
- public:
-  CBasecellLoader();
-
- protected:
-  Port::StringBase FamilyTestFile(const Port::StringBase& family) const override;
-  Port::StringBase FamilyDirectory(const Port::StringBase& family) const override;
-  Port::StringBase DefaultDirectory() const override;
-  Port::StringBase MappingTextFor(const Port::StringBase& libraryDirectory) const override;
-};
+struct BasecellLibrary;
+using CBasecellLoader = TCellLibraryLoader<BasecellLibrary>;
+extern template class TCellLibraryLoader<BasecellLibrary>;
 
 }  // namespace Vad

@@ -5,15 +5,8 @@
 
 namespace Vad {
 
-class CBlockcellLoader final : public CLibLoader {
- public:
-  CBlockcellLoader();
-
- protected:
-  Port::StringBase FamilyTestFile(const Port::StringBase& family) const override;
-  Port::StringBase FamilyDirectory(const Port::StringBase& family) const override;
-  Port::StringBase DefaultDirectory() const override;
-  Port::StringBase MappingTextFor(const Port::StringBase& libraryDirectory) const override;
-};
+struct BlockcellLibrary;
+using CBlockcellLoader = TCellLibraryLoader<BlockcellLibrary>;
+extern template class TCellLibraryLoader<BlockcellLibrary>;
 
 }  // namespace Vad

@@ -37,16 +37,6 @@ class CLibLoader {
   // The exact contents Load writes into the mapping file.
   Port::StringBase MappingText() const { return MappingTextFor(EffectiveDirectory()); }
 
- protected:
-  CLibLoader(const char* libraryName, const char* mappingFileName, int nodeFileMode);
-
-  // The data file whose presence says that `family` has a library of its own; "$CORVANE" and
-  // relative names are resolved by Port_Env::GetDataFileName.
-  virtual Port::StringBase FamilyTestFile(const Port::StringBase& family) const = 0;
-  virtual Port::StringBase FamilyDirectory(const Port::StringBase& family) const = 0;
-  virtual Port::StringBase DefaultDirectory() const = 0;
-  virtual Port::StringBase MappingTextFor(const Port::StringBase& libraryDirectory) const = 0;
-
   // The maker's further device-family libraries, named in every mapping file.
   static constexpr std::array<const char*, 3> kFamilyLibraries = {"qlprim", "qlmacro", "qlio"};
 
@@ -61,6 +51,16 @@ class CLibLoader {
   // The further libraries' lines that end both synthesis mapping files.
   static void AppendFurtherSynthesisLibraries(Port::StringBase& text);
 
+ protected:
+  CLibLoader(const char* libraryName, const char* mappingFileName, int nodeFileMode);
+
+  // The data file whose presence says that `family` has a library of its own; "$CORVANE" and
+  // relative names are resolved by Port_Env::GetDataFileName.
+  virtual Port::StringBase FamilyTestFile(const Port::StringBase& family) const = 0;
+  virtual Port::StringBase FamilyDirectory(const Port::StringBase& family) const = 0;
+  virtual Port::StringBase DefaultDirectory() const = 0;
+  virtual Port::StringBase MappingTextFor(const Port::StringBase& libraryDirectory) const = 0;
+
  private:
   Port::StringBase EffectiveDirectory() const;
   void WriteMappingFile() const;
@@ -72,5 +72,45 @@ class CLibLoader {
   Port::StringBase libraryDirectory_;
   CLibRefs* references_ = nullptr;  // not owned; the references of the last Load
 };
+
+// The one declaration of the maker's cell-library loaders. `Library` describes one library: its
+// name, mapping file and node-file mode, and the four library-specific operations as static
+// functions. Its file defines it and instantiates the loader; other files see the instantiation
+// declared beside the loader's name.
+template <class Library>
+class TCellLibraryLoader final : public CLibLoader {
+ public:
+  TCellLibraryLoader();
+
+ protected:
+  Port::StringBase FamilyTestFile(const Port::StringBase& family) const override;
+  Port::StringBase FamilyDirectory(const Port::StringBase& family) const override;
+  Port::StringBase DefaultDirectory() const override;
+  Port::StringBase MappingTextFor(const Port::StringBase& libraryDirectory) const override;
+};
+
+template <class Library>
+TCellLibraryLoader<Library>::TCellLibraryLoader()
+    : CLibLoader(Library::kName, Library::kMappingFile, Library::kNodeFileMode) {}
+
+template <class Library>
+Port::StringBase TCellLibraryLoader<Library>::FamilyTestFile(const Port::StringBase& family) const {
+  return Library::FamilyTestFile(family);
+}
+
+template <class Library>
+Port::StringBase TCellLibraryLoader<Library>::FamilyDirectory(const Port::StringBase& family) const {
+  return Library::FamilyDirectory(family);
+}
+
+template <class Library>
+Port::StringBase TCellLibraryLoader<Library>::DefaultDirectory() const {
+  return Library::DefaultDirectory();
+}
+
+template <class Library>
+Port::StringBase TCellLibraryLoader<Library>::MappingTextFor(const Port::StringBase& libraryDirectory) const {
+  return Library::MappingTextFor(libraryDirectory);
+}
 
 }  // namespace Vad

@@ -4,16 +4,13 @@
 
 #include "CBasecellLoader.h"
 #include "CBlockcellLoader.h"
-#include "CParserConfigBase.h"
 #include "CTimecellLoader.h"
 #include "Identifiers.h"
 #include "Port/InitObjects.h"
-#include "Prjrep/Casts.h"
 
 namespace Vad {
 namespace {
 
-constexpr const char* kFamilyProperty = "PROP_DevFamilyPMName";
 constexpr const char* kDefaultFamily = "kestrel";
 constexpr const char* kAllItems = "all";
 constexpr char kAnyPackage = '*';
@@ -38,18 +35,11 @@ CitI::IInterface* CLibRefs::QueryInterface(const Port::XUID& id) {
   return nullptr;
 }
 
-CitI::Result CLibRefs::LoadLibraries(CitI::IInterface* parserConfig) {
-  if (!parserConfig) return CitI::kInvalidArg;
-  auto* config = Prjrep::ObjectCast<CParserConfigBase>(parserConfig);
-  if (!config) return CitI::kFail;
-  Port::StringBase family;
-  CitI::Result status = config->GetPropertyValue(kFamilyProperty, family);
-  if (status != CitI::kOk) return status;
-  if (family.IsEmpty()) family = kDefaultFamily;
-  if (family == family_) return CitI::kOk;
-  for (const char* name : kFamilyLoadOrder) ReloadLibrary(name, family);
-  family_ = family;
-  return CitI::kOk;
+void CLibRefs::LoadLibraries(const Port::StringBase& family) {
+  Port::StringBase wanted = family.IsEmpty() ? Port::StringBase(kDefaultFamily) : family;
+  if (wanted == family_) return;
+  for (const char* name : kFamilyLoadOrder) ReloadLibrary(name, wanted);
+  family_ = wanted;
 }
 
 bool CLibRefs::HasLibraryUnit(const Port::StringBase& library, const Port::StringBase& package,

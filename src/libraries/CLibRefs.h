@@ -26,10 +26,9 @@ class CLibRefs final : public CitI::IInterface {
   // Answers the implementation identity, IRefCount and IInterface.
   CitI::IInterface* QueryInterface(const Port::XUID& id) override;
 
-  // Follows the device family of the parser configuration (its property "PROP_DevFamilyPMName";
-  // empty means "kestrel"); the libraries are loaded again only when the family changed.
-  // kInvalidArg for a null configuration, kFail for one that is not a CParserConfigBase, else 1.
-  CitI::Result LoadLibraries(CitI::IInterface* parserConfig);
+  // Follows the project's device family (empty means "kestrel"); the libraries are loaded again
+  // only when the family changed.
+  void LoadLibraries(const Port::StringBase& family);
   // Whether `package` of `library` declares `name`, in exact case or after lower-casing both. A
   // package beginning with "*" stands for every package of the library. An `item` other than
   // "all" must name the component itself. The language does not change the answer.

@@ -5,17 +5,8 @@
 
 namespace Vad {
 
-class CTimecellLoader final : public CLibLoader {
- public:
-  CTimecellLoader();
-
- protected:
-  Port::StringBase FamilyTestFile(const Port::StringBase& family) const override;
-  Port::StringBase FamilyDirectory(const Port::StringBase& family) const override;
-  Port::StringBase DefaultDirectory() const override;
-  // The simulation mapping names the libraries under the fixed "nt" folder whatever the
-  // platform, so the library directory does not enter it.
-  Port::StringBase MappingTextFor(const Port::StringBase& libraryDirectory) const override;
-};
+struct TimecellLibrary;
+using CTimecellLoader = TCellLibraryLoader<TimecellLibrary>;
+extern template class TCellLibraryLoader<TimecellLibrary>;
 
 }  // namespace Vad

@@ -12,6 +12,7 @@
 #include "Arch.h"
 #include "ArchitectureChoice.h"
 #include "CHdlElement.h"
+#include "CUnitTree.h"
 #include "DbObject.h"
 #include "NetListWalk.h"
 #include "Port/InitObjects.h"
@@ -74,6 +75,22 @@ Port::StringBase CCompileOrder::DisplayNameOf(IHdlFile* file) {
   }
   directory.Append(fileName.view());
   return directory;
+}
+
+CitI::Result CCompileOrder::OrderBelow(CElaborator& elaborator, CLibRefs* libraryReferences,
+                                       IHdlNetListNode* start, IHdlNetListNode* top,
+                                       IHdlParserConfig* parserConfig, bool byUnit, IHdlFileIterator** out) {
+  if (!start || !out) return CitI::kInvalidArg;
+  CCompileOrder order;
+  if (!top || NetListWalk::Identity(top) == NetListWalk::Identity(start)) {
+    return order.ComputeCompileOrder(start, out);
+  }
+  if (!byUnit) return order.ComputeCompileOrder(top, out);
+  Prjrep::AutoPtr<IHdlNetListNode> tree;
+  CitI::Result status =
+      CUnitTree(elaborator).BuildUnitTree(libraryReferences, start, top, parserConfig, tree);
+  if (status != CitI::kOk) return status;
+  return order.ComputeCompileOrder(tree.Get(), out);
 }
 
 CitI::Result CCompileOrder::ComputeCompileOrder(IHdlNetListNode* node, IHdlFileIterator** out) {

@@ -15,9 +15,13 @@
 #include "Host/VhdlName.h"
 #include "IHdlFile.h"
 #include "IHdlNetListNode.h"
+#include "IHdlParserConfig.h"
 #include "Port/StringBase.h"
 
 namespace Vad {
+
+class CElaborator;
+class CLibRefs;
 
 // The messages of the compile order, issued in category "ProjectMgmt" under the elaborator's
 // source name.
@@ -71,6 +75,13 @@ class CCompileOrder {
   // delivered. `out` is cleared first. The unnamed root of a hierarchy contributes the subtrees
   // of all its children; any other node without an element or file contributes nothing.
   CitI::Result ComputeCompileOrder(IHdlNetListNode* node, IHdlFileIterator** out);
+  // The compile order of the source files below `start` (or below `top` when it is given and
+  // differs; with `byUnit` set, below the reduced tree of the unit at `top`, which `elaborator`
+  // elaborates afresh with `libraryReferences`). Start node and out-parameter are required
+  // (kInvalidArg).
+  static CitI::Result OrderBelow(CElaborator& elaborator, CLibRefs* libraryReferences, IHdlNetListNode* start,
+                                 IHdlNetListNode* top, IHdlParserConfig* parserConfig, bool byUnit,
+                                 IHdlFileIterator** out);
 
   // ---- the steps, in the order ComputeCompileOrder takes them ----
   // Adds the files below `node` and their dependencies to the graph; vertices are numbered in

@@ -41,10 +41,10 @@ Prjrep::AutoRelease<IHdlDesignUnitIterator> IterateMarkedUnits(const UnitMarks& 
 
 }  // namespace
 
-CitI::Result CUnitTree::BuildUnitTree(IHdlProject* project, IHdlNetListNode* start, IHdlNetListNode* top,
-                                      IHdlParserConfig* parserConfig,
+CitI::Result CUnitTree::BuildUnitTree(CLibRefs* libraryReferences, IHdlNetListNode* start,
+                                      IHdlNetListNode* top, IHdlParserConfig* parserConfig,
                                       Prjrep::AutoPtr<IHdlNetListNode>& tree) {
-  if (!project || !start || !top || !parserConfig) return CitI::kInvalidArg;
+  if (!libraryReferences || !start || !top || !parserConfig) return CitI::kInvalidArg;
   ElementSet extra;
   CitI::Result status = CollectExtraUnits(start, top, parserConfig, extra);
   if (status != CitI::kOk) return status;
@@ -60,7 +60,7 @@ CitI::Result CUnitTree::BuildUnitTree(IHdlProject* project, IHdlNetListNode* sta
   while (!extra.empty() && Mark(extra, marks)) {
     Prjrep::AutoRelease<IHdlDesignUnitIterator> units = IterateMarkedUnits(marks);
     Prjrep::AutoPtr<IHdlNetListNode> root;
-    status = elaborator_.Elaborate(project, units.Get(), root.Out());
+    status = elaborator_.Elaborate(libraryReferences, units.Get(), root.Out());
     if (status != CitI::kOk) return status;
     tree = root;
     status = CollectExtraUnits(start, root.Get(), parserConfig, extra);

@@ -9,12 +9,12 @@
 #include "IHdlFile.h"
 #include "IHdlNetListNode.h"
 #include "IHdlParserConfig.h"
-#include "IHdlProject.h"
 #include "Prjrep/AutoPtr.h"
 
 namespace Vad {
 
 class CElaborator;
+class CLibRefs;
 
 // Results: 1 success, kInvalidArg (0x1100000000000003) for a missing argument, else the failing
 // step's result. Elements and files in the sets are borrowed from the trees and the project.
@@ -26,9 +26,10 @@ class CUnitTree {
   explicit CUnitTree(CElaborator& elaborator) : elaborator_(elaborator) {}
 
   // `tree` receives `top` itself when no other unit shares its files; otherwise the root of an
-  // elaboration of the top tree's units plus the subtrees (found below `start`) of every unit
-  // that shares a file with the tree, repeated until no such unit is left out.
-  CitI::Result BuildUnitTree(IHdlProject* project, IHdlNetListNode* start, IHdlNetListNode* top,
+  // elaboration (with `libraryReferences`) of the top tree's units plus the subtrees (found
+  // below `start`) of every unit that shares a file with the tree, repeated until no such unit
+  // is left out.
+  CitI::Result BuildUnitTree(CLibRefs* libraryReferences, IHdlNetListNode* start, IHdlNetListNode* top,
                              IHdlParserConfig* parserConfig, Prjrep::AutoPtr<IHdlNetListNode>& tree);
   // Empties `out`, then adds the elements of the subtree below `start` of every design unit that
   // lies in a source file of `tree` but is not in `tree`.

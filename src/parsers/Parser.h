@@ -3,7 +3,6 @@
 
 #include <array>
 #include <cstdint>
-#include <memory>
 
 #include "CitI.h"
 #include "Port/StringBase.h"
@@ -38,23 +37,11 @@ class Parser {
   const Port::XUID& GetTypeId(int index) const;
   bool IsTypeIdSet(int index) const;
 
- protected:
-  // For source kinds that are not read yet: says so on the debug channel, records nothing and
-  // returns 0.
-  static int RecordNothing(const char* parserName, CParserConfigHolder& holder);
-
  private:
   static bool IsValidIndex(int index) { return index >= 0 && index < kTypeIdCount; }
 
   std::array<Port::XUID, kTypeIdCount> typeIds_{};
   std::array<bool, kTypeIdCount> typeIdSet_{};
 };
-
-// The parser for the holder's plug-in name (compared exactly), owned by the caller; null only
-// when allocation fails. An unknown name is reported on the debug channel and gets the generic
-// parser. `edifSelection` (see GetEdifSelection) chooses among the EDIF parsers.
-std::unique_ptr<Parser> CreateParser(const Port::StringBase& edifSelection, CParserConfigHolder& holder);
-// The name of the first EDIF selection variable with a non-empty value, or empty.
-void GetEdifSelection(Port::StringBase& selection);
 
 }  // namespace Vad

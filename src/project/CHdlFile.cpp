@@ -14,9 +14,8 @@ namespace Vad {
 
 CHdlFile::CHdlFile()
     : fileNameHelper_(Prjrep::CreateInstanceAs<Prjrep::IFileNameHelper>(ClassIds::HostFileNameHelper())) {
-  auto* holder = new CParserConfigHolder();
-  holder_.Attach(holder);
-  holder->SetFile(this);
+  holder_.Attach(new CParserConfigHolder());
+  holder_->SetFile(this);
 }
 
 CHdlFile::~CHdlFile() {
@@ -84,8 +83,14 @@ CParserConfigBase* CHdlFile::GetParserConfig() const {
   return project_ ? project_->GetParserConfigObject() : nullptr;
 }
 
-CParserConfigHolder* CHdlFile::GetHolder() const {
-  return Prjrep::ObjectCast<CParserConfigHolder>(holder_.Get());
+CParserConfigHolder* CHdlFile::GetHolder() const { return holder_.Get(); }
+
+void CHdlFile::ExtractPorts(IHdlDesignUnit* unit, IHdlPortIterator** out) {
+  CParserConfigHolder* holder = GetHolder();
+  if (!holder) return;
+  // The holder stays for the whole extraction even if the file is let go meanwhile.
+  Prjrep::AutoPtr<CitI::IInterface> heldHolder(holder);
+  holder->ExtractPorts(unit, out);
 }
 
 IHdlDesignUnitSet* CHdlFile::GetUnitSet() const {
@@ -246,66 +251,6 @@ CitI::Result CHdlFile::InitializeAfterCreate(CitI::IInterface* context) {
     return CitI::kInvalidArg;
   }
   return CitI::kOk;
-}
-
-// ---- IFileNameHelper -----------------------------------------------------------------------------
-
-template <class Call>
-CitI::Result CHdlFile::XIFileNameHelper::Forward(Call call) {
-  Prjrep::IFileNameHelper* helper = owner()->fileNameHelper_.Get();
-  return helper ? call(*helper) : CitI::kFail;
-}
-
-CitI::Result CHdlFile::XIFileNameHelper::SetFilePath(const Port::StringBase& path,
-                                                     const Port::StringBase& baseDir,
-                                                     const Port::StringBase& cwd) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.SetFilePath(path, baseDir, cwd); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::GetFilePath(Port::StringBase* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.GetFilePath(out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::GetDirectory(Port::StringBase* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.GetDirectory(out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::GetFileName(Port::StringBase* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.GetFileName(out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::IsAbsolute(bool* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.IsAbsolute(out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::Exists(bool* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.Exists(out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::GetFullPath(Port::StringBase* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.GetFullPath(out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::GetModificationTime(std::int64_t* seconds) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.GetModificationTime(seconds); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::GetRelativePath(const Port::StringBase& baseDir,
-                                                         Port::StringBase* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.GetRelativePath(baseDir, out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::GetBaseName(Port::StringBase* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.GetBaseName(out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::GetExtension(Port::StringBase* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.GetExtension(out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::SetExtension(const Port::StringBase& extension) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.SetExtension(extension); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::HasExtension(const Port::StringBase& extension, bool* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.HasExtension(extension, out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::IsEmpty(bool* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.IsEmpty(out); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::Clear() {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.Clear(); });
-}
-CitI::Result CHdlFile::XIFileNameHelper::IsSameFile(Prjrep::IFileNameHelper* other, bool* out) {
-  return Forward([&](Prjrep::IFileNameHelper& h) { return h.IsSameFile(other, out); });
 }
 
 // ---- ISourceLibraryMember ------------------------------------------------------------------------

@@ -18,7 +18,9 @@
 #include "Port/StringBase.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/TFace.h"
+#include "Prjrep/TFileNameHelperFace.h"
 #include "Prjrep/TRefCountHelper.h"
+#include "SourceFileLink.h"
 
 namespace Vad {
 
@@ -29,7 +31,7 @@ class CParserConfigHolder;
 // QueryInterface answers, in this order, IInterface (the object itself), IHdlFile, IHdlFileV3,
 // IFileCompReference, Prjrep::IRefCount, ICompAdmin, Prjrep::IFileNameHelper and
 // ISourceLibraryMember.
-class CHdlFile final : public CitI::IInterface {
+class CHdlFile final : public CitI::IInterface, public SourceFileLink {
  public:
   // Needs a parse; makes its holder and, through the registry, its file-name helper.
   CHdlFile();
@@ -54,9 +56,11 @@ class CHdlFile final : public CitI::IInterface {
   CParserConfigBase* GetParserConfig() const;
   CParserConfigHolder* GetHolder() const;
   // The units of the last parse (no reference added), or null without a holder.
-  IHdlDesignUnitSet* GetUnitSet() const;
+  IHdlDesignUnitSet* GetUnitSet() const override;
   // The file type with one reference for the caller, or null.
-  Prjrep::AutoPtr<IFileType> GetFileType() const { return fileType_; }
+  Prjrep::AutoPtr<IFileType> GetFileType() const override { return fileType_; }
+  // Through the holder's parser factory; nothing without a holder.
+  void ExtractPorts(IHdlDesignUnit* unit, IHdlPortIterator** out) override;
 
   // Path parts from the file-name helper; empty without one.
   void GetFullPath(Port::StringBase& out) const;
@@ -65,7 +69,7 @@ class CHdlFile final : public CitI::IInterface {
   // The base name, plus "." and the extension when there is one.
   void GetFileNamePart(Port::StringBase& out) const;
   // Directory followed by file name, as getFileName gives them; false without a helper.
-  bool GetFullFileName(Port::StringBase& out) const;
+  bool GetFullFileName(Port::StringBase& out) const override;
   // The source library's name; "work" when the file has none.
   void GetLibraryName(Port::StringBase& out) const;
   const Port::StringBase& GetPluginName() const { return pluginName_; }
@@ -138,33 +142,6 @@ class CHdlFile final : public CitI::IInterface {
     CitI::Result Reserved5() override { return CitI::kNotImpl; }
   };
 
-  // Hands every operation to the file's own helper; kFail when the file has none.
-  class XIFileNameHelper final : public Prjrep::TFace<Prjrep::IFileNameHelper, CHdlFile> {
-   public:
-    using TFace::TFace;
-    CitI::Result SetFilePath(const Port::StringBase& path, const Port::StringBase& baseDir,
-                             const Port::StringBase& cwd) override;
-    CitI::Result GetFilePath(Port::StringBase* out) override;
-    CitI::Result GetDirectory(Port::StringBase* out) override;
-    CitI::Result GetFileName(Port::StringBase* out) override;
-    CitI::Result IsAbsolute(bool* out) override;
-    CitI::Result Exists(bool* out) override;
-    CitI::Result GetFullPath(Port::StringBase* out) override;
-    CitI::Result GetModificationTime(std::int64_t* seconds) override;
-    CitI::Result GetRelativePath(const Port::StringBase& baseDir, Port::StringBase* out) override;
-    CitI::Result GetBaseName(Port::StringBase* out) override;
-    CitI::Result GetExtension(Port::StringBase* out) override;
-    CitI::Result SetExtension(const Port::StringBase& extension) override;
-    CitI::Result HasExtension(const Port::StringBase& extension, bool* out) override;
-    CitI::Result IsEmpty(bool* out) override;
-    CitI::Result Clear() override;
-    CitI::Result IsSameFile(Prjrep::IFileNameHelper* other, bool* out) override;
-
-   private:
-    template <class Call>
-    CitI::Result Forward(Call call);
-  };
-
   class XISourceLibraryMember final : public Prjrep::TFace<ISourceLibraryMember, CHdlFile> {
    public:
     using TFace::TFace;
@@ -178,7 +155,7 @@ class CHdlFile final : public CitI::IInterface {
   CHdlProject* project_ = nullptr;
   Port::StringBase pluginName_;
   bool needsParse_ = true;
-  Prjrep::AutoPtr<CitI::IInterface> holder_;
+  Prjrep::AutoPtr<CParserConfigHolder> holder_;
   Prjrep::AutoPtr<Prjrep::IFileNameHelper> fileNameHelper_;
   std::uint64_t orderKey_ = 0;
   Prjrep::AutoPtr<IFileType> fileType_;
@@ -188,7 +165,8 @@ class CHdlFile final : public CitI::IInterface {
   XIHdlFileV3 hdlFileV3Face_{this};
   XIFileCompReference fileCompReferenceFace_{this};
   XICompAdmin compAdminFace_{this};
-  XIFileNameHelper fileNameHelperFace_{this};
+  // Hands every operation to the file's own helper; kFail when the file has none.
+  Prjrep::TFileNameHelperFace<CHdlFile> fileNameHelperFace_{this, &fileNameHelper_};
   Prjrep::AutoPtr<ISourceLibrary> sourceLibrary_;
   XISourceLibraryMember sourceLibraryMemberFace_{this};
 };

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <new>
 
+#include "CCompileOrder.h"
 #include "CElaborator.h"
 #include "CHdlElement.h"
 #include "CHdlFile.h"
@@ -32,6 +33,8 @@ constexpr const char* kNoParserConfigText =
 constexpr const char* kNoNewFileText = "Error: CHdlProject::createNewFile - Unable to create a new file.\n";
 
 constexpr const char* kVerilogPlugin = "PLUGIN_Verilog";
+// The configuration property naming the device family whose cell libraries apply.
+constexpr const char* kFamilyProperty = "PROP_DevFamilyPMName";
 
 // Set while a hierarchy rebuild runs anywhere in the process, so that a request made from inside
 // it does not start another.
@@ -127,17 +130,18 @@ CitI::Result CHdlProject::getElaborator(CElaborator** out) {
   if (!out) return CitI::kInvalidArg;
   *out = nullptr;
   if (!elaborator_) elaborator_.Attach(new (std::nothrow) CElaborator());
-  auto* elaborator = Prjrep::ObjectCast<CElaborator>(elaborator_.Get());
-  if (!elaborator) return CitI::kFail;
-  Prjrep::AddRefOf(elaborator);
-  *out = elaborator;
-  return CitI::kOk;
+  if (!elaborator_) return CitI::kFail;
+  return elaborator_.CopyTo(out);
 }
 
 CLibRefs* CHdlProject::getLibraryReferences() {
   if (!libraryReferences_) libraryReferences_.Attach(new CLibRefs());
-  auto* libraryReferences = Prjrep::ImplementationCast<CLibRefs>(libraryReferences_.Get());
-  libraryReferences->LoadLibraries(parserConfig_.Get());
+  CLibRefs* libraryReferences = libraryReferences_.Get();
+  if (CParserConfigBase* config = GetParserConfigObject()) {
+    Port::StringBase family;
+    config->GetPropertyValue(kFamilyProperty, family);
+    libraryReferences->LoadLibraries(family);
+  }
   return libraryReferences;
 }
 
@@ -317,7 +321,8 @@ CitI::Result CHdlProject::getCompileOrder(IHdlNetListNode* top, IHdlFileIterator
   Prjrep::AutoRelease<CElaborator> elaborator;
   status = getElaborator(elaborator.Out());
   if (status != CitI::kOk) return status;
-  return elaborator->GetCompileOrder(&projectFace_, root.Get(), top, parserConfig_.Get(), true, out);
+  return CCompileOrder::OrderBelow(*elaborator.Get(), getLibraryReferences(), root.Get(), top,
+                                   parserConfig_.Get(), true, out);
 }
 
 CitI::Result CHdlProject::getCompileOrderByDU(IHdlDesignUnit* unit, bool byUnit, IHdlFileIterator** out) {
@@ -336,19 +341,21 @@ CitI::Result CHdlProject::getCompileOrderByDU(IHdlDesignUnit* unit, bool byUnit,
   IHdlNetListNode* node = FindUnitNode(root.Get(), element);
   if (!node) return kUnitNotInTree;
 
-  IHdlProject* project = &projectFace_;
+  CLibRefs* references = getLibraryReferences();
   IHdlParserConfig* config = parserConfig_.Get();
-  if (!byUnit) return elaborator->GetCompileOrder(project, root.Get(), node, config, true, out);
+  if (!byUnit)
+    return CCompileOrder::OrderBelow(*elaborator.Get(), references, root.Get(), node, config, true, out);
   switch (element->GetType()) {
     case DbType::kModule:
       *out = IterateOwnFile(element).Detach();
       return CitI::kOk;
     case DbType::kEntity:
-      return elaborator->GetCompileOrder(project, root.Get(), root.Get(), config, false, out);
+      return CCompileOrder::OrderBelow(*elaborator.Get(), references, root.Get(), root.Get(), config, false,
+                                       out);
     case DbType::kArchitecture: {
       IHdlNetListNode* entity = FirstEntityChild(node);
       if (!entity) return kUnitNotInTree;
-      return elaborator->GetCompileOrder(project, root.Get(), entity, config, false, out);
+      return CCompileOrder::OrderBelow(*elaborator.Get(), references, root.Get(), entity, config, false, out);
     }
     default:
       return kNotOrderedByKind;
@@ -386,7 +393,7 @@ CitI::Result CHdlProject::RebuildHierarchy() {
   result = units->CreateIterator(unit.Out());
   if (result != CitI::kOk) return result;
   Prjrep::AutoPtr<IHdlNetListNode> root;
-  result = elaborator->Elaborate(&projectFace_, unit.Get(), root.Out());
+  result = elaborator->Elaborate(getLibraryReferences(), unit.Get(), root.Out());
   if (result != CitI::kOk) return result;
   Prjrep::AutoRelease<IHdlFileIterator> files;
   if (files_.CreateIterator(files.Out()) == CitI::kOk)

@@ -135,7 +135,7 @@ class CHdlProject final : public CitI::IInterface {
 
   Prjrep::TAssociativeSetHelper<IHdlFileSet> files_;
   Prjrep::AutoPtr<IHdlParserConfig> parserConfig_;
-  Prjrep::AutoPtr<CitI::IInterface> libraryReferences_;
+  Prjrep::AutoPtr<CLibRefs> libraryReferences_;
   Prjrep::TRefCountHelper<CHdlProject> refs_{this};
   XIHdlFileSet fileSetFace_{this};
   XIHdlProject projectFace_{this};
@@ -144,7 +144,7 @@ class CHdlProject final : public CitI::IInterface {
   Prjrep::AutoPtr<IHdlNetListNode> cachedRoot_;
   // What nested requests see while a rebuild runs.
   Prjrep::AutoPtr<IHdlNetListNode> interimRoot_;
-  Prjrep::AutoPtr<CitI::IInterface> elaborator_;
+  Prjrep::AutoPtr<CElaborator> elaborator_;
   XIHdlElaborationData elaborationDataFace_{this};
 };
 

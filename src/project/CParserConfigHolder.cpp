@@ -18,7 +18,7 @@
 #include "Library.h"
 #include "PackageBody.h"
 #include "PackageDecl.h"
-#include "Parser.h"
+#include "ParserFactory.h"
 #include "Port/InitObjects.h"
 #include "Prjrep/TSequenceSetHelper.h"
 #include "Use.h"
@@ -159,7 +159,6 @@ static Port::StringBase StoreKeyOf(Record* record) {
 
 bool CParserConfigHolder::Enter(CHdlElement* record, const Port::StringBase& key, std::uint32_t line,
                                 const Port::XUID& type) {
-  Prjrep::AutoRelease<CitI::IInterface> creation(record);
   record->SetFile(file_);
   record->SetTextPosition(line, 0);
   record->SetDesignUnitTypeId(type);
@@ -185,24 +184,18 @@ Library* CParserConfigHolder::AddLibrary(const Port::StringBase& name, std::uint
   ResetForNextUnit();
   // Library clauses inside a context declaration belong to it.
   if (!openContext_ || currentUnit_ != openContext_) currentUnit_ = nullptr;
-  auto* library = new Library(name.view(), nullptr);
-  const Port::StringBase key = StoreKeyOf(library);
-  if (auto* existing = dynamic_cast<Library*>(FindRecorded(key))) {
-    Prjrep::AutoRelease<CitI::IInterface> discarded(library);
-    return existing;
-  }
-  return Enter(library, key, line, type) ? library : nullptr;
+  Prjrep::AutoRelease<Library> library(new Library(name.view(), nullptr));
+  const Port::StringBase key = StoreKeyOf(library.Get());
+  if (auto* existing = dynamic_cast<Library*>(FindRecorded(key))) return existing;
+  return Enter(library.Get(), key, line, type) ? library.Get() : nullptr;
 }
 
 Use* CParserConfigHolder::RecordUse(const Port::StringBase& dottedName, std::uint32_t line,
                                     const Port::XUID& type) {
-  auto* use = new Use(dottedName.view(), nullptr);
-  const Port::StringBase key = StoreKeyOf(use);
-  if (auto* existing = dynamic_cast<Use*>(FindRecorded(key))) {
-    Prjrep::AutoRelease<CitI::IInterface> discarded(use);
-    return existing;
-  }
-  return Enter(use, key, line, type) ? use : nullptr;
+  Prjrep::AutoRelease<Use> use(new Use(dottedName.view(), nullptr));
+  const Port::StringBase key = StoreKeyOf(use.Get());
+  if (auto* existing = dynamic_cast<Use*>(FindRecorded(key))) return existing;
+  return Enter(use.Get(), key, line, type) ? use.Get() : nullptr;
 }
 
 namespace {
@@ -280,70 +273,70 @@ EntityDecl* CParserConfigHolder::AddEntityDecl(const Port::StringBase& name, std
                                                bool portFlag, const Port::XUID& type) {
   ResetForNextUnit();
   if (!IsEnabled(kEntitySlot)) return nullptr;
-  auto* entity = new EntityDecl(name.view(), nullptr);
+  Prjrep::AutoRelease<EntityDecl> entity(new EntityDecl(name.view(), nullptr));
   entity->SetUnitFlag(portFlag);
-  if (!Enter(entity, StoreKeyOf(entity), line, type)) return nullptr;
-  TakePendingContext(entity);
-  currentUnit_ = entity;
-  lastUnit_ = entity;
-  return entity;
+  if (!Enter(entity.Get(), StoreKeyOf(entity.Get()), line, type)) return nullptr;
+  TakePendingContext(entity.Get());
+  currentUnit_ = entity.Get();
+  lastUnit_ = entity.Get();
+  return entity.Get();
 }
 
 Arch* CParserConfigHolder::AddArch(const Port::StringBase& archName, const Port::StringBase& entityName,
                                    std::uint32_t line, const Port::XUID& type) {
   ResetForNextUnit();
   if (!IsEnabled(kArchitectureSlot)) return nullptr;
-  auto* architecture = new Arch(entityName.view(), archName.view(), nullptr);
-  if (!Enter(architecture, StoreKeyOf(architecture), line, type)) return nullptr;
-  TakePendingContext(architecture);
-  currentUnit_ = architecture;
-  lastUnit_ = architecture;
-  return architecture;
+  Prjrep::AutoRelease<Arch> architecture(new Arch(entityName.view(), archName.view(), nullptr));
+  if (!Enter(architecture.Get(), StoreKeyOf(architecture.Get()), line, type)) return nullptr;
+  TakePendingContext(architecture.Get());
+  currentUnit_ = architecture.Get();
+  lastUnit_ = architecture.Get();
+  return architecture.Get();
 }
 
 module* CParserConfigHolder::AddModule(const Port::StringBase& name, std::uint32_t line, bool flag,
                                        const Port::XUID& type, const Port::StringBase& partition) {
   if (!IsEnabled(kModuleSlot)) return nullptr;
   ResetForNextUnit();
-  auto* unit = new module(name.view(), nullptr);
+  Prjrep::AutoRelease<module> unit(new module(name.view(), nullptr));
   unit->SetUnitFlag(flag);
   if (!partition.IsEmpty()) unit->SetProperty(kPartitionProperty, partition);
-  if (!Enter(unit, StoreKeyOf(unit), line, type)) return nullptr;
+  if (!Enter(unit.Get(), StoreKeyOf(unit.Get()), line, type)) return nullptr;
   pendingContext_.clear();
-  currentUnit_ = unit;
-  lastUnit_ = unit;
-  return unit;
+  currentUnit_ = unit.Get();
+  lastUnit_ = unit.Get();
+  return unit.Get();
 }
 
 PackageBody* CParserConfigHolder::AddPackageBody(const Port::StringBase& name, std::uint32_t line,
                                                  const Port::XUID& type) {
   ResetForNextUnit();
   if (!IsEnabled(kPackageBodySlot)) return nullptr;
-  auto* body = new PackageBody(name.view(), nullptr);
-  if (!Enter(body, StoreKeyOf(body), line, type)) return nullptr;
-  TakePendingContext(body);
+  Prjrep::AutoRelease<PackageBody> body(new PackageBody(name.view(), nullptr));
+  if (!Enter(body.Get(), StoreKeyOf(body.Get()), line, type)) return nullptr;
+  TakePendingContext(body.Get());
   currentUnit_ = nullptr;
-  lastUnit_ = body;
-  return body;
+  lastUnit_ = body.Get();
+  return body.Get();
 }
 
 PackageDecl* CParserConfigHolder::AddPackageDecl(const Port::StringBase& name, std::uint32_t line,
                                                  const Port::XUID& type) {
   ResetForNextUnit();
   if (!IsEnabled(kPackageDeclSlot)) return nullptr;
-  auto* package = new PackageDecl(name.view(), nullptr);
-  if (!Enter(package, StoreKeyOf(package), line, type)) return nullptr;
-  TakePendingContext(package);
+  Prjrep::AutoRelease<PackageDecl> package(new PackageDecl(name.view(), nullptr));
+  if (!Enter(package.Get(), StoreKeyOf(package.Get()), line, type)) return nullptr;
+  TakePendingContext(package.Get());
   currentUnit_ = nullptr;
-  lastUnit_ = package;
-  return package;
+  lastUnit_ = package.Get();
+  return package.Get();
 }
 
 generic* CParserConfigHolder::AddGeneric(const Port::StringBase& name, std::uint32_t line,
                                          const Port::XUID& type) {
   ResetForNextUnit();
-  auto* unit = new generic(name.view(), nullptr);
-  return Enter(unit, StoreKeyOf(unit), line, type) ? unit : nullptr;
+  Prjrep::AutoRelease<generic> unit(new generic(name.view(), nullptr));
+  return Enter(unit.Get(), StoreKeyOf(unit.Get()), line, type) ? unit.Get() : nullptr;
 }
 
 bool CParserConfigHolder::IsLibraryCell(const Port::StringBase& component) const {
@@ -375,31 +368,31 @@ CompInst* CParserConfigHolder::AddCompInst(const Port::StringBase& label, const 
   pendingContext_.clear();
   labelCount_ = 0;
   if (!currentUnit_) return nullptr;
-  auto* instance =
-      new CompInst(label.IsEmpty() ? component.view() : label.view(), component.view(), currentUnit_);
+  Prjrep::AutoRelease<CompInst> instance(
+      new CompInst(label.IsEmpty() ? component.view() : label.view(), component.view(), currentUnit_));
   instance->SetInGenerate(generateDepth_ != 0);
   if (!partition.IsEmpty()) instance->SetProperty(kPartitionProperty, partition);
-  if (!Enter(instance, StoreKeyOf(instance), line, type)) return nullptr;
-  lastCompInst_ = instance;
+  if (!Enter(instance.Get(), StoreKeyOf(instance.Get()), line, type)) return nullptr;
+  lastCompInst_ = instance.Get();
   lastEntityInst_ = nullptr;
-  return instance;
+  return instance.Get();
 }
 
 EntityInst* CParserConfigHolder::AddEntityInst(const Port::StringBase& label, const Port::StringBase& entity,
                                                const Port::StringBase& architecture, std::uint32_t line,
                                                const Port::XUID& type) {
   if (!currentUnit_) return nullptr;
-  auto* instance = new EntityInst(label.view(), currentUnit_);
+  Prjrep::AutoRelease<EntityInst> instance(new EntityInst(label.view(), currentUnit_));
   instance->SetLabel(label.view());
   instance->SetEntityName(entity.view());
   instance->SetArchitectureName(architecture.view());
   instance->SetInGenerate(generateDepth_ != 0);
-  if (!Enter(instance, StoreKeyOf(instance), line, type)) return nullptr;
-  lastEntityInst_ = instance;
+  if (!Enter(instance.Get(), StoreKeyOf(instance.Get()), line, type)) return nullptr;
+  lastEntityInst_ = instance.Get();
   lastCompInst_ = nullptr;
   // A new instance starts its own labels.
   labelCount_ = 0;
-  return instance;
+  return instance.Get();
 }
 
 void CParserConfigHolder::AddInstanceLabel(const Port::StringBase& label) {
@@ -451,17 +444,17 @@ void CParserConfigHolder::AddTestVector(const Port::StringBase& name) {
   if (!IsEnabled(kTestVectorSlot)) return;
   Port::StringBase moduleName = name;
   moduleName.Append(kTestVectorSuffix);
-  auto* vectorModule = new module(moduleName.view(), nullptr);
+  Prjrep::AutoRelease<module> vectorModule(new module(moduleName.view(), nullptr));
   Port::StringBase prefix;
   vectorModule->AppendKeyPrefix(prefix);
   Port::StringBase key;
   DbObject::JoinKeyFields(key, {prefix.view(), name.view()});
-  if (!Enter(vectorModule, key, 0, typeIds_[kTestVectorSlot])) return;
+  if (!Enter(vectorModule.Get(), key, 0, typeIds_[kTestVectorSlot])) return;
 
-  auto* instance = new CompInst(name.view(), name.view(), vectorModule);
+  Prjrep::AutoRelease<CompInst> instance(new CompInst(name.view(), name.view(), vectorModule.Get()));
   Port::StringBase instanceKey;
   instance->ComposeStoreKey(instanceKey);
-  Enter(instance, instanceKey, 0, typeIds_[kInstanceLabelSlot]);
+  Enter(instance.Get(), instanceKey, 0, typeIds_[kInstanceLabelSlot]);
 
   if (currentUnit_) currentUnit_->SetUnitFlag(true);
   ResetInstanceState();
@@ -489,6 +482,12 @@ void CParserConfigHolder::SetEntityPortFlag(bool flag) {
 }
 
 // ---- the parse run -------------------------------------------------------------------------------
+
+void CParserConfigHolder::InstallParserFactory(const ParserFactory* factory) { parserFactory_ = factory; }
+
+void CParserConfigHolder::ExtractPorts(IHdlDesignUnit* unit, IHdlPortIterator** out) {
+  if (parserFactory_) parserFactory_->ExtractPorts(*this, unit, out);
+}
 
 const SiblingPaths& CParserConfigHolder::GetSiblingPaths() const {
   static const SiblingPaths kNone;
@@ -526,12 +525,7 @@ void CParserConfigHolder::EndParse() {
 
 CitI::Result CParserConfigHolder::Parse(IHdlFileIterator* projectFiles) {
   BeginParse(projectFiles);
-  Port::StringBase edifSelection;
-  GetEdifSelection(edifSelection);
-  std::unique_ptr<Parser> parser = CreateParser(edifSelection, *this);
-  if (!parser) return CitI::kFail;
-  parser->Parse(*this);
-  parser.reset();
+  if (!parserFactory_ || !parserFactory_->Parse(*this)) return CitI::kFail;
   EndParse();
   return CitI::kOk;
 }

@@ -33,6 +33,9 @@ class generic;
 class CompInst;
 class EntityInst;
 class IHdlFileIterator;
+class IHdlDesignUnit;
+class IHdlPortIterator;
+class ParserFactory;
 
 class CParserConfigHolder final : public CitI::IInterface {
  public:
@@ -131,8 +134,14 @@ class CParserConfigHolder final : public CitI::IInterface {
   // The record entered under exactly `key` during the running parse, or null.
   CHdlElement* FindRecorded(const Port::StringBase& key) const;
 
-  // The parse run: BeginParse, the file's parser, EndParse. `projectFiles` may be null.
+  // The factory every holder's parse and port query goes to; the module's entry installs it
+  // (not owned; it lives as long as the module).
+  static void InstallParserFactory(const ParserFactory* factory);
+  // The parse run: BeginParse, the file's parser, EndParse. `projectFiles` may be null. 0 when no
+  // parser could be made.
   CitI::Result Parse(IHdlFileIterator* projectFiles);
+  // The ports of `unit` as the parser of the file's plug-in name extracts them.
+  void ExtractPorts(IHdlDesignUnit* unit, IHdlPortIterator** out);
   void BeginParse(IHdlFileIterator* projectFiles);
   void EndParse();
   // Whether the last parse is still valid for this project file list (null: none).
@@ -151,8 +160,9 @@ class CParserConfigHolder final : public CitI::IInterface {
   // Clears every plain pointer into the recorded units.
   void ForgetParseState();
   bool IsEnabled(TypeSlot slot) const { return typeEnabled_[slot]; }
-  // Gives the new `record` (whose creation reference this call ends) its file, line and type and
-  // registers it under `key`. False, with the record gone unless a parent keeps it, when refused.
+  // Gives the new `record` its file, line and type and registers it under `key`, where the holder
+  // keeps a reference of its own. False when refused: the record then lives only as long as its
+  // creator's reference (or a parent's).
   bool Enter(CHdlElement* record, const Port::StringBase& key, std::uint32_t line, const Port::XUID& type);
   // The new unit's use list becomes the pending context, which is emptied.
   void TakePendingContext(CHdlElement* unit);
@@ -166,6 +176,8 @@ class CParserConfigHolder final : public CitI::IInterface {
   // Re-registers an instance under its first label.
   void RenameInstance(CHdlElement* instance, const Port::StringBase& label);
   void CopyInstance(const Port::StringBase& label);
+
+  static inline const ParserFactory* parserFactory_ = nullptr;
 
   CHdlFile* file_ = nullptr;
   Port::StringBase signature_;

@@ -3,55 +3,42 @@
 #include <cstdio>
 
 #include "Arch.h"
-#include "CHdlFile.h"
-#include "CParserConfigHolder.h"
 #include "HdlSets.h"
 #include "IBaseServices.h"
 #include "IDesignUnitTypeStore.h"
 #include "IFileCompReference.h"
 #include "ISourceLibraryMember.h"
 #include "Identifiers.h"
-#include "Parser.h"
 #include "Port/InitObjects.h"
 #include "Port/MsgManData.h"
 #include "Prjrep/Casts.h"
+#include "SourceFileLink.h"
 
 namespace Vad {
 namespace {
 
 constexpr std::uint32_t kKindsWithUnitFlag = DbType::kEntity | DbType::kArchitecture | DbType::kModule;
 
-// Queries that need the module's own source-file object; a file link that is no such object
-// answers nothing.
-CHdlFile* SourceFileOf(CitI::IInterface* fileLink) { return Prjrep::ObjectCast<CHdlFile>(fileLink); }
+// Queries that need the unit's source file; a file link that is no source file answers nothing.
+SourceFileLink* SourceFileOf(CitI::IInterface* fileLink) {
+  return Prjrep::ObjectCast<SourceFileLink>(fileLink);
+}
 
 bool IsSourceFile(CitI::IInterface* fileLink) { return SourceFileOf(fileLink) != nullptr; }
 
 Prjrep::AutoPtr<IFileType> FileTypeOfSourceFile(CitI::IInterface* fileLink) {
-  CHdlFile* file = SourceFileOf(fileLink);
+  SourceFileLink* file = SourceFileOf(fileLink);
   return file ? file->GetFileType() : Prjrep::AutoPtr<IFileType>();
 }
 
 Prjrep::AutoPtr<IHdlDesignUnitSet> UnitsOfSourceFile(CitI::IInterface* fileLink) {
-  CHdlFile* file = SourceFileOf(fileLink);
+  SourceFileLink* file = SourceFileOf(fileLink);
   return Prjrep::AutoPtr<IHdlDesignUnitSet>(file ? file->GetUnitSet() : nullptr);
 }
 
 bool FullFileNameOfSourceFile(CitI::IInterface* fileLink, Port::StringBase& out) {
-  CHdlFile* file = SourceFileOf(fileLink);
+  SourceFileLink* file = SourceFileOf(fileLink);
   return file && file->GetFullFileName(out);
-}
-
-// Asks the parser of the file's plug-in name for the unit's ports; its result is not used.
-void ExtractPortsOfSourceFile(CitI::IInterface* fileLink, IHdlDesignUnit* unit, IHdlPortIterator** out) {
-  CHdlFile* file = SourceFileOf(fileLink);
-  CParserConfigHolder* holder = file ? file->GetHolder() : nullptr;
-  if (!holder) return;
-  Prjrep::AutoPtr<CitI::IInterface> heldHolder(holder);
-  Port::StringBase edifSelection;
-  GetEdifSelection(edifSelection);
-  std::unique_ptr<Parser> parser = CreateParser(edifSelection, *holder);
-  if (parser) parser->ExtractPorts(*holder, unit, out);
 }
 
 void Debug(const char* text) { Port_MsgManData::debugStub("%s", text); }
@@ -380,7 +367,7 @@ CitI::Result CHdlElement::GetPorts(IHdlPortIterator** out) {
   if (!out) return CitI::kInvalidArg;
   *out = nullptr;
   // Parsers that extract no ports leave `out` empty; the result is 1 either way.
-  ExtractPortsOfSourceFile(fileLink_, &designUnitFace_, out);
+  if (SourceFileLink* file = SourceFileOf(fileLink_)) file->ExtractPorts(&designUnitFace_, out);
   return CitI::kOk;
 }
 

@@ -11,8 +11,8 @@ class LiveObjectCheck : public testing::EmptyTestEventListener {
   void OnTestEnd(const testing::TestInfo& info) override {
     long after = Port::LiveObjectCount();
     if (after != before_) {
-      ADD_FAILURE() << info.test_suite_name() << "." << info.name() << " left "
-                    << (after - before_) << " counted object(s) alive";
+      ADD_FAILURE() << info.test_suite_name() << "." << info.name() << " left " << (after - before_)
+                    << " counted object(s) alive";
     }
   }
   long before_ = 0;

@@ -380,17 +380,16 @@ TEST_F(Elaborator, DumpsTheSixTablesInTheirOrder) {
                 ptr[1].str() + "\n  work - Entity|e Ptr: " + ptr[2].str() + "\n");
 }
 
-TEST_F(Elaborator, ElaborateNeedsItsArgumentsAndAProject) {
+TEST_F(Elaborator, ElaborateNeedsItsArgumentsAndLibraryReferences) {
   auto none = IterateUnits({});
+  Vad::CLibRefs* references = ProjectObject(project_.Get())->getLibraryReferences();
   Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
   EXPECT_EQ(elaborator_.Elaborate(nullptr, none.Get(), root.Out()), CitI::kInvalidArg);
-  EXPECT_EQ(elaborator_.Elaborate(project_.Get(), nullptr, root.Out()), CitI::kInvalidArg);
-  EXPECT_EQ(elaborator_.Elaborate(project_.Get(), none.Get(), nullptr), CitI::kInvalidArg);
-  // A file is no project.
-  EXPECT_EQ(elaborator_.Elaborate(work_.Get(), none.Get(), root.Out()), CitI::kFail);
+  EXPECT_EQ(elaborator_.Elaborate(references, nullptr, root.Out()), CitI::kInvalidArg);
+  EXPECT_EQ(elaborator_.Elaborate(references, none.Get(), nullptr), CitI::kInvalidArg);
   EXPECT_FALSE(root);
 
-  ASSERT_EQ(elaborator_.Elaborate(project_.Get(), none.Get(), root.Out()), CitI::kOk);
+  ASSERT_EQ(elaborator_.Elaborate(references, none.Get(), root.Out()), CitI::kOk);
   ASSERT_TRUE(root);
   EXPECT_TRUE(ChildrenOf(root.Get()).empty());
   EXPECT_EQ(Prjrep::RefCountOf(root.Get()), 1u);

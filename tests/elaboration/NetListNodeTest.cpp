@@ -53,7 +53,9 @@ class NetListNode : public ElabTest {
   Prjrep::AutoPtr<Vad::IHdlNetListNode> Elaborate(const std::vector<CitI::IInterface*>& units) {
     auto iterator = IterateUnits(units);
     Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
-    EXPECT_EQ(elaborator_->Elaborate(project_.Get(), iterator.Get(), root.Out()), CitI::kOk);
+    EXPECT_EQ(elaborator_->Elaborate(ProjectObject(project_.Get())->getLibraryReferences(), iterator.Get(),
+                                     root.Out()),
+              CitI::kOk);
     return root;
   }
 

@@ -6,8 +6,8 @@
 #include <optional>
 #include <string>
 
-#include "ScopedEnv.h"
 #include "Port/Env.h"
+#include "ScopedEnv.h"
 
 namespace fs = std::filesystem;
 

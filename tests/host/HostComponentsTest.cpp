@@ -11,13 +11,13 @@
 #include "IDesignUnitTypeStore.h"
 #include "IEventSender.h"
 #include "IFile.h"
-#include "ScopedTempDir.h"
 #include "IFileNameHelper.h"
 #include "IName.h"
 #include "ISourceLibrary.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/Casts.h"
 #include "RavA/Factory.h"
+#include "ScopedTempDir.h"
 
 namespace {
 
@@ -295,9 +295,9 @@ TEST_F(HostComponents, SourceLibraryAnswersINameWithItsName) {
   EXPECT_EQ(library->SetName("ieee"), CitI::kOk);
   name->GetName(&text);
   EXPECT_EQ(text, "ieee");
-  EXPECT_EQ(name->SetName("unisim"), CitI::kOk);
+  EXPECT_EQ(name->SetName("basecell"), CitI::kOk);
   library->GetName(&text);
-  EXPECT_EQ(text, "unisim");
+  EXPECT_EQ(text, "basecell");
   EXPECT_EQ(name->SetName(""), CitI::kInvalidArg);
   EXPECT_EQ(name->GetName(nullptr), CitI::kInvalidArg);
   EXPECT_EQ(Prjrep::QueryAs<Vad::ISourceLibrary>(name.Get()), library.Get());

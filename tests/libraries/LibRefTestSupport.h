@@ -1,25 +1,23 @@
-// Shared pieces of the library-reference tests: environment and working-directory scopes, a
-// parser configuration with a device family, and a loader that counts what it is asked to do.
+// Shared pieces of the library-reference tests: environment and working-directory scopes and a
+// loader that counts what it is asked to do.
 #pragma once
 
 #include <gtest/gtest.h>
 
 #include <memory>
-#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
 
-#include "ScopedEnv.h"
 #include "CLibLoader.h"
 #include "CLibRefs.h"
-#include "CParserConfigBase.h"
 #include "Host/PropertyInstance.h"
 #include "Port/Env.h"
 #include "Port/File.h"
 #include "Port/StringBase.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/Casts.h"
+#include "ScopedEnv.h"
 #include "rudiva/RudIva.h"
 
 namespace libref_test {
@@ -48,18 +46,6 @@ inline std::string CurrentDirectory() {
   Port::StringBase dir;
   EXPECT_TRUE(Port::File::getcwd(&dir));
   return dir.str();
-}
-
-// A parser configuration holding the device-family property (none when `family` is nothing).
-inline Prjrep::AutoPtr<CitI::IInterface> ConfigWithFamily(std::optional<std::string_view> family) {
-  Prjrep::AutoPtr<CitI::IInterface> config;
-  config.Attach(new Vad::CParserConfigBase());
-  if (family) {
-    auto* object = Prjrep::ObjectCast<Vad::CParserConfigBase>(config.Get());
-    EXPECT_EQ(object->AddProperty(Host::PropertyInstance::Create("PROP_DevFamilyPMName", *family).Get()),
-              CitI::kOk);
-  }
-  return config;
 }
 
 // What a CountingLoader was asked to do, kept outside it because the references own the loader.

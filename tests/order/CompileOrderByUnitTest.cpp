@@ -136,7 +136,8 @@ TEST_F(CompileOrderByUnit, WithoutTheByUnitFlagATopNodeGetsTheOrderOfItsOwnTree)
   Vad::IHdlNetListNode* node = Vad::NetListWalk::FindNodeOfUnit(root_.Get(), mid.Get());
   ASSERT_NE(node, nullptr);
   Prjrep::AutoPtr<Vad::IHdlFileIterator> order;
-  ASSERT_EQ(elaborator->GetCompileOrder(project_.Get(), root_.Get(), node, config.Get(), false, order.Out()),
+  ASSERT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), References(), root_.Get(), node, config.Get(),
+                                           false, order.Out()),
             CitI::kOk);
   EXPECT_EQ(FileNames(order.Get()), (Strings{"util.vhd", "mid.vhd"}));
 }
@@ -162,9 +163,11 @@ TEST_F(CompileOrderByUnit, TheReducedTreeNeedsEveryArgument) {
   auto mid = Unit("Architecture|mid|rtl");
   Vad::IHdlNetListNode* node = Vad::NetListWalk::FindNodeOfUnit(root_.Get(), mid.Get());
   Prjrep::AutoPtr<Vad::IHdlFileIterator> order;
-  EXPECT_EQ(elaborator->GetCompileOrder(nullptr, root_.Get(), node, config.Get(), true, order.Out()),
+  EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), nullptr, root_.Get(), node, config.Get(), true,
+                                           order.Out()),
             CitI::kInvalidArg);
-  EXPECT_EQ(elaborator->GetCompileOrder(project_.Get(), root_.Get(), node, nullptr, true, order.Out()),
+  EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), References(), root_.Get(), node, nullptr, true,
+                                           order.Out()),
             CitI::kInvalidArg);
   EXPECT_FALSE(order);
 }

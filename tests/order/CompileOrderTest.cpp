@@ -139,10 +139,12 @@ TEST_F(CompileOrder, MissingArgumentsAreRefused) {
   ASSERT_EQ(Elaboration()->getCompileOrder(nullptr, earlier.Out()), CitI::kOk);
   Vad::IHdlFileIterator* out = earlier.Get();
 
-  EXPECT_EQ(elaborator->GetCompileOrder(project_.Get(), nullptr, nullptr, config.Get(), true, &out),
+  EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), References(), nullptr, nullptr, config.Get(),
+                                           true, &out),
             CitI::kInvalidArg);
   EXPECT_EQ(out, earlier.Get());  // untouched
-  EXPECT_EQ(elaborator->GetCompileOrder(project_.Get(), root.Get(), nullptr, config.Get(), true, nullptr),
+  EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), References(), root.Get(), nullptr, config.Get(),
+                                           true, nullptr),
             CitI::kInvalidArg);
   EXPECT_EQ(Elaboration()->getCompileOrder(nullptr, nullptr), CitI::kInvalidArg);
 }

@@ -146,6 +146,10 @@ class OrderTest : public testing::Test {
     return elaborator;
   }
 
+  Vad::CLibRefs* References() const {
+    return Prjrep::ObjectCast<Vad::CHdlProject>(project_.Get())->getLibraryReferences();
+  }
+
   Prjrep::AutoPtr<Vad::IHdlProject> project_;
   Port_MsgCollector collector_;
   bool defaultWasRegistered_ = false;

@@ -14,9 +14,9 @@
 #include <string_view>
 #include <vector>
 
-#include "PipelineFixtures.h"
 #include "IHdlElaborationData.h"
 #include "IHdlPort.h"
+#include "PipelineFixtures.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "PortExtraction.h"

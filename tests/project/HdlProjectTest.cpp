@@ -85,8 +85,10 @@ TEST_F(HdlProject, KeepsOneConfigurationAndMakesLooseOnesOnRequest) {
   ASSERT_NE(references, nullptr);
   EXPECT_EQ(object->getLibraryReferences(), references);
   EXPECT_EQ(Prjrep::ImplementationCast<Vad::CLibRefs>(references), references);
-  EXPECT_EQ(references->LoadLibraries(nullptr), CitI::kInvalidArg);
-  EXPECT_EQ(references->LoadLibraries(own.Get()), CitI::kOk);
+  // The references follow the configuration's device family, the default one while it has none.
+  EXPECT_EQ(references->Family(), "kestrel");
+  SetProperty(project_.Get(), "PROP_DevFamilyPMName", "lumen");
+  EXPECT_EQ(object->getLibraryReferences()->Family(), "lumen");
 }
 
 TEST_F(HdlProject, FilesAreKeyedByFullPathAndASecondObjectReplacesTheFirst) {

@@ -9,11 +9,11 @@
 #include "EdifParser.h"
 #include "EdifParserEx.h"
 #include "EdifParserPlx.h"
-#include "FsmdrawParser.h"
 #include "GenericParser.h"
 #include "HrfParser.h"
 #include "Parser.h"
 #include "PipelineFixtures.h"
+#include "PluginParserFactory.h"
 #include "PlxParser.h"
 #include "Port/Env.h"
 #include "Port/MsgManData.h"
@@ -101,7 +101,7 @@ TEST_F(ParserFramework, EveryPluginNameOfTheTableGetsItsParserWithoutWarning) {
   ExpectParser<Vad::AbelVectorParser>(ParserFor("PLUGIN_AbelVector"), "PLUGIN_AbelVector");
   ExpectParser<Vad::SchematicParser>(ParserFor("PLUGIN_Schematic"), "PLUGIN_Schematic");
   ExpectParser<Vad::WaverParser>(ParserFor("PLUGIN_Waver"), "PLUGIN_Waver");
-  ExpectParser<Vad::FsmdrawParser>(ParserFor("PLUGIN_Fsmdraw"), "PLUGIN_Fsmdraw");
+  ExpectParser<Vad::SingleModuleParser>(ParserFor("PLUGIN_Fsmdraw"), "PLUGIN_Fsmdraw");
   ExpectParser<Vad::GenericParser>(ParserFor("PLUGIN_General"), "PLUGIN_General");
   EXPECT_EQ(debug.text(), "");
 }

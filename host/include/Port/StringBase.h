@@ -12,8 +12,8 @@ namespace Port {
 
 // Comparison types of StringBase::Compare.
 enum CompareType : int {
-  kCompareExact = 0,     // byte order
-  kCompareNoCase = 1,    // ASCII letters folded to lower case, then byte order
+  kCompareExact = 0,   // byte order
+  kCompareNoCase = 1,  // ASCII letters folded to lower case, then byte order
 };
 
 class StringBase {
@@ -22,8 +22,9 @@ class StringBase {
 
   StringBase() = default;
   StringBase(const char* text) : text_(text ? text : "") {}  // NOLINT: implicit by design
-  StringBase(const char* text, std::size_t length) : text_(text ? std::string(text, length) : std::string()) {}
-  StringBase(std::string_view text) : text_(text) {}  // NOLINT
+  StringBase(const char* text, std::size_t length)
+      : text_(text ? std::string(text, length) : std::string()) {}
+  StringBase(std::string_view text) : text_(text) {}        // NOLINT
   StringBase(std::string text) : text_(std::move(text)) {}  // NOLINT
 
   const char* c_str() const { return text_.c_str(); }
@@ -35,13 +36,34 @@ class StringBase {
   void Empty() { text_.clear(); }
   char operator[](std::size_t i) const { return text_[i]; }
 
-  StringBase& operator=(std::string_view text) { text_.assign(text); return *this; }
-  StringBase& operator=(const char* text) { text_.assign(text ? text : ""); return *this; }
-  StringBase& operator=(std::string text) { text_ = std::move(text); return *this; }
-  StringBase& operator+=(std::string_view text) { text_.append(text); return *this; }
-  StringBase& operator+=(char c) { text_.push_back(c); return *this; }
-  StringBase& Append(std::string_view text) { text_.append(text); return *this; }
-  StringBase& Append(char c) { text_.push_back(c); return *this; }
+  StringBase& operator=(std::string_view text) {
+    text_.assign(text);
+    return *this;
+  }
+  StringBase& operator=(const char* text) {
+    text_.assign(text ? text : "");
+    return *this;
+  }
+  StringBase& operator=(std::string text) {
+    text_ = std::move(text);
+    return *this;
+  }
+  StringBase& operator+=(std::string_view text) {
+    text_.append(text);
+    return *this;
+  }
+  StringBase& operator+=(char c) {
+    text_.push_back(c);
+    return *this;
+  }
+  StringBase& Append(std::string_view text) {
+    text_.append(text);
+    return *this;
+  }
+  StringBase& Append(char c) {
+    text_.push_back(c);
+    return *this;
+  }
 
   // printf-style; Format replaces the text, AppendFormat appends to it. Any length.
   StringBase& Format(const char* format, ...) __attribute__((format(printf, 2, 3)));
@@ -104,7 +126,10 @@ class StringBase {
   friend bool operator==(const StringBase& a, const char* b) { return b && a.text_ == b; }
   friend bool operator==(const StringBase& a, const std::string& b) { return a.text_ == b; }
   friend auto operator<=>(const StringBase& a, const StringBase& b) { return a.text_ <=> b.text_; }
-  friend StringBase operator+(StringBase a, std::string_view b) { a += b; return a; }
+  friend StringBase operator+(StringBase a, std::string_view b) {
+    a += b;
+    return a;
+  }
 
  private:
   std::string text_;

@@ -1,4 +1,5 @@
-// A file of another tool that stands for one module, named after the file's base name.
+// A file of another tool that stands for one module, named after the file's base name: the
+// single-module and the state-diagram sources.
 #pragma once
 
 #include "Parser.h"

@@ -14,9 +14,9 @@
 #include <string_view>
 #include <vector>
 
-#include "PipelineFixtures.h"
 #include "CHdlElement.h"
 #include "CParserConfigHolder.h"
+#include "PipelineFixtures.h"
 #include "Port/File.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"

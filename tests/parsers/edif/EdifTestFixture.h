@@ -11,11 +11,11 @@
 #include <string_view>
 #include <vector>
 
-#include "PipelineFixtures.h"
 #include "CHdlElement.h"
 #include "CParserConfigHolder.h"
 #include "EdifParser.h"
 #include "EdifParserEx.h"
+#include "PipelineFixtures.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "ScopedTempDir.h"

@@ -12,8 +12,8 @@
 #include <string_view>
 #include <vector>
 
-#include "PipelineFixtures.h"
 #include "CHdlElement.h"
+#include "PipelineFixtures.h"
 #include "Port/Env.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"

@@ -10,9 +10,9 @@
 #include <string_view>
 #include <vector>
 
-#include "PipelineFixtures.h"
 #include "CHdlElement.h"
 #include "CVhdlDU.h"
+#include "PipelineFixtures.h"
 #include "ScopedTempDir.h"
 #include "VhdlParser.h"
 

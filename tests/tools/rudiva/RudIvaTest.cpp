@@ -9,10 +9,10 @@
 #include <system_error>
 #include <vector>
 
-#include "ScopedEnv.h"
 #include "Port/Env.h"
 #include "Port/File.h"
 #include "Port/StringBase.h"
+#include "ScopedEnv.h"
 #include "ScopedTempDir.h"
 #include "rudiva/RudIva.h"
 #include "rudiva/RudIva_LibraryMap.h"

@@ -1,7 +1,7 @@
 #include "MsgCapture.h"
 
-#include <cwchar>
 #include <cstdlib>
+#include <cwchar>
 #include <string>
 #include <vector>
 
