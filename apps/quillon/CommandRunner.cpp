@@ -158,16 +158,17 @@ int CommandRunner::Units(ProjectReader& reader, std::ostream& out) {
 }
 
 int CommandRunner::Tree(Vad::IHdlProject* project, std::ostream& out) {
-  TreeNodeInfo root;
-  CitI::Result result = TreeReader::Read(project, root);
+  TreeInfo tree;
+  bool json = options_.format == Format::kJson;
+  CitI::Result result = TreeReader::Read(project, tree, json);
   int status = result == CitI::kOk ? Finished() : Failed("the design hierarchy is not available", result);
   bool built = result == CitI::kOk;
-  if (options_.format == Format::kJson) {
-    JsonOutput::Tree(built ? &root : nullptr, log_->messages(), out);
+  if (json) {
+    JsonOutput::Tree(built ? &tree : nullptr, log_->messages(), out);
   } else if (built && options_.format == Format::kDot) {
-    DotOutput::Tree(root, out);
+    DotOutput::Tree(tree, out);
   } else if (built) {
-    TextOutput::Tree(root, out);
+    TextOutput::Tree(tree, out);
   }
   return status;
 }
@@ -196,9 +197,9 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
   if (options_.format == Format::kJson) {
     JsonOutput::Order(ordered ? &order : nullptr, log_->messages(), out);
   } else if (ordered && options_.format == Format::kDot) {
-    TreeNodeInfo root;
-    TreeReader::Read(project, root);
-    DotOutput::Order(FileGraph::Build(root, order), out);
+    TreeInfo tree;
+    TreeReader::Read(project, tree, false);
+    DotOutput::Order(FileGraph::Build(tree, order), out);
   } else if (ordered) {
     TextOutput::Order(order, options_.withLibrary, out);
   }

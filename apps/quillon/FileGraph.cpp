@@ -13,15 +13,28 @@ namespace {
 using FileIndex = std::map<std::string, std::size_t>;
 using EdgeSet = std::set<std::pair<std::size_t, std::size_t>>;
 
-void CollectEdges(const TreeNodeInfo& node, const FileIndex& files, EdgeSet& edges) {
-  if (!node.file) return;
-  auto from = files.find(*node.file);
-  for (const TreeNodeInfo& child : node.children) {
-    if (!child.file || from == files.end()) continue;
-    auto to = files.find(*child.file);
-    if (to != files.end() && to->second != from->second) edges.insert({from->second, to->second});
+// The edges from each node's file to its children's files, walked from `start` without
+// recursing; a shared subtree once, and nothing below a node without a file.
+void CollectEdges(const TreeInfo& tree, std::size_t start, const FileIndex& files, EdgeSet& edges,
+                  std::vector<bool>& walked) {
+  auto resolved = [&](std::size_t index) { return tree.nodes[index].sharedWith.value_or(index); };
+  std::vector<std::size_t> pending{start};
+  while (!pending.empty()) {
+    std::size_t index = resolved(pending.back());
+    pending.pop_back();
+    if (walked[index]) continue;
+    walked[index] = true;
+    const TreeNodeInfo& node = tree.nodes[index];
+    if (!node.file) continue;
+    auto from = files.find(*node.file);
+    for (std::size_t child : node.children) {
+      const TreeNodeInfo& childNode = tree.nodes[child];
+      if (!childNode.file || from == files.end()) continue;
+      auto to = files.find(*childNode.file);
+      if (to != files.end() && to->second != from->second) edges.insert({from->second, to->second});
+    }
+    pending.insert(pending.end(), node.children.rbegin(), node.children.rend());
   }
-  for (const TreeNodeInfo& child : node.children) CollectEdges(child, files, edges);
 }
 
 std::vector<int> ComponentOfEachFile(std::size_t fileCount, const EdgeSet& edges) {
@@ -34,17 +47,18 @@ std::vector<int> ComponentOfEachFile(std::size_t fileCount, const EdgeSet& edges
 
 }  // namespace
 
-FileGraphInfo FileGraph::Build(const TreeNodeInfo& root, const std::vector<OrderEntry>& order) {
+FileGraphInfo FileGraph::Build(const TreeInfo& tree, const std::vector<OrderEntry>& order) {
   FileGraphInfo graph;
   FileIndex index;
   for (const OrderEntry& entry : order) {
     if (index.emplace(entry.path, graph.files.size()).second) graph.files.push_back(entry.path);
   }
   EdgeSet edges;
-  if (root.file) {
-    CollectEdges(root, index, edges);
-  } else {
-    for (const TreeNodeInfo& top : root.children) CollectEdges(top, index, edges);
+  std::vector<bool> walked(tree.nodes.size(), false);
+  if (!tree.nodes.empty() && tree.Root().file) {
+    CollectEdges(tree, 0, index, edges, walked);
+  } else if (!tree.nodes.empty()) {
+    for (std::size_t top : tree.Root().children) CollectEdges(tree, top, index, edges, walked);
   }
   std::vector<int> component = ComponentOfEachFile(graph.files.size(), edges);
   for (const auto& [from, to] : edges) graph.edges.push_back({from, to, component[from] == component[to]});
