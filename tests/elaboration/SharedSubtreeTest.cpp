@@ -265,7 +265,7 @@ class DeepHierarchy : public SharedSubtrees {
 };
 
 // Deep enough that a walk recursing once per level overflows the stack of the sanitizer build.
-constexpr int kChainDepth = 60000;
+constexpr int kChainDepth = 30000;
 constexpr int kUnitsPerFile = 1000;
 
 TEST_F(DeepHierarchy, InstanceChainAndPackageChainElaborateOrderAndFree) {
