@@ -174,19 +174,20 @@ int CommandRunner::Units(ProjectReader& reader, std::ostream& out) {
 }
 
 int CommandRunner::Tree(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out) {
-  TreeNodeInfo root;
-  CitI::Result result = TreeReader::Read(project, root);
+  TreeInfo tree;
+  bool json = options_.format == Format::kJson;
+  CitI::Result result = TreeReader::Read(project, tree, json);
   int status = result == CitI::kOk ? Finished() : Failed("the design hierarchy is not available", result);
   bool built = result == CitI::kOk;
   // The order is not asked for: its cycle messages belong to the order command.
   std::vector<Diagnostic> diagnostics = DiagnosticReport::AsWarnings(Diagnose(reader, project, nullptr));
   ShowDiagnostics(diagnostics);
-  if (options_.format == Format::kJson) {
-    JsonOutput::Tree(built ? &root : nullptr, log_->messages(), out, diagnostics);
+  if (json) {
+    JsonOutput::Tree(built ? &tree : nullptr, log_->messages(), out, diagnostics);
   } else if (built && options_.format == Format::kDot) {
-    DotOutput::Tree(root, out);
+    DotOutput::Tree(tree, out);
   } else if (built) {
-    TextOutput::Tree(root, out);
+    TextOutput::Tree(tree, out);
   }
   return status;
 }
@@ -219,9 +220,9 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
   if (options_.format == Format::kJson) {
     JsonOutput::Order(ordered ? &order : nullptr, log_->messages(), out, diagnostics);
   } else if (ordered && options_.format == Format::kDot) {
-    TreeNodeInfo root;
-    TreeReader::Read(project, root);
-    DotOutput::Order(FileGraph::Build(root, order), out);
+    TreeInfo tree;
+    TreeReader::Read(project, tree, false);
+    DotOutput::Order(FileGraph::Build(tree, order), out);
   } else if (ordered) {
     TextOutput::Order(order, options_.withLibrary, out);
   }
@@ -291,8 +292,8 @@ std::vector<Diagnostic> CommandRunner::Diagnose(ProjectReader& reader, Vad::IHdl
     settings.externalLibraries.insert(lower);
   }
   settings.strict = options_.strict;
-  TreeNodeInfo root;
-  bool built = TreeReader::Read(project, root) == CitI::kOk;
+  TreeInfo tree;
+  bool built = TreeReader::Read(project, tree, false) == CitI::kOk;
   return DiagnosticFinder(std::move(settings)).Find(reader.Files(), built ? &root : nullptr, order);
 }
 

@@ -57,7 +57,22 @@ struct TreeNodeInfo {
   std::string partition;
   std::optional<std::string> elementType;
   std::optional<std::string> file;
-  std::vector<TreeNodeInfo> children;
+  // Indices of the children in TreeInfo::nodes, in child order.
+  std::vector<std::size_t> children;
+  // Set on a later occurrence of a shared subtree: the index of its first occurrence. Such an
+  // entry has no children of its own.
+  std::optional<std::size_t> sharedWith;
+  // The parent's index and this node's place among its children; zero for the root.
+  std::size_t parent = 0;
+  std::size_t position = 0;
+};
+
+// A hierarchy as a flat list in pre-order, the root first. A subtree that several parents share
+// is listed in full where it is met first; later occurrences are single entries pointing there.
+// Flat, so that neither reading, printing nor freeing a deep tree recurses.
+struct TreeInfo {
+  std::vector<TreeNodeInfo> nodes;
+  const TreeNodeInfo& Root() const { return nodes.front(); }
 };
 
 struct OrderEntry {

@@ -88,15 +88,11 @@ std::string CellNameOf(const std::string& unit) {
 }
 
 // The unit names of the tree's library-cell nodes, in lower case.
-std::set<std::string> LibraryCells(const TreeNodeInfo* root) {
+std::set<std::string> LibraryCells(const TreeInfo* tree) {
   std::set<std::string> cells;
-  if (!root) return cells;
-  std::vector<const TreeNodeInfo*> stack{root};
-  while (!stack.empty()) {
-    const TreeNodeInfo* node = stack.back();
-    stack.pop_back();
-    if (node->libraryCell) cells.insert(CellNameOf(node->unit));
-    for (const TreeNodeInfo& child : node->children) stack.push_back(&child);
+  if (!tree) return cells;
+  for (const TreeNodeInfo& node : tree->nodes) {
+    if (node.libraryCell) cells.insert(CellNameOf(node.unit));
   }
   return cells;
 }
@@ -225,21 +221,17 @@ void FindDuplicates(const std::vector<FileInfo>& files, std::vector<Diagnostic>&
 
 // Files that use each other through entities and packages: the cycles that the module's relaxed
 // rule keeps, so that no order can put every file after what it uses.
-void FindCycles(const TreeNodeInfo& root, const std::vector<OrderEntry>& order,
-                std::vector<Diagnostic>& out) {
+void FindCycles(const TreeInfo& tree, const std::vector<OrderEntry>& order, std::vector<Diagnostic>& out) {
   std::map<std::string, std::size_t> index;
   std::vector<std::string> paths;
   for (const OrderEntry& entry : order) {
     if (index.emplace(entry.path, paths.size()).second) paths.push_back(entry.path);
   }
   std::set<std::pair<std::size_t, std::size_t>> edges;
-  std::vector<const TreeNodeInfo*> stack{&root};
-  while (!stack.empty()) {
-    const TreeNodeInfo* node = stack.back();
-    stack.pop_back();
-    auto from = node->file ? index.find(*node->file) : index.end();
-    for (const TreeNodeInfo& child : node->children) {
-      stack.push_back(&child);
+  for (const TreeNodeInfo& node : tree.nodes) {
+    auto from = node.file ? index.find(*node.file) : index.end();
+    for (std::size_t childIndex : node.children) {
+      const TreeNodeInfo& child = tree.nodes[tree.nodes[childIndex].sharedWith.value_or(childIndex)];
       bool declaration = child.elementType == "Entity" || child.elementType == "PackageDecl";
       auto to = child.file ? index.find(*child.file) : index.end();
       if (declaration && from != index.end() && to != index.end() && from->second != to->second)
@@ -266,15 +258,15 @@ void FindCycles(const TreeNodeInfo& root, const std::vector<OrderEntry>& order,
 
 DiagnosticFinder::DiagnosticFinder(Settings settings) : settings_(std::move(settings)) {}
 
-std::vector<Diagnostic> DiagnosticFinder::Find(const std::vector<FileInfo>& files, const TreeNodeInfo* root,
+std::vector<Diagnostic> DiagnosticFinder::Find(const std::vector<FileInfo>& files, const TreeInfo* tree,
                                                const std::vector<OrderEntry>* order) const {
   std::vector<Diagnostic> found;
   UnitIndex units(files);
-  std::set<std::string> cells = LibraryCells(root);
+  std::set<std::string> cells = LibraryCells(tree);
   FileChecker checker(settings_, files, units, cells, found);
   for (const FileInfo& file : files) checker.Check(file);
   FindDuplicates(files, found);
-  if (root && order) FindCycles(*root, *order, found);
+  if (tree && !tree->nodes.empty() && order) FindCycles(*tree, *order, found);
   return found;
 }
 

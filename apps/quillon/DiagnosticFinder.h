@@ -27,9 +27,9 @@ class DiagnosticFinder {
 
   explicit DiagnosticFinder(Settings settings);
 
-  // In file order, each file's findings in record order; then the order findings. `root` and
+  // In file order, each file's findings in record order; then the order findings. `tree` and
   // `order` may be null when they are not available.
-  std::vector<Diagnostic> Find(const std::vector<FileInfo>& files, const TreeNodeInfo* root,
+  std::vector<Diagnostic> Find(const std::vector<FileInfo>& files, const TreeInfo* tree,
                                const std::vector<OrderEntry>* order) const;
 
  private:

@@ -2,6 +2,7 @@
 
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace quillon {
 
@@ -30,35 +31,50 @@ std::string NodeLabel(const TreeNodeInfo& node) {
   return label;
 }
 
-class TreeDrawing {
- public:
-  explicit TreeDrawing(std::ostream& out) : out_(out) {}
-
-  // Draws the node and its subtree; returns the node's id.
-  std::string Draw(const TreeNodeInfo& node) {
-    std::string id = "n" + std::to_string(next_++);
-    out_ << "  " << id << " [label=" << Quoted(NodeLabel(node));
-    if (node.libraryCell) out_ << ", style=dashed";
-    if (!node.partition.empty()) out_ << ", peripheries=2";
-    out_ << "];\n";
-    for (const TreeNodeInfo& child : node.children) {
-      std::string childId = Draw(child);
-      out_ << "  " << id << " -> " << childId << ";\n";
-    }
-    return id;
-  }
-
- private:
-  std::ostream& out_;
-  std::size_t next_ = 0;
-};
+void DrawNode(const TreeNodeInfo& node, const std::string& id, std::ostream& out) {
+  out << "  " << id << " [label=" << Quoted(NodeLabel(node));
+  if (node.libraryCell) out << ", style=dashed";
+  if (!node.partition.empty()) out << ", peripheries=2";
+  out << "];\n";
+}
 
 }  // namespace
 
-void DotOutput::Tree(const TreeNodeInfo& root, std::ostream& out) {
+void DotOutput::Tree(const TreeInfo& tree, std::ostream& out) {
   out << "digraph hierarchy {\n  node [shape=box];\n";
-  TreeDrawing drawing(out);
-  for (const TreeNodeInfo& top : root.children) drawing.Draw(top);
+  // Boxes numbered in pre-order; the edge to a child follows the child's subtree.
+  std::vector<std::string> ids(tree.nodes.size());
+  std::size_t next = 0;
+  auto idOf = [&](std::size_t index) -> const std::string& {
+    if (ids[index].empty()) ids[index] = "n" + std::to_string(next++);
+    return ids[index];
+  };
+  struct Open {
+    std::size_t index;
+    std::size_t nextChild;
+  };
+  std::vector<Open> open;
+  auto enter = [&](std::size_t index) {
+    DrawNode(tree.nodes[index], idOf(index), out);
+    open.push_back({index, 0});
+  };
+  if (!tree.nodes.empty()) open.push_back({0, 0});
+  while (!open.empty()) {
+    Open& top = open.back();
+    const TreeNodeInfo& node = tree.nodes[top.index];
+    if (top.nextChild == node.children.size()) {
+      if (top.index != 0 && node.parent != 0) out << "  " << ids[node.parent] << " -> " << ids[top.index] << ";\n";
+      open.pop_back();
+      continue;
+    }
+    std::size_t child = node.children[top.nextChild++];
+    const TreeNodeInfo& childNode = tree.nodes[child];
+    if (!childNode.sharedWith) {
+      enter(child);
+    } else if (top.index != 0) {
+      out << "  " << ids[top.index] << " -> " << idOf(*childNode.sharedWith) << ";\n";
+    }
+  }
   out << "}\n";
 }
 

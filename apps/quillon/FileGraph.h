@@ -14,7 +14,7 @@ class FileGraph {
   // The files of `order` in its order and the edges among them that the hierarchy below `root`
   // gives, one per pair of files. Nodes without a file contribute nothing below them; the root
   // itself stands for its children.
-  static FileGraphInfo Build(const TreeNodeInfo& root, const std::vector<OrderEntry>& order);
+  static FileGraphInfo Build(const TreeInfo& tree, const std::vector<OrderEntry>& order);
 };
 
 }  // namespace quillon

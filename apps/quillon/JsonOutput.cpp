@@ -1,6 +1,8 @@
 #include "JsonOutput.h"
 
+#include <algorithm>
 #include <nlohmann/json.hpp>
+#include <string>
 
 namespace quillon {
 
@@ -69,15 +71,77 @@ Json FileObject(const FileInfo& file) {
       {"path", file.path}, {"plugin", file.plugin}, {"library", file.library}, {"units", std::move(units)}};
 }
 
-Json NodeObject(const TreeNodeInfo& node) {
-  Json children = Json::array();
-  for (const TreeNodeInfo& child : node.children) children.push_back(NodeObject(child));
-  return {{"name", node.name},           {"kind", node.kind},
-          {"unit", node.unit},           {"architecture", node.architecture},
-          {"instance", node.instance},   {"path", node.path},
-          {"type", node.type},           {"libraryCell", node.libraryCell},
-          {"partition", node.partition}, {"elementType", OrNull(node.elementType)},
-          {"file", OrNull(node.file)},   {"children", std::move(children)}};
+std::string Scalar(const Json& value) { return value.dump(-1, ' ', false, Json::error_handler_t::replace); }
+
+std::string Indent(std::size_t level) { return std::string(std::min(level, JsonOutput::kDeepestIndent) * 2, ' '); }
+
+// "/root/children/I/children/J..." of the node at `index`.
+std::string PointerTo(const TreeInfo& tree, std::size_t index) {
+  std::vector<std::size_t> positions;
+  for (; index != 0; index = tree.nodes[index].parent) positions.push_back(tree.nodes[index].position);
+  std::string pointer = "/root";
+  for (auto position = positions.rbegin(); position != positions.rend(); ++position)
+    pointer += "/children/" + std::to_string(*position);
+  return pointer;
+}
+
+// Everything of a NODE up to its "children" key, the object's brace written already.
+void WriteNodeFields(const TreeInfo& tree, const TreeNodeInfo& node, std::size_t level, std::ostream& out) {
+  const std::string inner = Indent(level + 1);
+  auto field = [&](const char* name, const Json& value) {
+    out << inner << '"' << name << "\": " << Scalar(value) << ",\n";
+  };
+  field("name", node.name);
+  field("kind", node.kind);
+  field("unit", node.unit);
+  field("architecture", node.architecture);
+  field("instance", node.instance);
+  field("path", node.path);
+  field("type", node.type);
+  field("libraryCell", node.libraryCell);
+  field("partition", node.partition);
+  field("elementType", OrNull(node.elementType));
+  field("file", OrNull(node.file));
+  if (node.sharedWith) {
+    field("shared", true);
+    field("firstOccurrence", PointerTo(tree, *node.sharedWith));
+  }
+  out << inner << "\"children\": ";
+}
+
+// The NODE tree in the layout of Write, with an explicit stack: trees can be deep.
+void WriteTree(const TreeInfo& tree, std::ostream& out) {
+  struct Open {
+    std::size_t index;
+    std::size_t level;
+    std::size_t next;
+  };
+  std::vector<Open> open;
+  auto enter = [&](std::size_t index, std::size_t level) {
+    out << "{\n";
+    WriteNodeFields(tree, tree.nodes[index], level, out);
+    if (tree.nodes[index].children.empty()) {
+      out << "[]\n" << Indent(level) << '}';
+      return;
+    }
+    out << "[\n";
+    open.push_back({index, level, 0});
+  };
+  enter(0, 1);
+  while (!open.empty()) {
+    Open& top = open.back();
+    const std::vector<std::size_t>& children = tree.nodes[top.index].children;
+    if (top.next == children.size()) {
+      out << '\n' << Indent(top.level + 1) << "]\n" << Indent(top.level) << '}';
+      open.pop_back();
+      continue;
+    }
+    if (top.next > 0) out << ",\n";
+    std::size_t child = children[top.next++];
+    std::size_t level = top.level + 2;
+    out << Indent(level);
+    enter(child, level);
+  }
 }
 
 Json PortObject(const PortInfo& port) {
@@ -101,12 +165,26 @@ void JsonOutput::Units(const std::vector<FileInfo>& files, const std::vector<Mes
   Write({{"files", std::move(list)}, {"messages", MessageList(messages)}}, out);
 }
 
-void JsonOutput::Tree(const TreeNodeInfo* root, const std::vector<MessageInfo>& messages, std::ostream& out,
+void JsonOutput::Tree(const TreeInfo* tree, const std::vector<MessageInfo>& messages, std::ostream& out,
                       const std::vector<Diagnostic>& diagnostics) {
-  Write({{"root", root ? NodeObject(*root) : Json(nullptr)},
-         {"messages", MessageList(messages)},
-         {"diagnostics", DiagnosticList(diagnostics)}},
-        out);
+  out << "{\n  \"root\": ";
+  if (tree && !tree->nodes.empty()) {
+    WriteTree(*tree, out);
+  } else {
+    out << "null";
+  }
+  // The lists one level in, as Write would lay them out; strings hold no raw line ends.
+  auto indented = [](const Json& list) {
+    std::string text = list.dump(2, ' ', false, Json::error_handler_t::replace);
+    std::string shifted;
+    for (char c : text) {
+      shifted += c;
+      if (c == '\n') shifted += "  ";
+    }
+    return shifted;
+  };
+  out << ",\n  \"messages\": " << indented(MessageList(messages));
+  out << ",\n  \"diagnostics\": " << indented(DiagnosticList(diagnostics)) << "\n}\n";
 }
 
 void JsonOutput::Order(const std::vector<OrderEntry>* order, const std::vector<MessageInfo>& messages,

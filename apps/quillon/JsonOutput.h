@@ -15,9 +15,13 @@ class JsonOutput {
  public:
   static void Units(const std::vector<FileInfo>& files, const std::vector<MessageInfo>& messages,
                     std::ostream& out);
-  // Tree, Order and Check also list quillon's own diagnostics under "diagnostics".
-  static void Tree(const TreeNodeInfo* root, const std::vector<MessageInfo>& messages, std::ostream& out,
+  // A later occurrence of a shared subtree is a NODE with "shared": true, "firstOccurrence" (a
+  // JSON pointer to the node printed in full, as "/root/children/0/children/2") and no children.
+  // Deeper than kDeepestIndent levels the indent stops growing. Tree, Order and Check also list
+  // quillon's own diagnostics under "diagnostics".
+  static void Tree(const TreeInfo* tree, const std::vector<MessageInfo>& messages, std::ostream& out,
                    const std::vector<Diagnostic>& diagnostics = {});
+  static constexpr std::size_t kDeepestIndent = 100;
   static void Order(const std::vector<OrderEntry>* order, const std::vector<MessageInfo>& messages,
                     std::ostream& out, const std::vector<Diagnostic>& diagnostics = {});
   static void Check(std::size_t files, std::size_t units, const std::vector<MessageInfo>& messages,

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <string>
+#include <utility>
 
 namespace quillon {
 
@@ -32,22 +33,37 @@ void TextOutput::Units(const std::vector<FileInfo>& files, std::ostream& out) {
   }
 }
 
-void TextOutput::Tree(const TreeNodeInfo& root, std::ostream& out) {
-  for (const TreeNodeInfo& child : root.children) Node(child, 0, out);
+void TextOutput::Tree(const TreeInfo& tree, std::ostream& out) {
+  if (tree.nodes.empty()) return;
+  std::vector<std::pair<std::size_t, std::size_t>> pending;  // node index, depth
+  const std::vector<std::size_t>& tops = tree.Root().children;
+  for (auto top = tops.rbegin(); top != tops.rend(); ++top) pending.emplace_back(*top, 0);
+  while (!pending.empty()) {
+    auto [index, depth] = pending.back();
+    pending.pop_back();
+    const TreeNodeInfo& node = tree.nodes[index];
+    Node(node, depth, out);
+    for (auto child = node.children.rbegin(); child != node.children.rend(); ++child)
+      pending.emplace_back(*child, depth + 1);
+  }
 }
 
-void TextOutput::Node(const TreeNodeInfo& node, int depth, std::ostream& out) {
-  out << std::string(static_cast<std::size_t>(depth) * 2, ' ');
+void TextOutput::Node(const TreeNodeInfo& node, std::size_t depth, std::ostream& out) {
+  out << std::string(std::min(depth, kDeepestIndent) * 2, ' ');
+  if (depth > kDeepestIndent) out << "(level " << depth << ") ";
   if (!node.instance.empty()) out << node.instance << ": ";
   out << (node.unit.empty() ? node.name : node.unit);
   if (!node.architecture.empty()) out << '(' << node.architecture << ')';
   if (!node.kind.empty()) out << " [" << node.kind << ']';
+  if (node.sharedWith) {
+    out << " (shared, see above)\n";
+    return;
+  }
   if (node.file) out << "  " << *node.file;
   if (node.libraryCell) out << " (library cell)";
   if (!node.libraryCell && !node.elementType) out << " (not in the project)";
   if (!node.partition.empty()) out << " (partition " << node.partition << ')';
   out << '\n';
-  for (const TreeNodeInfo& child : node.children) Node(child, depth + 1, out);
 }
 
 void TextOutput::Order(const std::vector<OrderEntry>& order, bool withLibrary, std::ostream& out) {

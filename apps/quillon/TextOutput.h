@@ -14,8 +14,12 @@ class TextOutput {
   // type name alone (libraries, uses, instances) show their name instead.
   static void Units(const std::vector<FileInfo>& files, std::ostream& out);
   // The root's children and their subtrees, two blanks of indent a level: instance label, unit,
-  // architecture, kind, file and the flags (library cell, not in the project, partition).
-  static void Tree(const TreeNodeInfo& root, std::ostream& out);
+  // architecture, kind, file and the flags (library cell, not in the project, partition). A
+  // shared subtree is printed in full once; later occurrences are one line ending in "(shared,
+  // see above)". Below kDeepestIndent levels the indent stops growing and the line starts with
+  // its level instead.
+  static void Tree(const TreeInfo& tree, std::ostream& out);
+  static constexpr std::size_t kDeepestIndent = 100;
   // One path a line; with the library and a blank before it when asked.
   static void Order(const std::vector<OrderEntry>& order, bool withLibrary, std::ostream& out);
   // One line a port: POSITION NAME DIRECTION TYPE, then HIGH..LOW when the port has a range.
@@ -24,7 +28,7 @@ class TextOutput {
   static void CheckSummary(std::size_t files, std::size_t units, int errors, int warnings, std::ostream& out);
 
  private:
-  static void Node(const TreeNodeInfo& node, int depth, std::ostream& out);
+  static void Node(const TreeNodeInfo& node, std::size_t depth, std::ostream& out);
 };
 
 }  // namespace quillon

@@ -1,5 +1,9 @@
 #include "TreeReader.h"
 
+#include <unordered_map>
+#include <utility>
+#include <vector>
+
 #include "FileFacts.h"
 #include "IHdlElaborationData.h"
 #include "IHdlElement.h"
@@ -32,17 +36,19 @@ std::optional<std::string> ElementFileOf(Vad::IHdlElement* element) {
   return FileFacts::PathOf(file.Get());
 }
 
-void DescribeChildren(Vad::IHdlNetListNode* node, std::vector<TreeNodeInfo>& children) {
+std::vector<Vad::IHdlNetListNode*> ChildrenOf(Vad::IHdlNetListNode* node) {
+  std::vector<Vad::IHdlNetListNode*> children;
   Prjrep::AutoRelease<Vad::IHdlNetListNodeIterator> iterator;
-  if (node->GetChildren(iterator.Out()) != CitI::kOk || !iterator) return;
+  if (node->GetChildren(iterator.Out()) != CitI::kOk || !iterator) return children;
   for (iterator->First(); !iterator->IsDone(); iterator->Next()) {
-    if (Vad::IHdlNetListNode* child = iterator->Current()) children.push_back(TreeReader::Describe(child));
+    if (Vad::IHdlNetListNode* child = iterator->Current()) children.push_back(child);
   }
+  return children;
 }
 
 }  // namespace
 
-TreeNodeInfo TreeReader::Describe(Vad::IHdlNetListNode* node) {
+TreeNodeInfo TreeReader::Describe(Vad::IHdlNetListNode* node, bool withPaths) {
   TreeNodeInfo info;
   auto* internal = Prjrep::QueryAs<Vad::IHdlNetListNodeInternal>(node);
   auto* tcl = Prjrep::QueryAs<UtilI::ITclCollectable>(node);
@@ -51,7 +57,7 @@ TreeNodeInfo TreeReader::Describe(Vad::IHdlNetListNode* node) {
   info.unit = TextOf(node, &Vad::IHdlNetListNode::GetUnitName);
   info.architecture = TextOf(node, &Vad::IHdlNetListNode::GetArchitectureName);
   info.instance = TextOf(node, &Vad::IHdlNetListNode::GetInstanceName);
-  info.path = TextOf(tcl, &UtilI::ITclCollectable::GetName);
+  if (withPaths) info.path = TextOf(tcl, &UtilI::ITclCollectable::GetName);
   info.type = TextOf(tcl, &UtilI::ITclCollectable::GetType);
   info.libraryCell = node->IsLibraryCell();
   info.partition =
@@ -59,18 +65,48 @@ TreeNodeInfo TreeReader::Describe(Vad::IHdlNetListNode* node) {
   Vad::IHdlElement* element = node->GetElement();
   info.elementType = ElementTypeOf(element);
   info.file = ElementFileOf(element);
-  DescribeChildren(node, info.children);
   return info;
 }
 
-CitI::Result TreeReader::Read(Vad::IHdlProject* project, TreeNodeInfo& root) {
+TreeInfo TreeReader::ReadTree(Vad::IHdlNetListNode* root, bool withPaths) {
+  struct Pending {
+    Vad::IHdlNetListNode* node;
+    std::size_t parent;
+    std::size_t position;
+  };
+  TreeInfo tree;
+  // Where each node was met first; only nodes with several parents are met again.
+  std::unordered_map<Vad::IHdlNetListNode*, std::size_t> first;
+  std::vector<Pending> pending{{root, 0, 0}};
+  while (!pending.empty()) {
+    Pending next = pending.back();
+    pending.pop_back();
+    std::size_t index = tree.nodes.size();
+    tree.nodes.push_back(Describe(next.node, withPaths));
+    TreeNodeInfo& info = tree.nodes.back();
+    info.parent = next.parent;
+    info.position = next.position;
+    if (index > 0) tree.nodes[next.parent].children[next.position] = index;
+    auto [seen, isFirst] = first.try_emplace(next.node, index);
+    if (!isFirst) {
+      info.sharedWith = seen->second;
+      continue;
+    }
+    std::vector<Vad::IHdlNetListNode*> children = ChildrenOf(next.node);
+    info.children.resize(children.size());
+    for (std::size_t i = children.size(); i-- > 0;) pending.push_back({children[i], index, i});
+  }
+  return tree;
+}
+
+CitI::Result TreeReader::Read(Vad::IHdlProject* project, TreeInfo& tree, bool withPaths) {
   auto* elaboration = Prjrep::QueryAs<Vad::IHdlElaborationData>(project);
   if (!elaboration) return CitI::kFail;
   Prjrep::AutoRelease<Vad::IHdlNetListNode> node;
   CitI::Result result = elaboration->getHierarchyRoot(node.Out());
   if (result != CitI::kOk) return result;
   if (!node) return CitI::kFail;
-  root = Describe(node.Get());
+  tree = ReadTree(node.Get(), withPaths);
   return CitI::kOk;
 }
 

@@ -1,7 +1,12 @@
 #include "CElaborator.h"
 
 #include <algorithm>
+#include <boost/graph/adjacency_list.hpp>
+#include <boost/graph/strong_components.hpp>
 #include <cstdio>
+#include <string>
+#include <unordered_map>
+#include <unordered_set>
 #include <utility>
 
 #include "Arch.h"
@@ -685,6 +690,76 @@ CitI::Result CElaborator::FindElementByKey(const CElabTables& tables, const Port
   return CitI::kOk;
 }
 
+namespace {
+
+using NameSet = std::unordered_set<std::string_view>;
+
+// The units that lie on a reference cycle (a strongly connected component of more than one
+// unit, or a unit that references itself); only these can reach themselves in the tree.
+NameSet UnitsOnCycles(const CElabTables& tables) {
+  std::unordered_map<std::string_view, std::size_t> index;
+  auto vertexOf = [&index](std::string_view name) { return index.try_emplace(name, index.size()).first->second; };
+  std::vector<std::pair<std::size_t, std::size_t>> edges;
+  NameSet cycles;
+  for (const auto& [name, targets] : tables.m_DependsTable) {
+    std::size_t from = vertexOf(name.view());
+    for (const Port::StringBase& target : targets) {
+      std::size_t to = vertexOf(target.view());
+      if (from == to) cycles.insert(name.view());
+      edges.emplace_back(from, to);
+    }
+  }
+  boost::adjacency_list<boost::vecS, boost::vecS, boost::directedS> graph(index.size());
+  for (const auto& [from, to] : edges) boost::add_edge(from, to, graph);
+  std::vector<std::size_t> component(index.size());
+  std::size_t count = boost::strong_components(graph, component.data());
+  std::vector<std::size_t> size(count, 0);
+  for (std::size_t c : component) ++size[c];
+  for (const auto& [name, vertex] : index) {
+    if (size[component[vertex]] > 1) cycles.insert(name);
+  }
+  return cycles;
+}
+
+// The units of a marker path "|*a||*b|", top first.
+std::vector<std::string> UnitsOfMarkerPath(std::string_view path) {
+  std::vector<std::string> units;
+  while (path.starts_with("|*")) {
+    std::size_t end = path.find("||*", 2);
+    if (end == std::string_view::npos) {
+      units.emplace_back(path.substr(2, path.size() - 2 - (path.ends_with('|') ? 1 : 0)));
+      break;
+    }
+    units.emplace_back(path.substr(2, end - 2));
+    path.remove_prefix(end + 1);
+  }
+  return units;
+}
+
+}  // namespace
+
+// What one hierarchy build keeps between its top nodes.
+struct CElaborator::HierarchyBuild {
+  CElabTables& tables;
+  VisitedMap& visited;
+  MissingNodeList& missing;
+  bool share;
+  NameSet onCycle;
+  // The node built for each shared unit (the tree holds it).
+  std::unordered_map<std::string_view, IHdlNetListNode*> shared;
+  // The units from the top node down to the node being built.
+  NameSet chain;
+};
+
+// A node whose references are being turned into children.
+struct CElaborator::BuildFrame {
+  IHdlNetListNode* node;
+  const Port::StringBase* name;
+  const std::vector<Port::StringBase>* targets;
+  const std::vector<Port::StringBase>* labels;
+  std::size_t next;
+};
+
 CitI::Result CElaborator::BuildHierarchy(CElabTables& tables, CLibRefs* libraryReferences,
                                          IHdlNetListNode* root) {
   if (!root) return CitI::kInvalidArg;
@@ -697,6 +772,7 @@ CitI::Result CElaborator::BuildHierarchy(CElabTables& tables, CLibRefs* libraryR
                    [](const auto& a, const auto& b) { return a.second < b.second; });
 
   MissingNodeList missing;
+  HierarchyBuild build{tables, visited, missing, shareSubtrees_, UnitsOnCycles(tables), {}, {}};
   for (const auto& [name, count] : units) {
     if (visited[name]) continue;
     IHdlElement* element = nullptr;
@@ -707,8 +783,7 @@ CitI::Result CElaborator::BuildHierarchy(CElabTables& tables, CLibRefs* libraryR
     Prjrep::AutoPtr<IHdlNetListNode> node;
     CitI::Result result = CreateNetListNode(key, element, root, node.Out());
     if (result != CitI::kOk) return result;
-    Port::StringBase path;
-    result = BuildSubtree(tables, visited, missing, node.Get(), name, path);
+    result = ExpandSubtree(build, node.Get(), name);
     if (result != CitI::kOk) return result;
   }
 
@@ -733,41 +808,74 @@ CitI::Result CElaborator::BuildSubtree(CElabTables& tables, VisitedMap& visited,
                                        Port::StringBase& path) {
   if (!node) return CitI::kInvalidArg;
   if (!Prjrep::QueryAs<IHdlNetListNodeInternal>(node)) return CitI::kFail;
-  visited[name] = true;
+  HierarchyBuild build{tables, visited, missing, shareSubtrees_, UnitsOnCycles(tables), {}, {}};
+  std::vector<std::string> above = UnitsOfMarkerPath(path.view());
+  for (const std::string& unit : above) build.chain.insert(unit);
+  return ExpandSubtree(build, node, name);
+}
 
-  Port::StringBase marker = Formatted("|*%s|", name);
-  if (path.Find(marker.view()) != Port::StringBase::npos) {
+bool CElaborator::EnterUnit(HierarchyBuild& build, std::vector<BuildFrame>& frames, IHdlNetListNode* node,
+                            const Port::StringBase& name) const {
+  build.visited[name] = true;
+  if (!build.chain.insert(name.view()).second) {
     Messages(__LINE__)->issueWarning(ElabText::kCircularReference, name.c_str());
-    return CitI::kFail;
+    return false;
   }
-  path.Append(marker.view());
+  frames.push_back({node, &name, FindDepends(build.tables, name), FindInstanceLabels(build.tables, name), 0});
+  return true;
+}
 
-  CitI::Result result = CitI::kOk;
-  const std::vector<Port::StringBase>* targets = FindDepends(tables, name);
-  const std::vector<Port::StringBase>* labels = FindInstanceLabels(tables, name);
-  for (std::size_t i = 0; targets && i < targets->size() && result == CitI::kOk; ++i) {
-    // Copied: building the subtree below may add entries to the tables.
-    Port::StringBase target = (*targets)[i];
-    IHdlElement* element = nullptr;
-    FindElementByKey(tables, target, true, &element);
-    Prjrep::AutoPtr<IHdlNetListNode> childInterface;
-    result = CreateNetListNode(target, element, node, childInterface.Out());
-    if (result != CitI::kOk) break;
-    CNetListNode* child = CNetListNode::FromInterface(childInterface.Get());
-    if (!element) missing.push_back(child);
-    if (labels && i < labels->size()) {
-      const Port::StringBase& label = (*labels)[i];
-      child->SetInstanceName(label);
-      // Keyed by the referring unit's qualified name, as the instances were stored.
-      Port::StringBase instanceKey;
-      instanceKey.Format("%s|%s|%s", name.c_str(), target.c_str(), label.c_str());
-      AttachInstanceElement(tables, child, instanceKey);
+CitI::Result CElaborator::ExpandSubtree(HierarchyBuild& build, IHdlNetListNode* node,
+                                        const Port::StringBase& name) {
+  if (!node) return CitI::kInvalidArg;
+  if (!Prjrep::QueryAs<IHdlNetListNodeInternal>(node)) return CitI::kFail;
+  std::vector<BuildFrame> frames;
+  if (!EnterUnit(build, frames, node, name)) return CitI::kFail;
+  while (!frames.empty()) {
+    const BuildFrame& frame = frames.back();
+    if (frame.targets && frame.next < frame.targets->size()) {
+      CitI::Result result = AddNextChild(build, frames);
+      if (result != CitI::kOk) return result;
+      continue;
     }
-    BuildSubtree(tables, visited, missing, childInterface.Get(), target, path);
+    build.chain.erase(frame.name->view());
+    frames.pop_back();
   }
+  return CitI::kOk;
+}
 
-  path.Truncate(path.Length() - marker.Length());
-  return result;
+CitI::Result CElaborator::AddNextChild(HierarchyBuild& build, std::vector<BuildFrame>& frames) {
+  // Taken out before a new frame may move the stack.
+  IHdlNetListNode* parent = frames.back().node;
+  const Port::StringBase& parentName = *frames.back().name;
+  std::size_t index = frames.back().next++;
+  const Port::StringBase& target = (*frames.back().targets)[index];
+  const std::vector<Port::StringBase>* labels = frames.back().labels;
+  const Port::StringBase* label = labels && index < labels->size() ? &(*labels)[index] : nullptr;
+
+  IHdlElement* element = nullptr;
+  FindElementByKey(build.tables, target, true, &element);
+  // Such a subtree is the same under every parent: no ancestor's unit can occur in it.
+  bool shared = build.share && element && (!label || label->IsEmpty()) && !build.onCycle.contains(target.view());
+  if (shared) {
+    auto built = build.shared.find(target.view());
+    if (built != build.shared.end()) return CNetListNode::FromInterface(parent)->AddChild(built->second);
+  }
+  Prjrep::AutoPtr<IHdlNetListNode> childInterface;
+  CitI::Result result = CreateNetListNode(target, element, parent, childInterface.Out());
+  if (result != CitI::kOk) return result;
+  CNetListNode* child = CNetListNode::FromInterface(childInterface.Get());
+  if (!element) build.missing.push_back(child);
+  if (label) {
+    child->SetInstanceName(*label);
+    // Keyed by the referring unit's qualified name, as the instances were stored.
+    Port::StringBase instanceKey;
+    instanceKey.Format("%s|%s|%s", parentName.c_str(), target.c_str(), label->c_str());
+    AttachInstanceElement(build.tables, child, instanceKey);
+  }
+  if (shared) build.shared.emplace(target.view(), childInterface.Get());
+  EnterUnit(build, frames, childInterface.Get(), target);
+  return CitI::kOk;
 }
 
 bool CElaborator::AskCellLibraries(CLibRefs* libraryReferences, const Port::StringBase& cell,
@@ -805,8 +913,7 @@ CitI::Result CElaborator::TestLibraryCell(CElabTables& tables, CLibRefs* library
   SplitDottedName(unitName, cellLibrary, cell);
   if (!cellLibrary.IsEmpty()) return CitI::kOk;
 
-  CNetListNode* parent =
-      missingNode->Parents().empty() ? nullptr : CNetListNode::FromInterface(missingNode->Parents().front());
+  CNetListNode* parent = CNetListNode::FromInterface(missingNode->FirstParent());
   DbObject* parentUnit = parent ? DesignObjectOf(parent->GetElement()) : nullptr;
   if (!parentUnit) return CitI::kOk;
   if (parentUnit->GetType() == DbType::kModule) {
@@ -881,27 +988,36 @@ void CElaborator::DumpTables(const CElabTables& tables) const {
 }
 
 CitI::Result CElaborator::DumpTree(IHdlNetListNode* node, int depth) const {
-  CNetListNode* tree = CNetListNode::FromInterface(node);
-  if (!tree) return CitI::kInvalidArg;
-  std::string indent;
-  for (int i = 0; i < depth; ++i) indent += "|  ";
-  const char* in = indent.c_str();
-  std::printf("%sInstance Name    : %s\n", in, tree->InstanceName().c_str());
-  std::printf("%sModule Name      : %s\n", in, tree->UnitName().c_str());
-  std::printf("%sArchitecture Name: %s\n", in, tree->ArchitectureName().c_str());
-  Port::StringBase partition;
-  if (tree->GetPartition(partition) == CitI::kOk && !partition.IsEmpty())
-    std::printf("%sPartition: %s\n", in, partition.c_str());
-  Prjrep::AutoRelease<IHdlFile> file;
-  if (tree->GetElement() && tree->GetElement()->GetFile(file.Out()) == CitI::kOk && file) {
-    Port::StringBase directory;
-    Port::StringBase fileName;
-    file->getFileName(&directory, &fileName);
-    std::printf("%sFile             : %s%s\n", in, directory.c_str(), fileName.c_str());
-  }
-  for (IHdlNetListNode* child : tree->Children()) {
-    std::printf("%s-----------------------------\n", in);
-    DumpTree(child, depth + 1);
+  CNetListNode* top = CNetListNode::FromInterface(node);
+  if (!top) return CitI::kInvalidArg;
+  std::unordered_set<const CNetListNode*> dumped;
+  std::vector<std::pair<CNetListNode*, int>> pending{{top, depth}};
+  while (!pending.empty()) {
+    auto [tree, level] = pending.back();
+    pending.pop_back();
+    std::string indent;
+    for (int i = 0; i < level; ++i) indent += "|  ";
+    const char* in = indent.c_str();
+    // The separator belongs to the parent's indent, as it stands between the parent's children.
+    if (tree != top) std::printf("%s-----------------------------\n", indent.substr(3).c_str());
+    std::printf("%sInstance Name    : %s\n", in, tree->InstanceName().c_str());
+    std::printf("%sModule Name      : %s\n", in, tree->UnitName().c_str());
+    std::printf("%sArchitecture Name: %s\n", in, tree->ArchitectureName().c_str());
+    Port::StringBase partition;
+    if (tree->GetPartition(partition) == CitI::kOk && !partition.IsEmpty())
+      std::printf("%sPartition: %s\n", in, partition.c_str());
+    Prjrep::AutoRelease<IHdlFile> file;
+    if (tree->GetElement() && tree->GetElement()->GetFile(file.Out()) == CitI::kOk && file) {
+      Port::StringBase directory;
+      Port::StringBase fileName;
+      file->getFileName(&directory, &fileName);
+      std::printf("%sFile             : %s%s\n", in, directory.c_str(), fileName.c_str());
+    }
+    if (tree->HasSeveralParents() && !dumped.insert(tree).second) continue;
+    const std::vector<IHdlNetListNode*>& children = tree->Children();
+    for (auto child = children.rbegin(); child != children.rend(); ++child) {
+      if (CNetListNode* childNode = CNetListNode::FromInterface(*child)) pending.emplace_back(childNode, level + 1);
+    }
   }
   return CitI::kOk;
 }

@@ -102,6 +102,12 @@ class CElaborator final : public CitI::IInterface {
   // Public for the class factory; the object is otherwise ended by its reference count.
   ~CElaborator() override = default;
 
+  // With sharing (the default) a node without an instance label whose unit lies on no reference
+  // cycle is built once per elaboration and linked under every parent that references the unit;
+  // without it such a unit is expanded again under every parent. Both give the same tree to a
+  // walk through GetChildren.
+  void SetShareSubtrees(bool share) { shareSubtrees_ = share; }
+
   CitI::IInterface* QueryInterface(const Port::XUID& id) override;
 
   // ---- what the project calls ----
@@ -180,8 +186,9 @@ class CElaborator final : public CitI::IInterface {
   // One top node under `root` per unit that nothing references (and per unit reached only
   // through a cycle), each with its subtree; then library-cell tests for the missing units.
   CitI::Result BuildHierarchy(CElabTables& tables, CLibRefs* libraryReferences, IHdlNetListNode* root);
-  // The children of `node` for the references of unit `name`, recursively; `path` carries the
-  // chain of units above, so that a unit that reaches itself is cut with a warning.
+  // The children of `node` for the references of unit `name`, and theirs below; `path` carries
+  // the chain of units above ("|*unit|" each), so that a unit that reaches itself is cut with a
+  // warning. `path` is the same on return.
   CitI::Result BuildSubtree(CElabTables& tables, VisitedMap& visited, MissingNodeList& missing,
                             IHdlNetListNode* node, const Port::StringBase& name, Port::StringBase& path);
   // Whether a node without element stands for a cell of the maker's libraries.
@@ -190,10 +197,22 @@ class CElaborator final : public CitI::IInterface {
   // Removes the duplicate suffix from the names of the root's direct children whose element is
   // one of `duplicates`.
   CitI::Result StripDuplicateSuffixes(const DuplicateList& duplicates, IHdlNetListNode* root);
-  // Writes the subtree of `node` to standard output, indented by `depth`.
+  // Writes the subtree of `node` to standard output, indented by `depth`; a shared subtree in
+  // full once, later only its node.
   CitI::Result DumpTree(IHdlNetListNode* node, int depth) const;
 
  private:
+  struct HierarchyBuild;
+  struct BuildFrame;
+
+  // Builds the subtree below `node` for unit `name` without recursing; 0 when `name` is already
+  // on the build's chain (with the warning).
+  CitI::Result ExpandSubtree(HierarchyBuild& build, IHdlNetListNode* node, const Port::StringBase& name);
+  // Marks `name` visited and, unless it is on the chain (warning, false), opens its frame.
+  bool EnterUnit(HierarchyBuild& build, std::vector<BuildFrame>& frames, IHdlNetListNode* node,
+                 const Port::StringBase& name) const;
+  // Makes or links the child of the top frame for its next reference.
+  CitI::Result AddNextChild(HierarchyBuild& build, std::vector<BuildFrame>& frames);
   // Increments the count of `target`, or inserts it with count 0.
   static void CountReference(CElabTables& tables, const Port::StringBase& target);
   CitI::Result ProcessUseClauses(CElabTables& tables, const Port::StringBase& qualified, DbObject* unit,
@@ -223,6 +242,7 @@ class CElaborator final : public CitI::IInterface {
                      const Port::StringBase& cell) const;
 
   Prjrep::TRefCountHelper<CElaborator> refs_{this};
+  bool shareSubtrees_ = true;
 };
 
 // Stands in the hierarchy for a VHDL or Verilog source file that yielded no design unit: a

@@ -2,11 +2,14 @@
 
 #include <algorithm>
 #include <cstdio>
+#include <unordered_set>
+#include <utility>
 
 #include "IHdlDUProperties.h"
 #include "IHdlFile.h"
 #include "Identifiers.h"
 #include "Port/InitObjects.h"
+#include "Prjrep/RefCounting.h"
 
 namespace Vad {
 namespace {
@@ -21,6 +24,23 @@ CitI::Result CopyText(const Port::StringBase& text, Port::StringBase* out) {
   return CitI::kOk;
 }
 
+// Releases `nodes`. A node that dies meanwhile hands its children to the same loop instead of
+// releasing them from its destructor, so that a deep tree is freed without deep recursion.
+void ReleaseWithoutRecursion(std::vector<IHdlNetListNode*> nodes) {
+  static thread_local std::vector<IHdlNetListNode*>* pending = nullptr;
+  if (pending) {
+    pending->insert(pending->end(), nodes.begin(), nodes.end());
+    return;
+  }
+  pending = &nodes;
+  while (!nodes.empty()) {
+    IHdlNetListNode* node = nodes.back();
+    nodes.pop_back();
+    Prjrep::ReleaseOf(node);
+  }
+  pending = nullptr;
+}
+
 }  // namespace
 
 // ---- the node lists ------------------------------------------------------------------------------
@@ -28,10 +48,8 @@ CitI::Result CopyText(const Port::StringBase& text, Port::StringBase* out) {
 template <bool kHoldsReferences>
 CitI::Result TNetListNodeList<kHoldsReferences>::Insert(std::size_t index, IHdlNetListNode* node) {
   if (!node) return CitI::kInvalidArg;
-  const auto offset = static_cast<std::ptrdiff_t>(std::min(index, nodes_.size()));
-  if constexpr (kHoldsReferences)
-    references_.insert(references_.begin() + offset, Prjrep::AutoPtr<IHdlNetListNode>(node));
-  nodes_.insert(nodes_.begin() + offset, node);
+  if constexpr (kHoldsReferences) Prjrep::AddRefOf(node);
+  nodes_.insert(nodes_.begin() + static_cast<std::ptrdiff_t>(std::min(index, nodes_.size())), node);
   return CitI::kOk;
 }
 
@@ -39,22 +57,28 @@ template <bool kHoldsReferences>
 CitI::Result TNetListNodeList<kHoldsReferences>::Remove(IHdlNetListNodeIterator* position) {
   auto* own = Prjrep::OwnIterator(this, position);
   if (!own) return CitI::kFail;
-  const auto offset = static_cast<std::ptrdiff_t>(own->position());
-  nodes_.erase(nodes_.begin() + offset);
+  IHdlNetListNode* node = nodes_[own->position()];
+  nodes_.erase(nodes_.begin() + static_cast<std::ptrdiff_t>(own->position()));
+  if (!node) --holes_;
   if constexpr (kHoldsReferences) {
-    // Released after the entry is gone, as the node may take the list's owner with it.
-    Prjrep::AutoPtr<IHdlNetListNode> released = std::move(references_[offset]);
-    references_.erase(references_.begin() + offset);
+    if (node) Prjrep::ReleaseOf(node);
   }
   return CitI::kOk;
 }
 
 template <bool kHoldsReferences>
+std::vector<IHdlNetListNode*> TNetListNodeList<kHoldsReferences>::Detach() {
+  std::vector<IHdlNetListNode*> detached;
+  detached.swap(nodes_);
+  std::erase(detached, nullptr);
+  holes_ = 0;
+  return detached;
+}
+
+template <bool kHoldsReferences>
 CitI::Result TNetListNodeList<kHoldsReferences>::Clear() {
-  nodes_.clear();
-  // Released after the list is empty, in list order.
-  std::vector<Prjrep::AutoPtr<IHdlNetListNode>> released;
-  released.swap(references_);
+  std::vector<IHdlNetListNode*> released = Detach();
+  if constexpr (kHoldsReferences) ReleaseWithoutRecursion(std::move(released));
   return CitI::kOk;
 }
 
@@ -66,11 +90,28 @@ IHdlNetListNode* TNetListNodeList<kHoldsReferences>::ElementAt(IHdlNetListNodeIt
 
 template <bool kHoldsReferences>
 void TNetListNodeList<kHoldsReferences>::Forget(IHdlNetListNode* node) {
-  std::erase(nodes_, node);
+  if (node) std::erase(nodes_, node);
+}
+
+template <bool kHoldsReferences>
+bool TNetListNodeList<kHoldsReferences>::ForgetAt(std::size_t index, IHdlNetListNode* node) {
+  // A blanked entry of a list that holds references would keep its reference.
+  if (kHoldsReferences || !node || index >= nodes_.size() || nodes_[index] != node) return false;
+  nodes_[index] = nullptr;
+  ++holes_;
+  return true;
 }
 
 template class TNetListNodeList<true>;
 template class TNetListNodeList<false>;
+
+// ---- path texts ----------------------------------------------------------------------------------
+
+CNetListNode::PathPiece::~PathPiece() {
+  std::shared_ptr<const PathPiece> next = std::move(prefix);
+  // Only this piece held `next`: take its prefix before it goes, so each piece dies alone.
+  while (next && next.use_count() == 1) next = std::move(next->prefix);
+}
 
 // ---- the node ------------------------------------------------------------------------------------
 
@@ -81,10 +122,14 @@ CNetListNode::CNetListNode() {
 
 CNetListNode::~CNetListNode() {
   // Children that outlive this node must not keep a link to it.
-  for (IHdlNetListNode* child : children_.Nodes()) {
-    if (CNetListNode* node = FromInterface(child)) node->parents_.Forget(&nodeFace_);
+  const std::vector<IHdlNetListNode*>& children = children_.Nodes();
+  bool slotsKnown = parentSlots_.size() == children.size();
+  for (std::size_t i = 0; i < children.size(); ++i) {
+    CNetListNode* node = FromInterface(children[i]);
+    if (!node) continue;
+    if (!slotsKnown || !node->parents_.ForgetAt(parentSlots_[i], &nodeFace_)) node->parents_.Forget(&nodeFace_);
   }
-  children_.Clear();
+  ReleaseWithoutRecursion(children_.Detach());
 }
 
 CitI::IInterface* CNetListNode::QueryInterface(const Port::XUID& id) {
@@ -110,7 +155,18 @@ CitI::Result CNetListNode::LinkChild(IHdlNetListNode* child, bool atFront) {
   if (!childInternal) return CitI::kInvalidArg;
   CitI::Result result = atFront ? children_.AddFront(child) : children_.Add(child);
   if (result != CitI::kOk) return result;
-  return childInternal->AddParent(&nodeFace_);
+  result = childInternal->AddParent(&nodeFace_);
+  CNetListNode* childNode = FromInterface(child);
+  std::size_t slot = childNode ? childNode->parents_.Nodes().size() - 1 : 0;
+  parentSlots_.insert(atFront ? parentSlots_.begin() : parentSlots_.end(), slot);
+  return result;
+}
+
+IHdlNetListNode* CNetListNode::FirstParent() const {
+  for (IHdlNetListNode* parent : parents_.Nodes()) {
+    if (parent) return parent;
+  }
+  return nullptr;
 }
 
 CitI::Result CNetListNode::AddChildFirst(IHdlNetListNode* child) { return LinkChild(child, true); }
@@ -128,23 +184,55 @@ bool CNetListNode::ElementUsesPlugin(const char* pluginName) const {
   return plugin == pluginName;
 }
 
-void CNetListNode::ComputePaths(const Port::StringBase& parentPath) {
+void CNetListNode::SetPathBelow(const PathText& parentPath) {
+  auto own = [](const char* format, const Port::StringBase& text) {
+    Port::StringBase piece;
+    piece.Format(format, text.c_str());
+    return std::make_shared<const PathPiece>(nullptr, std::move(piece));
+  };
   if (!instanceName_.IsEmpty()) {
-    path_.Format("%s/%s", parentPath.c_str(), instanceName_.c_str());
+    Port::StringBase piece;
+    piece.Format("/%s", instanceName_.c_str());
+    path_ = std::make_shared<const PathPiece>(parentPath, std::move(piece));
     type_ = kInstanceType;
   } else if (kind_ == "Architecture") {
-    path_.Format("/%s", unitName_.c_str());
+    path_ = own("/%s", unitName_);
     type_ = kInstanceType;
   } else if (kind_ == "Module") {
-    path_.Format("/%s", unitName_.c_str());
+    path_ = own("/%s", unitName_);
     type_ = ElementUsesPlugin(kAssocModulePlugin) ? kind_ : Port::StringBase(kInstanceType);
   } else {
-    path_.Empty();
+    path_.reset();
     type_ = kind_;
   }
-  for (IHdlNetListNode* child : children_.Nodes()) {
-    if (auto* internal = Prjrep::QueryAs<IHdlNetListNodeInternal>(child)) internal->ComputePaths(path_);
+}
+
+void CNetListNode::ComputePaths(const Port::StringBase& parentPath) {
+  PathText start = parentPath.IsEmpty() ? nullptr : std::make_shared<const PathPiece>(nullptr, parentPath);
+  // A node with several parents (a shared subtree, or a loop a host made) is done once: nodes
+  // without an instance label have the same path under every parent.
+  std::unordered_set<const CNetListNode*> done{this};
+  std::vector<std::pair<CNetListNode*, PathText>> pending{{this, std::move(start)}};
+  while (!pending.empty()) {
+    auto [node, below] = std::move(pending.back());
+    pending.pop_back();
+    node->SetPathBelow(below);
+    const std::vector<IHdlNetListNode*>& children = node->children_.Nodes();
+    for (auto child = children.rbegin(); child != children.rend(); ++child) {
+      CNetListNode* childNode = FromInterface(*child);
+      if (!childNode) continue;
+      if (childNode->HasSeveralParents() && !done.insert(childNode).second) continue;
+      pending.emplace_back(childNode, node->path_);
+    }
   }
+}
+
+Port::StringBase CNetListNode::Path() const {
+  std::vector<const Port::StringBase*> pieces;
+  for (const PathPiece* piece = path_.get(); piece; piece = piece->prefix.get()) pieces.push_back(&piece->text);
+  Port::StringBase path;
+  for (auto piece = pieces.rbegin(); piece != pieces.rend(); ++piece) path.Append((*piece)->view());
+  return path;
 }
 
 CitI::Result CNetListNode::GetPartition(Port::StringBase& out) const {
@@ -170,7 +258,7 @@ CitI::Result CNetListNode::QueryInstanceData(bool* out) const {
 }
 
 void CNetListNode::Print() const {
-  std::printf("CNetListNode::ITclCollectable -> Name = %s Type = %s\n", path_.c_str(), type_.c_str());
+  std::printf("CNetListNode::ITclCollectable -> Name = %s Type = %s\n", Path().c_str(), type_.c_str());
 }
 
 // ---- IHdlNetListNode -----------------------------------------------------------------------------
@@ -272,7 +360,7 @@ CitI::Result CNetListNode::XIInstanceData::GetInGenerate(bool* out) {
 // ---- UtilI::ITclCollectable ----------------------------------------------------------------------
 
 CitI::Result CNetListNode::XITclCollectable::GetName(Port::StringBase* out) {
-  return CopyText(owner()->path_, out);
+  return CopyText(owner()->Path(), out);
 }
 
 CitI::Result CNetListNode::XITclCollectable::GetType(Port::StringBase* out) {
@@ -281,7 +369,7 @@ CitI::Result CNetListNode::XITclCollectable::GetType(Port::StringBase* out) {
 
 CitI::Result CNetListNode::XITclCollectable::GetCollectionId(Port::StringBase* out) {
   if (!out) return CitI::kInvalidArg;
-  out->Format("netlistnode:%s", owner()->path_.c_str());
+  out->Format("netlistnode:%s", owner()->Path().c_str());
   return CitI::kOk;
 }
 

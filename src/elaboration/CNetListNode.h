@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstddef>
+#include <memory>
 #include <vector>
 
 #include "CitI.h"
@@ -20,7 +21,9 @@ namespace Vad {
 
 // A list of nodes in insertion order behind the node-set interface. The child list holds one
 // reference on each node; the parent list holds none, so that parent links keep nothing alive.
-// Embedded in a node, which is its owner: iterators over it keep the node alive.
+// Embedded in a node, which is its owner: iterators over it keep the node alive. An entry that
+// ForgetAt blanks stays as a null hole that counting and iterating pass over, so that a node
+// shared by many parents loses each dying parent in constant time.
 template <bool kHoldsReferences>
 class TNetListNodeList : public Prjrep::TSetHelper<IHdlNetListNodeSet> {
  public:
@@ -36,29 +39,38 @@ class TNetListNodeList : public Prjrep::TSetHelper<IHdlNetListNodeSet> {
   CitI::Result CreateIterator(IHdlNetListNodeIterator** out) override {
     return Prjrep::CreateSetIterator(this, out);
   }
-  std::uint32_t GetCount() override { return static_cast<std::uint32_t>(nodes_.size()); }
+  std::uint32_t GetCount() override { return static_cast<std::uint32_t>(LiveCount()); }
+  std::size_t LiveCount() const { return nodes_.size() - holes_; }
   CitI::Result Clear() override;
   CitI::Result EraseAt(IHdlNetListNodeIterator* position) override { return Remove(position); }
   IHdlNetListNode* ElementAt(IHdlNetListNodeIterator* position) override;
 
+  // The entries, with null holes where ForgetAt blanked one.
   const std::vector<IHdlNetListNode*>& Nodes() const { return nodes_; }
+  // Hands the entries over without touching their counts and empties the list.
+  std::vector<IHdlNetListNode*> Detach();
   // Drops every entry of `node` without touching its count (for links that hold none).
   void Forget(IHdlNetListNode* node);
+  // Blanks the entry at `index` when it holds `node` (for links that hold none); false otherwise.
+  bool ForgetAt(std::size_t index, IHdlNetListNode* node);
 
   // Positions, for the iterator helper.
-  Position Begin() const { return 0; }
+  Position Begin() const { return SkipHoles(0); }
   bool AtEnd(const Position& position) const { return position >= nodes_.size(); }
-  void Advance(Position& position) const { ++position; }
+  void Advance(Position& position) const { position = SkipHoles(position + 1); }
   IHdlNetListNode* At(const Position& position) const {
     return position < nodes_.size() ? nodes_[position] : nullptr;
   }
 
  private:
   CitI::Result Insert(std::size_t index, IHdlNetListNode* node);
+  Position SkipHoles(Position position) const {
+    while (position < nodes_.size() && !nodes_[position]) ++position;
+    return position;
+  }
 
   std::vector<IHdlNetListNode*> nodes_;
-  // The child list's references, entry for entry beside nodes_; empty in a parent list.
-  std::vector<Prjrep::AutoPtr<IHdlNetListNode>> references_;
+  std::size_t holes_ = 0;
 };
 
 extern template class TNetListNodeList<true>;
@@ -88,13 +100,18 @@ class CNetListNode final : public CitI::IInterface {
   IHdlElement* GetElement() const { return element_.Get(); }
   IHdlElement* GetInstanceElement() const { return instanceElement_.Get(); }
   const std::vector<IHdlNetListNode*>& Children() const { return children_.Nodes(); }
+  // The parents, with null holes where a parent died.
   const std::vector<IHdlNetListNode*>& Parents() const { return parents_.Nodes(); }
+  // The first living parent, or null.
+  IHdlNetListNode* FirstParent() const;
+  // Whether more than one parent links this node (a shared subtree).
+  bool HasSeveralParents() const { return parents_.LiveCount() > 1; }
   const Port::StringBase& Name() const { return name_; }
   const Port::StringBase& Kind() const { return kind_; }
   const Port::StringBase& UnitName() const { return unitName_; }
   const Port::StringBase& ArchitectureName() const { return architectureName_; }
   const Port::StringBase& InstanceName() const { return instanceName_; }
-  const Port::StringBase& Path() const { return path_; }
+  Port::StringBase Path() const;
   const Port::StringBase& Type() const { return type_; }
   bool IsLibraryCell() const { return libraryCell_; }
 
@@ -110,7 +127,8 @@ class CNetListNode final : public CitI::IInterface {
   void SetKind(const Port::StringBase& kind) { kind_ = kind; }
   void SetArchitectureName(const Port::StringBase& name) { architectureName_ = name; }
   void SetUnitName(const Port::StringBase& name) { unitName_ = name; }
-  // Path and type of this node from the parent's path, then of every child from this one's.
+  // Path and type of this node from the parent's path, then of every node below from its
+  // parent's; a node below with several parents is visited once.
   void ComputePaths(const Port::StringBase& parentPath);
 
   // ---- IHdlPartitionData ----
@@ -189,9 +207,23 @@ class CNetListNode final : public CitI::IInterface {
     CitI::Result Print() override;
   };
 
+  // A path text as a chain of pieces shared with the ancestors' paths, so that the paths of a
+  // deep instance chain take linear memory; the text is joined when asked for.
+  struct PathPiece {
+    PathPiece(std::shared_ptr<const PathPiece> before, Port::StringBase piece)
+        : prefix(std::move(before)), text(std::move(piece)) {}
+    // Frees a long chain without recursing through it.
+    ~PathPiece();
+    mutable std::shared_ptr<const PathPiece> prefix;
+    Port::StringBase text;
+  };
+  using PathText = std::shared_ptr<const PathPiece>;
+
   // Links `child` under this node at the front or the back of the children.
   CitI::Result LinkChild(IHdlNetListNode* child, bool atFront);
   bool ElementUsesPlugin(const char* pluginName) const;
+  // Sets this node's path and type below a parent whose path is `parentPath`.
+  void SetPathBelow(const PathText& parentPath);
 
   bool libraryCell_ = false;
   Port::StringBase name_;
@@ -203,7 +235,9 @@ class CNetListNode final : public CitI::IInterface {
   Port::StringBase architectureName_;
   XtHdlNetListNodeSetHelperParent parents_;
   XtHdlNetListNodeSetHelperChild children_;
-  Port::StringBase path_;
+  // Per child, the index of this node in that child's parent list.
+  std::vector<std::size_t> parentSlots_;
+  PathText path_;
   Port::StringBase type_;
   Prjrep::TRefCountHelper<CNetListNode> refs_{this};
   XIHdlNetListNode nodeFace_{this};

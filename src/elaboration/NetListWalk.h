@@ -1,9 +1,12 @@
 // Walks over hierarchy trees through the node interface, shared by the compile order and the
-// reduced unit trees. Trees can be deep, so no walk recurses.
+// reduced unit trees. Trees can be deep, so no walk recurses; a subtree that several parents
+// share is walked once.
 #pragma once
 
+#include <unordered_set>
 #include <vector>
 
+#include "CNetListNode.h"
 #include "CitI.h"
 #include "IHdlElement.h"
 #include "IHdlFile.h"
@@ -40,15 +43,25 @@ inline Prjrep::AutoPtr<IHdlFile> SourceFileOf(IHdlNetListNode* node) {
 
 enum class Step { kDescend, kSkipChildren, kStop };
 
+// Whether several parents hold `node`, so that a walk can meet it more than once.
+inline bool IsShared(IHdlNetListNode* node) {
+  CNetListNode* object = CNetListNode::FromInterface(node);
+  return object && object->HasSeveralParents();
+}
+
 // Visits `start` and the nodes below it in pre-order (a node, then its children's subtrees in
-// child order). `visit` returns how the walk goes on after the node.
+// child order); a node with several parents only where it is met first. `visit` returns how the
+// walk goes on after the node.
 template <class Visit>
 void WalkPreOrder(IHdlNetListNode* start, Visit visit) {
   std::vector<IHdlNetListNode*> pending;
+  // Shared nodes met so far; the start counts too, so that a loop a host made also ends.
+  std::unordered_set<IHdlNetListNode*> met;
   if (start) pending.push_back(start);
   while (!pending.empty()) {
     IHdlNetListNode* node = pending.back();
     pending.pop_back();
+    if ((node == start || IsShared(node)) && !met.insert(node).second) continue;
     Step step = visit(node);
     if (step == Step::kStop) return;
     if (step == Step::kSkipChildren) continue;

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <map>
+#include <unordered_map>
 #include <vector>
 
 #include "CElaborator.h"
@@ -37,6 +38,17 @@ Prjrep::AutoRelease<IHdlDesignUnitIterator> IterateMarkedUnits(const UnitMarks& 
     if (auto* unit = Prjrep::QueryAs<IHdlDesignUnit>(element)) units.push_back(unit);
   }
   return Prjrep::TInterfaceListIter<IHdlDesignUnitIterator>::New(units);
+}
+
+// The first node of each unit in pre-order below `start`, so that finding the node of a unit does
+// not walk the tree again for every unit.
+std::unordered_map<CitI::IInterface*, IHdlNetListNode*> FirstNodeOfEachUnit(IHdlNetListNode* start) {
+  std::unordered_map<CitI::IInterface*, IHdlNetListNode*> first;
+  NetListWalk::WalkPreOrder(start, [&](IHdlNetListNode* node) {
+    if (CitI::IInterface* unit = NetListWalk::Identity(node->GetElement())) first.try_emplace(unit, node);
+    return NetListWalk::Step::kDescend;
+  });
+  return first;
 }
 
 }  // namespace
@@ -76,6 +88,8 @@ CitI::Result CUnitTree::CollectExtraUnits(IHdlNetListNode* start, IHdlNetListNod
   CollectTreeElements(tree, treeElements);
   FileSet files;
   CollectTreeFiles(tree, files);
+  std::unordered_map<CitI::IInterface*, IHdlNetListNode*> nodeOfUnit;
+  bool indexed = false;
   for (IHdlFile* file : files) {
     Prjrep::AutoRelease<IHdlDesignUnitIterator> unit;
     CitI::Result status = file->getDesignUnits(parserConfig, unit.Out());
@@ -85,7 +99,10 @@ CitI::Result CUnitTree::CollectExtraUnits(IHdlNetListNode* start, IHdlNetListNod
       if (!IsKnownUnit(unit->Current())) continue;
       auto* element = Prjrep::QueryAs<IHdlElement>(unit->Current());
       if (!element || treeElements.contains(element)) continue;
-      if (IHdlNetListNode* node = NetListWalk::FindNodeOfUnit(start, element)) CollectTreeElements(node, out);
+      if (!indexed) nodeOfUnit = FirstNodeOfEachUnit(start);
+      indexed = true;
+      auto node = nodeOfUnit.find(NetListWalk::Identity(element));
+      if (node != nodeOfUnit.end()) CollectTreeElements(node->second, out);
     }
   }
   return CitI::kOk;

@@ -499,7 +499,7 @@ std::shared_ptr<const SiblingPaths> CParserConfigHolder::SiblingPathsOf(
   Port::StringBase pluginName;
   GetPluginName(pluginName);
   if (auto* shared = dynamic_cast<CProjectFileList*>(projectFiles)) return shared->PathsOfPlugin(pluginName);
-  return std::make_shared<const SiblingPaths>(CollectPathsOfPlugin(projectFiles, pluginName));
+  return SiblingPaths::Shared(CollectPathsOfPlugin(projectFiles, pluginName));
 }
 
 void CParserConfigHolder::BeginParse(IHdlFileIterator* projectFiles) {

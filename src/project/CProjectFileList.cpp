@@ -32,7 +32,7 @@ std::shared_ptr<const SiblingPaths> CProjectFileList::PathsOfPlugin(const Port::
   Port::StringBase key = pluginName;
   key.MakeLower();
   auto& paths = pathsByPlugin_[key];
-  if (!paths) paths = std::make_shared<const SiblingPaths>(CollectPathsOfPlugin(this, pluginName));
+  if (!paths) paths = SiblingPaths::Shared(CollectPathsOfPlugin(this, pluginName));
   return paths;
 }
 

@@ -6,6 +6,7 @@
 #pragma once
 
 #include <cstddef>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -21,6 +22,11 @@ class SiblingPaths {
   explicit SiblingPaths(std::vector<Port::StringBase> paths);
   SiblingPaths(const SiblingPaths&) = delete;
   SiblingPaths& operator=(const SiblingPaths&) = delete;
+
+  // The one living list with exactly these paths, made when there is none. Every file of a
+  // project asks whether the list it was parsed with is still the project's; one shared object
+  // answers that by identity instead of a comparison of every path for every file.
+  static std::shared_ptr<const SiblingPaths> Shared(std::vector<Port::StringBase> paths);
 
   const std::vector<Port::StringBase>& Paths() const { return paths_; }
   // The paths as C texts, in the same order.

@@ -1,6 +1,7 @@
 // The tree command end to end: the hierarchy that the module builds, in JSON, text and DOT.
 #include <gtest/gtest.h>
 
+#include <fstream>
 #include <nlohmann/json.hpp>
 #include <string>
 #include <vector>
@@ -133,6 +134,99 @@ TEST(Hierarchy, CircularReferenceIsAWarningNotAFailure) {
   ASSERT_FALSE(answer["messages"].empty());
   EXPECT_EQ(answer["messages"][0]["severity"], "warning");
   EXPECT_EQ(Text(answer["messages"][0]["text"]).rfind("Circular Reference: ", 0), 0u);
+}
+
+// A package that two others use; the second occurrence points at the first.
+constexpr const char* kSharedPackages =
+    "package base is\nend package;\n"
+    "use work.base.all;\npackage common is\nend package;\n"
+    "use work.common.all;\npackage user_a is\nend package;\n"
+    "use work.common.all;\npackage user_b is\nend package;\n";
+
+TEST(Hierarchy, SharedSubtreeIsPrintedOnceAndReferencedAfterwards) {
+  ScopedTextFile source(kSharedPackages, "shared.vhd");
+  CliResult text = RunQuillon({"tree", source.path()});
+  EXPECT_EQ(text.status, 0) << text.err;
+  std::string at = "  " + source.path();
+  EXPECT_EQ(Lines(text.out), (std::vector<std::string>{
+                                 "user_a [PackageDecl]" + at,
+                                 "  common [work:PackageDecl]" + at,
+                                 "    base [work:PackageDecl]" + at,
+                                 "user_b [PackageDecl]" + at,
+                                 "  common [work:PackageDecl] (shared, see above)",
+                             }));
+
+  Json answer = TreeOf({source.path()});
+  const Json& again = answer["root"]["children"][1]["children"][0];
+  EXPECT_EQ(again["name"], "work:PackageDecl|common");
+  EXPECT_EQ(again["shared"], true);
+  EXPECT_TRUE(again["children"].empty());
+  const Json& first = answer.at(Json::json_pointer(again["firstOccurrence"].get<std::string>()));
+  EXPECT_EQ(first["name"], "work:PackageDecl|common");
+  EXPECT_EQ(first["children"][0]["name"], "work:PackageDecl|base");
+  EXPECT_FALSE(first.contains("shared"));
+
+  // Drawn once, with an edge from each user.
+  CliResult dot = RunQuillon({"--format", "dot", "tree", source.path()});
+  EXPECT_EQ(dot.status, 0) << dot.err;
+  EXPECT_EQ(Lines(dot.out), (std::vector<std::string>{
+                                "digraph hierarchy {",
+                                "  node [shape=box];",
+                                "  n0 [label=\"user_a\\nPackageDecl\"];",
+                                "  n1 [label=\"common\\nwork:PackageDecl\"];",
+                                "  n2 [label=\"base\\nwork:PackageDecl\"];",
+                                "  n1 -> n2;",
+                                "  n0 -> n1;",
+                                "  n3 [label=\"user_b\\nPackageDecl\"];",
+                                "  n3 -> n1;",
+                                "}",
+                            }));
+}
+
+// Deeper than a printer that recursed once per level could go in the sanitizer build.
+constexpr int kChainDepth = 8000;
+
+TEST(Hierarchy, DeepChainsPrintAndOrderWithoutRecursion) {
+  std::string modules;
+  std::string packages;
+  for (int i = 0; i < kChainDepth; ++i) {
+    std::string next = std::to_string(i + 1);
+    modules += "module m" + std::to_string(i) + ";\n";
+    if (i + 1 < kChainDepth) modules += "  m" + next + " u ();\n";
+    modules += "endmodule\n";
+    if (i + 1 < kChainDepth) packages += "use work.p" + next + ".all;\n";
+    packages += "package p" + std::to_string(i) + " is\nend package;\n";
+  }
+  ScopedTextFile verilog(modules, "chain.v");
+  std::string vhdl = verilog.Beside("chain.vhd");
+  {
+    std::ofstream(vhdl) << packages;
+  }
+
+  CliResult tree = RunQuillon({"tree", verilog.path(), vhdl});
+  ASSERT_EQ(tree.status, 0) << tree.err;
+  std::vector<std::string> lines = Lines(tree.out);
+  ASSERT_EQ(lines.size(), 2u * kChainDepth);
+  std::string indent(2 * 100, ' ');
+  EXPECT_EQ(lines[kChainDepth - 1], indent + "(level " + std::to_string(kChainDepth - 1) + ") u: m" +
+                                        std::to_string(kChainDepth - 1) + " [work:Module]  " + verilog.path());
+
+  CliResult order = RunQuillon({"order", verilog.path(), vhdl});
+  ASSERT_EQ(order.status, 0) << order.err;
+  EXPECT_EQ(Lines(order.out).size(), 2u);
+
+  // The package chain has no instance paths, whose texts grow with the depth.
+  CliResult json = RunQuillon({"--format", "json", "tree", vhdl});
+  ASSERT_EQ(json.status, 0) << json.err;
+  Json answer = Json::parse(json.out, nullptr, false);
+  ASSERT_FALSE(answer.is_discarded());
+  int depth = 0;
+  for (const Json* node = &answer["root"]; !(*node)["children"].empty(); node = &(*node)["children"][0]) ++depth;
+  EXPECT_EQ(depth, kChainDepth);
+
+  CliResult dot = RunQuillon({"--format", "dot", "tree", verilog.path()});
+  ASSERT_EQ(dot.status, 0) << dot.err;
+  EXPECT_EQ(Lines(dot.out).size(), 2u * kChainDepth - 1 + 3);
 }
 
 }  // namespace

@@ -120,7 +120,7 @@ TEST_F(NetListNode, ChildrenAreOwnedAndParentLinksAreWeak) {
   EXPECT_EQ(iterator->Current(), front.Get());
   iterator = nullptr;
   EXPECT_EQ(Prjrep::RefCountOf(first.Get()), 1u);
-  EXPECT_TRUE(Object(first.Get())->Parents().empty());
+  EXPECT_EQ(Object(first.Get())->FirstParent(), nullptr);
 }
 
 TEST_F(NetListNode, NameFieldsComeFromTheBarSeparatedParts) {
