@@ -294,7 +294,7 @@ std::vector<Diagnostic> CommandRunner::Diagnose(ProjectReader& reader, Vad::IHdl
   settings.strict = options_.strict;
   TreeInfo tree;
   bool built = TreeReader::Read(project, tree, false) == CitI::kOk;
-  return DiagnosticFinder(std::move(settings)).Find(reader.Files(), built ? &root : nullptr, order);
+  return DiagnosticFinder(std::move(settings)).Find(reader.Files(), built ? &tree : nullptr, order);
 }
 
 void CommandRunner::ShowDiagnostics(const std::vector<Diagnostic>& diagnostics) const {

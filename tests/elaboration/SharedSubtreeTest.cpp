@@ -10,6 +10,8 @@
 #include <vector>
 
 #include "CCompileOrder.h"
+#include "CHdlProject.h"
+#include "CLibRefs.h"
 #include "CompInst.h"
 #include "ElabFixtures.h"
 #include "PackageDecl.h"
@@ -110,7 +112,7 @@ class SharedSubtrees : public ElabTest {
     Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
     {
       MessageLog log;
-      EXPECT_EQ(elaborator->Elaborate(project_.Get(), unit.Get(), root.Out()), CitI::kOk);
+      EXPECT_EQ(elaborator->Elaborate(References(), unit.Get(), root.Out()), CitI::kOk);
       outcome.elaborationMessages = MessageTexts(log);
     }
     if (!root) return outcome;
@@ -119,12 +121,15 @@ class SharedSubtrees : public ElabTest {
     outcome.distinctNodes = distinct.size();
     MessageLog log;
     Prjrep::AutoRelease<Vad::IHdlFileIterator> files;
-    EXPECT_EQ(elaborator->GetCompileOrder(project_.Get(), root.Get(), nullptr, nullptr, false, files.Out()),
+    EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), References(), root.Get(), nullptr, nullptr, false,
+                                             files.Out()),
               CitI::kOk);
     outcome.order = FileNames(files.Get());
     outcome.orderMessages = MessageTexts(log);
     return outcome;
   }
+
+  Vad::CLibRefs* References() const { return ProjectObject(project_.Get())->getLibraryReferences(); }
 
   Prjrep::AutoPtr<Vad::IHdlProject> project_;
 };
@@ -241,7 +246,7 @@ class DeepHierarchy : public SharedSubtrees {
     }
     auto iterator = IterateUnits(designUnits);
     Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
-    EXPECT_EQ(elaborator.Elaborate(project_.Get(), iterator.Get(), root.Out()), CitI::kOk);
+    EXPECT_EQ(elaborator.Elaborate(References(), iterator.Get(), root.Out()), CitI::kOk);
     return root;
   }
 
@@ -298,7 +303,7 @@ TEST_F(DeepHierarchy, InstanceChainAndPackageChainElaborateOrderAndFree) {
   EXPECT_EQ(DepthAlongFirstChildren(tops[1], lastPath), static_cast<std::size_t>(kChainDepth));
 
   Prjrep::AutoRelease<Vad::IHdlFileIterator> files;
-  ASSERT_EQ(elaborator.GetCompileOrder(project_.Get(), root.Get(), nullptr, nullptr, false, files.Out()),
+  ASSERT_EQ(Vad::CCompileOrder::OrderBelow(elaborator, References(), root.Get(), nullptr, nullptr, false, files.Out()),
             CitI::kOk);
   std::vector<std::string> order = FileNames(files.Get());
   std::vector<std::string> expected;
