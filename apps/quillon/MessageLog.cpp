@@ -62,6 +62,11 @@ void MessageLog::ReportError(std::string_view text) {
       .issueError("%.*s", static_cast<int>(text.size()), text.data());
 }
 
+void MessageLog::ReportWarning(std::string_view text) {
+  Port_MsgManData(nullptr, kSourceName, 0, nullptr)
+      .issueWarning("%.*s", static_cast<int>(text.size()), text.data());
+}
+
 bool MessageLog::HasErrors() const {
   return getErrCount() + getIntCount() + getFatalCount() + getUserFatalCount() > 0;
 }

@@ -22,6 +22,7 @@ class MessageLog : public Port_MsgManDefault {
 
   // An error message of quillon itself, through the message system like any other.
   void ReportError(std::string_view text);
+  void ReportWarning(std::string_view text);
 
   // A progress line to take off the terminal before a message is written; null for none.
   void SetProgress(Progress* progress) { progress_ = progress; }

@@ -16,6 +16,7 @@ struct SourceFile {
 struct ProjectSources {
   std::map<std::string, std::string> properties;
   std::vector<SourceFile> files;  // in the order given
+  std::vector<std::string> warnings;  // found while the sources were gathered
 };
 
 }  // namespace quillon
