@@ -39,6 +39,17 @@ Prjrep::AutoRelease<IHdlDesignUnitIterator> IterateMarkedUnits(const UnitMarks& 
   return Prjrep::TInterfaceListIter<IHdlDesignUnitIterator>::New(units);
 }
 
+// The first node in pre-order below `start` of each element, found in one walk instead of one
+// walk per unit.
+std::map<CitI::IInterface*, IHdlNetListNode*> FirstNodeOfEachElement(IHdlNetListNode* start) {
+  std::map<CitI::IInterface*, IHdlNetListNode*> firstNodes;
+  NetListWalk::WalkPreOrder(start, [&](IHdlNetListNode* node) {
+    if (CitI::IInterface* element = NetListWalk::Identity(node->GetElement())) firstNodes.try_emplace(element, node);
+    return NetListWalk::Step::kDescend;
+  });
+  return firstNodes;
+}
+
 }  // namespace
 
 CitI::Result CUnitTree::BuildUnitTree(IHdlProject* project, IHdlNetListNode* start, IHdlNetListNode* top,
@@ -76,6 +87,8 @@ CitI::Result CUnitTree::CollectExtraUnits(IHdlNetListNode* start, IHdlNetListNod
   CollectTreeElements(tree, treeElements);
   FileSet files;
   CollectTreeFiles(tree, files);
+  std::map<CitI::IInterface*, IHdlNetListNode*> firstNodes;
+  bool indexed = false;
   for (IHdlFile* file : files) {
     Prjrep::AutoRelease<IHdlDesignUnitIterator> unit;
     CitI::Result status = file->getDesignUnits(parserConfig, unit.Out());
@@ -85,7 +98,12 @@ CitI::Result CUnitTree::CollectExtraUnits(IHdlNetListNode* start, IHdlNetListNod
       if (!IsKnownUnit(unit->Current())) continue;
       auto* element = Prjrep::QueryAs<IHdlElement>(unit->Current());
       if (!element || treeElements.contains(element)) continue;
-      if (IHdlNetListNode* node = NetListWalk::FindNodeOfUnit(start, element)) CollectTreeElements(node, out);
+      if (!indexed) {
+        firstNodes = FirstNodeOfEachElement(start);
+        indexed = true;
+      }
+      auto node = firstNodes.find(NetListWalk::Identity(element));
+      if (node != firstNodes.end()) CollectTreeElements(node->second, out);
     }
   }
   return CitI::kOk;
