@@ -17,6 +17,7 @@
 #include "PipelineFixtures.h"
 #include "IHdlElaborationData.h"
 #include "IHdlPort.h"
+#include "Port/MsgManData.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "PortExtraction.h"
