@@ -12,6 +12,7 @@
 #include <cstdio>
 #include <cstring>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -166,6 +167,9 @@ class ChildWatch {
     return kLookAgainMs;
   }
   bool timedOut() const { return timedOut_; }
+  // True a while after the group was killed: what still holds the output left the group and
+  // is not waited for.
+  bool GaveUp() const { return killedAt_ && Clock::now() - *killedAt_ > std::chrono::seconds(2); }
 
   // The child's status once the output is over; also ends what it left behind.
   int Finish() {
@@ -188,13 +192,17 @@ class ChildWatch {
       KillGroup();
     }
   }
-  void KillGroup() { ::kill(-pid_, SIGKILL); }
+  void KillGroup() {
+    ::kill(-pid_, SIGKILL);
+    if (!killedAt_) killedAt_ = Clock::now();
+  }
 
   pid_t pid_;
   Clock::time_point deadline_;
   bool exited_ = false;
   bool timedOut_ = false;
   int status_ = Process::kNotStarted;
+  std::optional<Clock::time_point> killedAt_;
 };
 
 // Reads to the end of the child's output; stops forwarding once the sink declines more.
@@ -205,6 +213,7 @@ void Forward(int readFd, ChildOutput* sink, ChildWatch& watch) {
   for (;;) {
     pollfd ready{readFd, POLLIN, 0};
     int polled = ::poll(&ready, 1, watch.NextWait());
+    if (watch.GaveUp()) return;
     if (polled < 0 && errno != EINTR) return;
     if (polled <= 0) continue;
     ssize_t count = ::read(readFd, chunk, kChunk);
