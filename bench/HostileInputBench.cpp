@@ -79,16 +79,22 @@ void BM_SiblingBlocksOfANetlistDatabase(benchmark::State& state) {
   InputProject input;
   std::string blocks;
   for (int64_t block = 0; block < state.range(0); ++block) {
-    blocks += std::string(block ? "," : "") + R"({"name": "b)" + std::to_string(block) + R"(", "properties": {}})";
+    blocks +=
+        std::string(block ? "," : "") + R"({"name": "b)" + std::to_string(block) + R"(", "properties": {}})";
   }
   const std::string path = input.Write(
-      "wide.pdb", R"({"format": "quillon-netlist", "version": 1, "designs": [{"name": "chip", "properties": {}, )"
-                  R"("views": [{"name": "SOURCE", "block": {"name": "top", "properties": {"TYPE": "t"}, "blocks": [)" +
-                      blocks + "]}}]}]}");
+      "wide.pdb",
+      R"({"format": "quillon-netlist", "version": 1, "designs": [{"name": "chip", "properties": {}, )"
+      R"("views": [{"name": "SOURCE", "block": {"name": "top", "properties": {"TYPE": "t"}, "blocks": [)" +
+          blocks + "]}}]}]}");
   for (auto _ : state) benchmark::DoNotOptimize(input.Parse(path, "PLUGIN_PLX"));
   state.SetComplexityN(state.range(0));
 }
-BENCHMARK(BM_SiblingBlocksOfANetlistDatabase)->Arg(50000)->Arg(200000)->Unit(benchmark::kMillisecond)->Complexity();
+BENCHMARK(BM_SiblingBlocksOfANetlistDatabase)
+    ->Arg(50000)
+    ->Arg(200000)
+    ->Unit(benchmark::kMillisecond)
+    ->Complexity();
 
 void BM_IncludeFanOut(benchmark::State& state) {
   bench::QuietMessages quiet;
@@ -96,7 +102,8 @@ void BM_IncludeFanOut(benchmark::State& state) {
   const int levels = static_cast<int>(state.range(0));
   for (int level = 0; level < levels; ++level) {
     const std::string next = "h" + std::to_string(level + 1) + ".vh";
-    input.Write("h" + std::to_string(level) + ".vh", "`include \"" + next + "\"\n`include \"" + next + "\"\n");
+    input.Write("h" + std::to_string(level) + ".vh",
+                "`include \"" + next + "\"\n`include \"" + next + "\"\n");
   }
   input.Write("h" + std::to_string(levels) + ".vh", "");
   const std::string path = input.Write("fan.v", "`include \"h0.vh\"\nmodule after; endmodule\n");

@@ -1,8 +1,8 @@
 // Any input as an EDIF netlist of a project, read for its hierarchy: parsed, elaborated and
 // ordered.
 #include <cstddef>
-#include <cstdlib>
 #include <cstdint>
+#include <cstdlib>
 
 #include "FuzzProject.h"
 

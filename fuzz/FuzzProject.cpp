@@ -73,7 +73,8 @@ Vad::CParserConfigHolder* OneFileProject::holder() const {
   return Prjrep::ObjectCast<Vad::CHdlFile>(file.Get())->GetHolder();
 }
 
-void ParseAsSource(const std::uint8_t* data, std::size_t size, std::string_view extension, std::string_view plugin) {
+void ParseAsSource(const std::uint8_t* data, std::size_t size, std::string_view extension,
+                   std::string_view plugin) {
   SetUpOnce();
   OneFileProject one(WriteInput(data, size, extension), plugin);
   Prjrep::AutoRelease<Vad::IHdlDesignUnitSet> units;

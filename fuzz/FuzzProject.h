@@ -31,6 +31,7 @@ struct OneFileProject {
 
 // Parses the input as a source of the plug-in and asks for every design unit, the hierarchy and
 // the compile order.
-void ParseAsSource(const std::uint8_t* data, std::size_t size, std::string_view extension, std::string_view plugin);
+void ParseAsSource(const std::uint8_t* data, std::size_t size, std::string_view extension,
+                   std::string_view plugin);
 
 }  // namespace fuzz

@@ -11,10 +11,10 @@
 #include "FileGraph.h"
 #include "Host/HostComponents.h"
 #include "IName.h"
-#include "Port/MsgManData.h"
 #include "JsonOutput.h"
 #include "ModuleLoader.h"
 #include "OutputFile.h"
+#include "Port/MsgManData.h"
 #include "ProjectBuilder.h"
 #include "ProjectLoader.h"
 #include "RavA/Factory.h"
@@ -271,9 +271,10 @@ int CommandRunner::Ports(ProjectReader& reader, std::ostream& out) {
   if (result != CitI::kOk) {
     status = Failed("the ports of " + key + " are not available", result);
   } else if (!ports) {
-    log_->ReportError(!reason.empty() ? reason
-                                      : "the ports of " + key +
-                                            " are not available: ports are extracted from VHDL and Verilog only");
+    log_->ReportError(!reason.empty()
+                          ? reason
+                          : "the ports of " + key +
+                                " are not available: ports are extracted from VHDL and Verilog only");
     status = kExitFailed;
   }
   if (options_.format == Format::kJson) {

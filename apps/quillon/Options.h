@@ -43,7 +43,7 @@ class Options {
   std::optional<std::string> target;
   std::optional<std::string> family;
   std::vector<std::pair<std::string, std::string>> properties;  // --property KEY=VALUE
-  std::optional<unsigned> converterTimeout;                      // seconds; 0 for none
+  std::optional<unsigned> converterTimeout;                     // seconds; 0 for none
 
   std::string top;      // --top or --unit
   bool byUnit = false;  // --unit

@@ -133,7 +133,8 @@ bool ProjectLoader::Load(const Options& options, std::string& error) {
   if (options.target) sources_.properties[std::string(kTargetProperty)] = *options.target;
   if (options.family) sources_.properties[std::string(kFamilyProperty)] = *options.family;
   if (options.converterTimeout) {
-    sources_.properties[Port::InputLimits::kConverterTimeoutProperty] = std::to_string(*options.converterTimeout);
+    sources_.properties[Port::InputLimits::kConverterTimeoutProperty] =
+        std::to_string(*options.converterTimeout);
   }
   for (const auto& [name, value] : options.properties) sources_.properties[name] = value;
   return true;
@@ -151,7 +152,8 @@ bool ProjectLoader::AddSource(std::string path, const std::string& baseDir, std:
     return false;
   }
   using namespace Port::InputLimits;
-  if (!IsReadableRegularFile(fullPath, kMaxSourceBytes, kSourceTooLarge, error) && !error.empty()) return false;
+  if (!IsReadableRegularFile(fullPath, kMaxSourceBytes, kSourceTooLarge, error) && !error.empty())
+    return false;
   if (!std::ifstream(fullPath)) {
     error = "cannot read source file " + fullPath;
     return false;
@@ -240,7 +242,8 @@ bool ProjectLoader::TakeFileListLine(std::string line, const SourceArgument& arg
   if (line.empty() || line[0] == '#') return true;
   if (line.starts_with(kIncdirPrefix) || line.starts_with(kDefinePrefix)) {
     const bool isDefine = line.starts_with(kDefinePrefix);
-    std::vector<std::string> values = PlusSeparated(std::string_view(line).substr((isDefine ? kDefinePrefix : kIncdirPrefix).size()));
+    std::vector<std::string> values =
+        PlusSeparated(std::string_view(line).substr((isDefine ? kDefinePrefix : kIncdirPrefix).size()));
     for (std::string& value : values) {
       if (!Options::FitsList(value)) {
         error = "'" + value + "' holds a ';', which would separate it into more than one entry";

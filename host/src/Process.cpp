@@ -101,8 +101,8 @@ class SpawnSetup {
     if (!error) error = ::posix_spawnattr_setsigmask(&attributes_, &noMask);
     if (!error) error = ::posix_spawnattr_setpgroup(&attributes_, 0);
     return error ? error
-                 : ::posix_spawnattr_setflags(&attributes_,
-                                              POSIX_SPAWN_SETSIGDEF | POSIX_SPAWN_SETSIGMASK | POSIX_SPAWN_SETPGROUP);
+                 : ::posix_spawnattr_setflags(
+                       &attributes_, POSIX_SPAWN_SETSIGDEF | POSIX_SPAWN_SETSIGMASK | POSIX_SPAWN_SETPGROUP);
   }
 
   int RedirectDescriptors(int outputFd) {
@@ -154,7 +154,8 @@ int WaitForExit(pid_t pid) {
 class ChildWatch {
  public:
   ChildWatch(pid_t pid, unsigned seconds)
-      : pid_(pid), deadline_(seconds == 0 ? Clock::time_point::max() : Clock::now() + std::chrono::seconds(seconds)) {}
+      : pid_(pid),
+        deadline_(seconds == 0 ? Clock::time_point::max() : Clock::now() + std::chrono::seconds(seconds)) {}
 
   // Milliseconds to wait for output before looking again; kills the group once time is up.
   int NextWait() {

@@ -44,7 +44,8 @@ Prjrep::AutoRelease<IHdlDesignUnitIterator> IterateMarkedUnits(const UnitMarks& 
 std::map<CitI::IInterface*, IHdlNetListNode*> FirstNodeOfEachElement(IHdlNetListNode* start) {
   std::map<CitI::IInterface*, IHdlNetListNode*> firstNodes;
   NetListWalk::WalkPreOrder(start, [&](IHdlNetListNode* node) {
-    if (CitI::IInterface* element = NetListWalk::Identity(node->GetElement())) firstNodes.try_emplace(element, node);
+    if (CitI::IInterface* element = NetListWalk::Identity(node->GetElement()))
+      firstNodes.try_emplace(element, node);
     return NetListWalk::Step::kDescend;
   });
   return firstNodes;

@@ -1,7 +1,6 @@
 #include "CParserConfigHolder.h"
 
 #include <charconv>
-
 #include <utility>
 
 #include "Arch.h"
@@ -196,7 +195,8 @@ bool CParserConfigHolder::RegisterUnit(const Port::StringBase& key, CHdlElement*
   if (recordedUnits_.contains(freeKey)) {
     // Probing from the number after the last one given keeps N copies of one name linear.
     int& next = nextDuplicate_.try_emplace(key, 1).first->second;
-    for (freeKey = DuplicateKey(key, next); recordedUnits_.contains(freeKey); freeKey = DuplicateKey(key, ++next)) {
+    for (freeKey = DuplicateKey(key, next); recordedUnits_.contains(freeKey);
+         freeKey = DuplicateKey(key, ++next)) {
     }
     ++next;
   }

@@ -104,20 +104,22 @@ TEST(HostileInput, ConverterThatWritesNothingFailsTheRunAndJsonStaysJson) {
   ASSERT_EQ(chmod(converter.path().c_str(), 0755), 0);
   ScopedTextFile source("module silent\n", "silent.abl");
   const std::string path = converter.Beside("") + ":" + (getenv("PATH") ? getenv("PATH") : "");
-  CliResult result =
-      RunQuillon(CliRun{{"--format", "json", "check", source.path()}, "", {{"PATH", path}}});
+  CliResult result = RunQuillon(CliRun{{"--format", "json", "check", source.path()}, "", {{"PATH", path}}});
   EXPECT_EQ(result.status, 1) << result.err;
   ASSERT_FALSE(result.out.empty());
   EXPECT_EQ(result.out[0], '{') << result.out;
   EXPECT_EQ(result.out.find("File not found"), std::string::npos) << result.out;
-  EXPECT_NE(result.out.find("abelconv wrote no output silent.hrf for silent.abl"), std::string::npos) << result.out;
+  EXPECT_NE(result.out.find("abelconv wrote no output silent.hrf for silent.abl"), std::string::npos)
+      << result.out;
 }
 
 TEST(HostileInput, ConverterTimeoutIsAnOptionOfSeconds) {
   ScopedTextFile source(kEntity, "solo.vhd");
   EXPECT_EQ(RunQuillon({"--converter-timeout", "5", "units", source.path()}).status, 0);
-  ExpectBadInputNaming(RunQuillon({"--converter-timeout", "soon", "units", source.path()}), "--converter-timeout");
-  ExpectBadInputNaming(RunQuillon({"--converter-timeout", "-3", "units", source.path()}), "--converter-timeout");
+  ExpectBadInputNaming(RunQuillon({"--converter-timeout", "soon", "units", source.path()}),
+                       "--converter-timeout");
+  ExpectBadInputNaming(RunQuillon({"--converter-timeout", "-3", "units", source.path()}),
+                       "--converter-timeout");
 }
 
 TEST(HostileInput, DefinesAndIncludeDirectoriesHoldingTheListSeparatorAreRefused) {
@@ -151,7 +153,8 @@ TEST(HostileInput, RepeatedSourceIsReadOnceWithAWarning) {
 TEST(HostileInput, NulInsideAProjectFilePathIsAnError) {
   ScopedTextFile source(kEntity, "solo.vhd");
   ScopedTextFile project("{\"files\": [{\"path\": \"" + source.path() + "\\u0000.txt\"}]}", "project.json");
-  ExpectBadInputNaming(RunQuillon({"units", "-P", project.path()}), "files[0]: the path holds a NUL character");
+  ExpectBadInputNaming(RunQuillon({"units", "-P", project.path()}),
+                       "files[0]: the path holds a NUL character");
 }
 
 TEST(HostileInput, VerilogCompilerErrorsReachTheUserOnceWithFileAndLine) {

@@ -14,12 +14,12 @@
 #include <string_view>
 #include <vector>
 
-#include "PipelineFixtures.h"
 #include "IHdlElaborationData.h"
 #include "IHdlPort.h"
-#include "Port/MsgManData.h"
+#include "PipelineFixtures.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
+#include "Port/MsgManData.h"
 #include "PortExtraction.h"
 #include "ScopedTempDir.h"
 #include "VerilogParser.h"
@@ -187,8 +187,7 @@ TEST_F(PortExtraction, NoPortsComeBackWithAResultAndADeveloperTextThatSaysWhy) {
   // is reported.
   ASSERT_EQ(std::remove(dir_.Path("mixer.vhd").c_str()), 0);
   EXPECT_EQ(ParserResultFor<Vad::VhdlParser>("Entity|mixer", files_[1].Get()), CitI::kFail);
-  EXPECT_EQ(Reasons(),
-            Strings{"ports of Entity|mixer: cannot read design file " + dir_.Path("mixer.vhd")});
+  EXPECT_EQ(Reasons(), Strings{"ports of Entity|mixer: cannot read design file " + dir_.Path("mixer.vhd")});
   debug_.clear();
 
   // The file was edited since its last parse: the unit is no longer in it.

@@ -85,7 +85,8 @@ void VerilogMessageLog::Issue(const std::vector<VerilogMessage>& messages, bool 
     std::unique_ptr<Port_MsgManData> source =
         Port_MsgManData::createObject("VerilogCompiler", message.file.c_str(), message.line, "");
     std::string text = message.text;
-    if (withPlace && !message.file.empty()) text = message.file + ":" + std::to_string(message.line) + ": " + text;
+    if (withPlace && !message.file.empty())
+      text = message.file + ":" + std::to_string(message.line) + ": " + text;
     if (message.severity == VerilogSeverity::kError) {
       source->issueError("%s\n", text.c_str());
     } else {

@@ -101,7 +101,8 @@ nlohmann::json Xdm_JsonFile::Parse(const std::string& text, const std::string& f
   }
   // Checked in one pass ahead of the parser: a parse callback would make the parser rescan the
   // parent container at the end of every child, quadratic in the number of siblings.
-  if (NestsDeeperThan(text, Xdm_FileFormat::kMaxJsonDepth)) throw Xdm_FormatProblem::Error(file, "", kTooDeepMessage);
+  if (NestsDeeperThan(text, Xdm_FileFormat::kMaxJsonDepth))
+    throw Xdm_FormatProblem::Error(file, "", kTooDeepMessage);
   try {
     return nlohmann::json::parse(text);
   } catch (const Xdm_FormatProblem& problem) {

@@ -9,7 +9,8 @@ namespace Port::InputLimits {
 
 // Project files and file lists are read whole into memory.
 inline constexpr std::uint64_t kMaxListBytes = std::uint64_t{64} << 20;
-inline constexpr const char* kListTooLarge = "%s is larger than the %llu bytes a project file or file list may hold";
+inline constexpr const char* kListTooLarge =
+    "%s is larger than the %llu bytes a project file or file list may hold";
 
 // A source file the command line accepts.
 inline constexpr std::uint64_t kMaxSourceBytes = std::uint64_t{1} << 30;

@@ -17,8 +17,10 @@ void ReadThroughAbelConverter(CParserConfigHolder& holder) {
   const SourceNames source(holder);
   const Port::StringBase outputName = source.baseName + ".hrf";
   CurrentDirectoryScope inSourceDirectory(source.directory);
-  const int status = RunConverter(holder, {"abelconv", source.fileName.str(), "-ohrf", "only"}, kAbelConverterMessages);
-  if (ConverterOutputUsable("abelconv", source.fileName, outputName, status)) qhParser(outputName, holder).Parse();
+  const int status =
+      RunConverter(holder, {"abelconv", source.fileName.str(), "-ohrf", "only"}, kAbelConverterMessages);
+  if (ConverterOutputUsable("abelconv", source.fileName, outputName, status))
+    qhParser(outputName, holder).Parse();
 }
 
 int AbelParser::Parse(CParserConfigHolder& holder) {

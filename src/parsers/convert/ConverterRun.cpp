@@ -1,17 +1,17 @@
 #include "ConverterRun.h"
 
+#include <cerrno>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <limits>
+
 #include "CParserConfigHolder.h"
 #include "Port/File.h"
 #include "Port/InitObjects.h"
-#include "Port/MsgManData.h"
 #include "Port/InputLimits.h"
+#include "Port/MsgManData.h"
 #include "Port/Process.h"
-
-#include <cerrno>
-#include <cstdio>
-#include <cstring>
-#include <cstdlib>
-#include <limits>
 
 namespace Vad {
 namespace {
@@ -29,11 +29,13 @@ constexpr int kHighestSignal = 64;
 unsigned TimeLimitOf(const CParserConfigHolder& holder) {
   Port::StringBase value;
   unsigned seconds = Port::InputLimits::kDefaultConverterSeconds;
-  if (holder.GetProperty(Port::StringBase(Port::InputLimits::kConverterTimeoutProperty), value) == CitI::kOk &&
+  if (holder.GetProperty(Port::StringBase(Port::InputLimits::kConverterTimeoutProperty), value) ==
+          CitI::kOk &&
       !value.IsEmpty()) {
     char* end = nullptr;
     unsigned long parsed = std::strtoul(value.c_str(), &end, 10);
-    if (end && *end == '\0' && parsed <= std::numeric_limits<unsigned>::max()) seconds = static_cast<unsigned>(parsed);
+    if (end && *end == '\0' && parsed <= std::numeric_limits<unsigned>::max())
+      seconds = static_cast<unsigned>(parsed);
   }
   return seconds;
 }
@@ -43,9 +45,11 @@ std::string StatusText(const std::string& program, int status, unsigned seconds)
   if (status == Port::Process::kTimedOut) {
     std::snprintf(text, sizeof text, Port::InputLimits::kConverterTimedOut, program.c_str(), seconds);
   } else if (status == Port::Process::kNotStarted) {
-    std::snprintf(text, sizeof text, "%s could not be started (not found or not executable)", program.c_str());
+    std::snprintf(text, sizeof text, "%s could not be started (not found or not executable)",
+                  program.c_str());
   } else if (status > Port::Process::kSignalBase && status <= Port::Process::kSignalBase + kHighestSignal) {
-    std::snprintf(text, sizeof text, "%s was ended by signal %d", program.c_str(), status - Port::Process::kSignalBase);
+    std::snprintf(text, sizeof text, "%s was ended by signal %d", program.c_str(),
+                  status - Port::Process::kSignalBase);
   } else {
     std::snprintf(text, sizeof text, "%s exited with status %d", program.c_str(), status);
   }
@@ -79,16 +83,16 @@ int RunConverter(const CParserConfigHolder& holder, const std::vector<std::strin
 bool ConverterOutputUsable(const char* tool, const Port::StringBase& source, const Port::StringBase& output,
                            int status) {
   if (!Port::File::exist(output.c_str())) {
-    IssueConverterError(Port::StringBase().Format("%s wrote no output %s for %s\n", tool, output.c_str(),
-                                                  source.c_str()));
+    IssueConverterError(
+        Port::StringBase().Format("%s wrote no output %s for %s\n", tool, output.c_str(), source.c_str()));
     return false;
   }
   std::int64_t outputTime = 0;
   std::int64_t sourceTime = 0;
   if (status != 0 && Port::File::getdatetime(output.c_str(), &outputTime) &&
       Port::File::getdatetime(source.c_str(), &sourceTime) && outputTime < sourceTime) {
-    IssueConverterWarning(Port::StringBase().Format(
-        "%s is older than %s and is not read, as %s failed\n", output.c_str(), source.c_str(), tool));
+    IssueConverterWarning(Port::StringBase().Format("%s is older than %s and is not read, as %s failed\n",
+                                                    output.c_str(), source.c_str(), tool));
     return false;
   }
   return true;

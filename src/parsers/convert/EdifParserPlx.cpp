@@ -48,8 +48,8 @@ int EdifParserPlx::Parse(CParserConfigHolder& holder) {
   try {
     ReadDatabase(databaseName.c_str(), holder);
   } catch (const std::exception& failure) {
-    IssueConverterError(Port::StringBase().Format("The tbx file: %s may be corrupt: %s\n", databaseName.c_str(),
-                                                  failure.what()));
+    IssueConverterError(Port::StringBase().Format("The tbx file: %s may be corrupt: %s\n",
+                                                  databaseName.c_str(), failure.what()));
   }
   return 0;
 }

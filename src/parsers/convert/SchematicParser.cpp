@@ -72,10 +72,10 @@ const char* SchematicConverter() { return Port_Env::GetEnv("CVN_WSMGR_QT3") ? "d
 
 int Convert(const CParserConfigHolder& holder, const Port::StringBase& family, const Port::StringBase& source,
             const Port::StringBase& output) {
-  const std::vector<std::string> arguments{SchematicConverter(), "-intstyle", "ardent",   "-family",
-                                           family.str(),         source.str(),  output.str()};
-  Port_MsgManData::debugStub("Cmd line is: %s -intstyle ardent -family %s \"%s\" \"%s\"\n", arguments[0].c_str(),
-                             family.c_str(), source.c_str(), output.c_str());
+  const std::vector<std::string> arguments{SchematicConverter(), "-intstyle",  "ardent",    "-family",
+                                           family.str(),         source.str(), output.str()};
+  Port_MsgManData::debugStub("Cmd line is: %s -intstyle ardent -family %s \"%s\" \"%s\"\n",
+                             arguments[0].c_str(), family.c_str(), source.c_str(), output.c_str());
   Port_MsgManData::debugStub("Extracting hierarchy info from: %s\n", source.c_str());
   Port::StringBase discarded;
   std::int32_t keepTaking = 0;

@@ -3,8 +3,8 @@
 #include <array>
 #include <cerrno>
 #include <charconv>
-#include <cstring>
 #include <cstdint>
+#include <cstring>
 #include <memory>
 #include <string>
 #include <string_view>

@@ -1,6 +1,5 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-
 #include <signal.h>
 #include <unistd.h>
 
@@ -87,8 +86,8 @@ TEST_F(AbelParse, FailingConverterIsReportedAndAnEarlierOutputIsStillRead) {
   Source("stale.hrf", "MODULE earlier 2\n");
 
   EXPECT_THAT(Parse(path, "PLUGIN_Abel"), ElementsAre("|Module||earlier line 2 module flag"));
-  EXPECT_THAT(Messages(),
-              ElementsAre("error: Unable to run abelconv - Process Failed (" + path + ": abelconv exited with status 1)\n"));
+  EXPECT_THAT(Messages(), ElementsAre("error: Unable to run abelconv - Process Failed (" + path +
+                                      ": abelconv exited with status 1)\n"));
   EXPECT_EQ(ToolLog("abelconv"), sources_.path() + "|stale.abl|-ohrf|only\n");
 }
 
@@ -98,8 +97,9 @@ TEST_F(AbelParse, FailedConverterDoesNotLeaveAnOutputOlderThanItsSourceToBeRead)
   SetAge(Source("aged.hrf", "MODULE outdated 2\n"), -3600);
 
   EXPECT_THAT(Parse(path, "PLUGIN_Abel"), IsEmpty());
-  EXPECT_THAT(Messages(), ElementsAre(HasSubstr("exited with status 1"),
-                                      "warning: aged.hrf is older than aged.abl and is not read, as abelconv failed\n"));
+  EXPECT_THAT(Messages(),
+              ElementsAre(HasSubstr("exited with status 1"),
+                          "warning: aged.hrf is older than aged.abl and is not read, as abelconv failed\n"));
 }
 
 TEST_F(AbelParse, EveryFailureNamesTheConverterTheFileAndWhatHappenedAndMissingOutputIsAnError) {
@@ -118,10 +118,10 @@ TEST_F(AbelParse, EveryFailureNamesTheConverterTheFileAndWhatHappenedAndMissingO
 
   const std::string noOutput = "error: abelconv wrote no output lost.hrf for lost.abl\n";
   const std::string failed = "error: Unable to run abelconv - Bad Command Line (" + path + ": abelconv ";
-  EXPECT_THAT(Messages(), ElementsAre(failed + "could not be started (not found or not executable))\n", noOutput,
-                                      failed + "exited with status 3)\n", noOutput,
-                                      failed + "was ended by signal 9)\n", noOutput,
-                                      failed + "exited with status 255)\n", noOutput, noOutput));
+  EXPECT_THAT(Messages(),
+              ElementsAre(failed + "could not be started (not found or not executable))\n", noOutput,
+                          failed + "exited with status 3)\n", noOutput, failed + "was ended by signal 9)\n",
+                          noOutput, failed + "exited with status 255)\n", noOutput, noOutput));
 }
 
 TEST_F(AbelParse, ConverterArgumentsAreTheFileNameAsItIsWhateverItHolds) {
@@ -151,7 +151,8 @@ TEST_F(AbelParse, ChildLeftBehindByAFinishedConverterDoesNotKeepTheParseWaiting)
   InstallAbelConverter("MODULE quick 1\n");
   InstallTool("abelconv", "sleep 600 &\necho $! > '" + pids + "'\ncp '" + tools_.Path("abel.out") +
                               "' \"${1%.*}.hrf\"\n");
-  EXPECT_THAT(Parse(Source("quick.abl", ""), "PLUGIN_Abel"), ElementsAre("|Module||quick line 1 module flag"));
+  EXPECT_THAT(Parse(Source("quick.abl", ""), "PLUGIN_Abel"),
+              ElementsAre("|Module||quick line 1 module flag"));
   EXPECT_THAT(Messages(), IsEmpty());
   ExpectAllEnded(pids);
 }

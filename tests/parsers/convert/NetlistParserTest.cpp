@@ -87,8 +87,9 @@ TEST_F(NetlistParse, MissingOrCorruptIntermediateFileIsReported) {
   EXPECT_THAT(ParseAgain(), IsEmpty());
   InstallNetlistConverter(Database("", "LAYOUT", Block("top", "top_cell", kGate)));
   EXPECT_THAT(ParseAgain(), IsEmpty());
-  EXPECT_THAT(Messages(), ElementsAre(testing::StartsWith("error: The tbx file: design.tbx may be corrupt: "),
-                                      testing::StartsWith("error: The tbx file: design.tbx may be corrupt: ")));
+  EXPECT_THAT(Messages(),
+              ElementsAre(testing::StartsWith("error: The tbx file: design.tbx may be corrupt: "),
+                          testing::StartsWith("error: The tbx file: design.tbx may be corrupt: ")));
 
   // A database that exists but is none is not said to be impossible to open.
   messages_.clearRecords();

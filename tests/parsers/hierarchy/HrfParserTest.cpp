@@ -105,7 +105,8 @@ TEST_F(HierarchyRead, ConverterInstanceRangeTooWideIsRefusedWithAnErrorNamingFil
       "SUBMODULE and2 4\n"
       "INSTANCE u (4000000000:0)\n",
       result);
-  EXPECT_EQ(Errors(), dir_.Path("design1.hrf") + ":3: Syntax error: instance range u(4000000000:0) too wide\n");
+  EXPECT_EQ(Errors(),
+            dir_.Path("design1.hrf") + ":3: Syntax error: instance range u(4000000000:0) too wide\n");
   EXPECT_THAT(units,
               ElementsAre("|ComponentInstantiation||top|top|and2|and2| line 4 instance parent |Module||top",
                           "|Module||top line 0 module flag"));
@@ -226,12 +227,15 @@ TEST_F(HierarchyRead, ConverterCutsOverlongNamesAndSurvivesJunk) {
 TEST_F(HierarchyRead, ConverterRangesOfOneFileShareABudgetOfLabels) {
   int result = -1;
   std::string text = "MODULE top\nSUBMODULE and2 4\n";
-  const std::uint64_t linesWithin = Port::InputLimits::kMaxHierarchyLabels / Port::InputLimits::kMaxRangeLabels;
-  for (std::uint64_t line = 0; line < linesWithin + 3; ++line) text += "INSTANCE v" + std::to_string(line) + " (0:65535)\n";
+  const std::uint64_t linesWithin =
+      Port::InputLimits::kMaxHierarchyLabels / Port::InputLimits::kMaxRangeLabels;
+  for (std::uint64_t line = 0; line < linesWithin + 3; ++line)
+    text += "INSTANCE v" + std::to_string(line) + " (0:65535)\n";
   std::vector<std::string> units = ReadConverterOutput(text, result);
   EXPECT_EQ(Errors(), dir_.Path("design1.hrf") + ":" + std::to_string(linesWithin + 3) +
                           ": the instance ranges of this file make more than " +
-                          std::to_string(Port::InputLimits::kMaxHierarchyLabels) + " labels; further ranges are ignored\n");
+                          std::to_string(Port::InputLimits::kMaxHierarchyLabels) +
+                          " labels; further ranges are ignored\n");
   EXPECT_EQ(result, 0);
 }
 

@@ -11,9 +11,9 @@
 #include <string_view>
 #include <vector>
 
-#include "PipelineFixtures.h"
 #include "CHdlElement.h"
 #include "CParserConfigHolder.h"
+#include "PipelineFixtures.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "ScopedTempDir.h"

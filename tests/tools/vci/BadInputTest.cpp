@@ -43,7 +43,8 @@ TEST(VerilogBadInput, IncludeFanOutStopsAtTheInclusionCountWithAMessage) {
   constexpr int kLevels = 20;
   for (int level = 0; level < kLevels; ++level) {
     const std::string next = "h" + std::to_string(level + 1) + ".vh";
-    project.Write("h" + std::to_string(level) + ".vh", "`include \"" + next + "\"\n`include \"" + next + "\"\n");
+    project.Write("h" + std::to_string(level) + ".vh",
+                  "`include \"" + next + "\"\n`include \"" + next + "\"\n");
   }
   project.Write("h" + std::to_string(kLevels) + ".vh", "");
   const std::string path = project.Write("fan.v", "`include \"h0.vh\"\nmodule after; endmodule\n");
