@@ -18,6 +18,8 @@
 #include "IName.h"
 #include "JsonOutput.h"
 #include "ModuleLoader.h"
+#include "OutputFile.h"
+#include "Port/MsgManData.h"
 #include "ProjectBuilder.h"
 #include "ProjectLoader.h"
 #include "RavA/Factory.h"
@@ -57,6 +59,44 @@ std::string KeyOf(Vad::IHdlDesignUnit* unit) {
   if (auto* name = Prjrep::QueryAs<Prjrep::IName>(unit)) name->GetName(&key);
   return key.str();
 }
+
+// Every file the run reads: the sources and the project files and lists that named them.
+std::vector<std::string> InputPaths(const ProjectSources& sources, const Options& options) {
+  std::vector<std::string> paths;
+  for (const SourceFile& file : sources.files) paths.push_back(file.path);
+  for (const SourceArgument& argument : options.sources) paths.push_back(argument.path);
+  return paths;
+}
+
+// Keeps the module's developer texts of one query, passing them on as well. The module gives the
+// reason for a missing port list as a developer text ("ports of KEY: reason").
+class DeveloperTextCapture {
+ public:
+  DeveloperTextCapture()
+      : previous_(Port_MsgManData::setDebugSink([this](std::string_view text) {
+          text_.append(text);
+          if (previous_) previous_(text);
+        })) {}
+  ~DeveloperTextCapture() { Port_MsgManData::setDebugSink(std::move(previous_)); }
+  DeveloperTextCapture(const DeveloperTextCapture&) = delete;
+  DeveloperTextCapture& operator=(const DeveloperTextCapture&) = delete;
+
+  // The last line that starts with `lead`, without its line end; empty when there is none.
+  std::string LastLineStartingWith(const std::string& lead) const {
+    std::string found;
+    for (std::size_t start = 0; start < text_.size();) {
+      std::size_t end = text_.find('\n', start);
+      if (end == std::string::npos) end = text_.size();
+      if (text_.compare(start, lead.size(), lead) == 0) found = text_.substr(start, end - start);
+      start = end + 1;
+    }
+    return found;
+  }
+
+ private:
+  std::string text_;
+  Port_MsgManData::DebugSink previous_;
+};
 
 }  // namespace
 
@@ -103,18 +143,22 @@ int CommandRunner::RunOnProject() {
   externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
                             options_.externalLibraries.end());
 
-  std::ofstream file;
-  if (!options_.outputPath.empty()) {
-    file.open(options_.outputPath, std::ios::binary | std::ios::trunc);
-    if (!file) return BadInput("cannot write the output file " + options_.outputPath);
+  OutputFile file;
+  const bool toFile = !options_.outputPath.empty();
+  if (toFile) {
+    if (OutputFile::IsOneOf(options_.outputPath, InputPaths(sources, options_))) {
+      return BadInput("the output file " + options_.outputPath + " is also an input");
+    }
+    if (!file.Open(options_.outputPath, error)) return BadInput(error);
   }
-  std::ostream& out = file.is_open() ? static_cast<std::ostream&>(file) : std::cout;
+  std::ostream& out = toFile ? file.stream() : std::cout;
 
   ModuleLoader module;
   if (!Host::RegisterHostComponents() || !module.Load(error)) {
     log_->ReportError(error.empty() ? "the host components cannot be registered" : error);
     return kExitFailed;
   }
+  for (const std::string& warning : sources.warnings) log_->ReportWarning(warning);
   ProjectBuilder::SetInstallRootWhenUnset();
   ProjectBuilder builder;
   if (!builder.Build(sources, error)) {
@@ -125,6 +169,10 @@ int CommandRunner::RunOnProject() {
   out.flush();
   if (!out) {
     log_->ReportError("the output could not be written");
+    return kExitFailed;
+  }
+  if (toFile && status == kExitDone && !file.Commit(error)) {
+    log_->ReportError(error);
     return kExitFailed;
   }
   return status;
@@ -236,15 +284,21 @@ int CommandRunner::Ports(ProjectReader& reader, std::ostream& out) {
   if (!unit) return BadInput("unknown design unit '" + options_.unit + "'");
   std::string key = KeyOf(unit);
   std::optional<std::vector<PortInfo>> ports;
-  int errorsBefore = log_->getErrCount();
-  CitI::Result result = reader.PortsOf(unit, ports);
+  std::string reason;
+  CitI::Result result;
+  {
+    DeveloperTextCapture developerTexts;
+    result = reader.PortsOf(unit, ports);
+    reason = developerTexts.LastLineStartingWith("ports of " + key + ": ");
+  }
   int status = Finished();
   if (result != CitI::kOk) {
     status = Failed("the ports of " + key + " are not available", result);
   } else if (!ports) {
-    if (log_->getErrCount() == errorsBefore)
-      log_->ReportError("the ports of " + key +
-                        " are not available: ports are extracted from VHDL and Verilog only");
+    log_->ReportError(!reason.empty()
+                          ? reason
+                          : "the ports of " + key +
+                                " are not available: ports are extracted from VHDL and Verilog only");
     status = kExitFailed;
   }
   if (options_.format == Format::kJson) {

@@ -32,6 +32,7 @@ constexpr const char* kUsage =
     "  --target NAME         the parse target\n"
     "  --family NAME         the device family\n"
     "  --property KEY=VALUE  any project property\n"
+    "  --converter-timeout SECONDS  the time a converter may take (default 300, 0 for none)\n"
     "\n"
     "order:\n"
     "  --top UNIT            the order for UNIT and what it needs\n"
@@ -125,6 +126,7 @@ void Parser::Declare() {
   app_.add_option("--target", options_.target);
   app_.add_option("--family", options_.family);
   AddRepeated(app_, "--property", properties_);
+  app_.add_option("--converter-timeout", options_.converterTimeout)->check(CLI::NonNegativeNumber);
   app_.add_option("--top", top_);
   app_.add_option("--unit", unit_);
   app_.add_flag("--with-library", options_.withLibrary);
@@ -172,6 +174,16 @@ Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& err
   for (const std::string& define : options_.defines) {
     if (define.empty() || define[0] == '=') {
       error = "-D needs NAME[=VALUE], not '" + define + "'";
+      return Options::Outcome::kUsageError;
+    }
+    if (!Options::FitsList(define)) {
+      error = "-D '" + define + "' holds a ';', which would separate it into more than one macro";
+      return Options::Outcome::kUsageError;
+    }
+  }
+  for (const std::string& directory : options_.includeDirs) {
+    if (!Options::FitsList(directory)) {
+      error = "-I '" + directory + "' holds a ';', which would separate it into more than one directory";
       return Options::Outcome::kUsageError;
     }
   }

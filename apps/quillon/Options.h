@@ -3,6 +3,7 @@
 
 #include <optional>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -29,6 +30,10 @@ class Options {
   // kHelpShown means the usage text was written to standard output.
   static Outcome Parse(int argc, const char* const* argv, Options& options, std::string& error);
 
+  // False when `value` holds the ';' that separates the entries of the module's macro and include
+  // directory lists.
+  static bool FitsList(std::string_view value) { return value.find(';') == std::string_view::npos; }
+
   Command command = Command::kUnits;
   std::string unit;  // the UNIT of `ports`
   std::vector<SourceArgument> sources;
@@ -38,6 +43,7 @@ class Options {
   std::optional<std::string> target;
   std::optional<std::string> family;
   std::vector<std::pair<std::string, std::string>> properties;  // --property KEY=VALUE
+  std::optional<unsigned> converterTimeout;                     // seconds; 0 for none
 
   std::string top;      // --top or --unit
   bool byUnit = false;  // --unit

@@ -1,6 +1,9 @@
 #include "ProjectLoader.h"
 
+#include <sys/stat.h>
+
 #include <algorithm>
+#include <cstdint>
 #include <fstream>
 #include <iterator>
 #include <nlohmann/json.hpp>
@@ -9,6 +12,7 @@
 #include "PluginTable.h"
 #include "Port/File.h"
 #include "Port/FileName.h"
+#include "Port/InputLimits.h"
 
 namespace quillon {
 
@@ -18,8 +22,33 @@ constexpr std::string_view kIncdirPrefix = "+incdir+";
 constexpr std::string_view kDefinePrefix = "+define+";
 constexpr const char* kDefaultLibrary = "work";
 
-bool ReadWholeFile(const std::string& path, std::string& text) {
-  if (Port::File::isDirectory(path.c_str())) return false;
+std::string Formatted(const char* format, const std::string& path, std::uint64_t limit) {
+  return Port::StringBase().Format(format, path.c_str(), static_cast<unsigned long long>(limit)).str();
+}
+
+// A regular file no larger than `maxBytes`: a pipe or device could block or never end. Empty
+// `error` when the file is not there at all, so that the caller can say so in its own words.
+bool IsReadableRegularFile(const std::string& path, std::uint64_t maxBytes, const char* tooLarge,
+                           std::string& error) {
+  struct stat facts {};
+  if (::stat(path.c_str(), &facts) != 0) return false;
+  if (S_ISDIR(facts.st_mode)) return false;
+  if (!S_ISREG(facts.st_mode)) {
+    error = Formatted(Port::InputLimits::kNotRegularFile, path, 0);
+    return false;
+  }
+  if (static_cast<std::uint64_t>(facts.st_size) > maxBytes) {
+    error = Formatted(tooLarge, path, maxBytes);
+    return false;
+  }
+  return true;
+}
+
+// The whole of a project file or file list. False with an empty `error` when it cannot be opened
+// or read.
+bool ReadWholeFile(const std::string& path, std::string& text, std::string& error) {
+  using namespace Port::InputLimits;
+  if (!IsReadableRegularFile(path, kMaxListBytes, kListTooLarge, error)) return false;
   std::ifstream in(path, std::ios::binary);
   if (!in) return false;
   text.assign(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
@@ -50,6 +79,15 @@ std::string Trimmed(std::string_view text) {
   if (first == std::string_view::npos) return {};
   std::size_t last = text.find_last_not_of(kBlanks);
   return std::string(text.substr(first, last - first + 1));
+}
+
+// A "//" starts a comment at the start of a line or after a blank; inside a path ("dir//a.vhd")
+// it is part of the path.
+std::size_t CommentStart(const std::string& line) {
+  for (std::size_t at = line.find("//"); at != std::string::npos; at = line.find("//", at + 1)) {
+    if (at == 0 || line[at - 1] == ' ' || line[at - 1] == '\t') return at;
+  }
+  return line.size();
 }
 
 std::vector<std::string> PlusSeparated(std::string_view list) {
@@ -95,6 +133,10 @@ bool ProjectLoader::Load(const Options& options, std::string& error) {
   for (const std::string& directory : options.includeDirs) AddIncludeDir(directory);
   if (options.target) sources_.properties[std::string(kTargetProperty)] = *options.target;
   if (options.family) sources_.properties[std::string(kFamilyProperty)] = *options.family;
+  if (options.converterTimeout) {
+    sources_.properties[Port::InputLimits::kConverterTimeoutProperty] =
+        std::to_string(*options.converterTimeout);
+  }
   for (const auto& [name, value] : options.properties) sources_.properties[name] = value;
   return true;
 }
@@ -110,9 +152,16 @@ bool ProjectLoader::AddSource(std::string path, const std::string& baseDir, std:
     error = fullPath + " is a directory, not a source file";
     return false;
   }
+  using namespace Port::InputLimits;
+  if (!IsReadableRegularFile(fullPath, kMaxSourceBytes, kSourceTooLarge, error) && !error.empty())
+    return false;
   if (!std::ifstream(fullPath)) {
     error = "cannot read source file " + fullPath;
     return false;
+  }
+  if (!seen_.insert(fullPath).second) {
+    sources_.warnings.push_back(fullPath + " is given more than once; it is read once");
+    return true;
   }
   if (library.empty()) library = kDefaultLibrary;
   if (plugin.empty()) plugin = PluginTable::PluginForPath(fullPath);
@@ -123,8 +172,8 @@ bool ProjectLoader::AddSource(std::string path, const std::string& baseDir, std:
 bool ProjectLoader::AddProjectFile(const SourceArgument& argument, std::string& error) {
   std::string projectPath = Canonical(argument.path, "");
   std::string text;
-  if (!ReadWholeFile(projectPath, text)) {
-    error = "cannot read project file " + projectPath;
+  if (!ReadWholeFile(projectPath, text, error)) {
+    if (error.empty()) error = "cannot read project file " + projectPath;
     return false;
   }
   nlohmann::json project;
@@ -168,6 +217,7 @@ bool ProjectLoader::AddProjectFile(const SourceArgument& argument, std::string& 
     if (!entry.is_object() || !OptionalText(entry, "path", path) || path.empty()) {
       return malformed(where + " needs a \"path\" text");
     }
+    if (path.find('\0') != std::string::npos) return malformed(where + ": the path holds a NUL character");
     if (!OptionalText(entry, "library", library)) return malformed(where + ": \"library\" must be a text");
     if (!OptionalText(entry, "plugin", plugin)) return malformed(where + ": \"plugin\" must be a text");
     if (!AddSource(path, baseDir, library, plugin, error)) return false;
@@ -178,10 +228,12 @@ bool ProjectLoader::AddProjectFile(const SourceArgument& argument, std::string& 
 bool ProjectLoader::AddFileList(const SourceArgument& argument, std::string& error) {
   std::string listPath = Canonical(argument.path, "");
   std::string text;
-  if (!ReadWholeFile(listPath, text)) {
-    error = "cannot read file list " + listPath;
+  if (!ReadWholeFile(listPath, text, error)) {
+    if (error.empty()) error = "cannot read file list " + listPath;
     return false;
   }
+  constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
+  if (text.starts_with(kByteOrderMark)) text.erase(0, kByteOrderMark.size());
   std::istringstream lines(text);
   std::string line;
   for (int number = 1; std::getline(lines, line); ++number) {
@@ -194,18 +246,23 @@ bool ProjectLoader::AddFileList(const SourceArgument& argument, std::string& err
 }
 
 bool ProjectLoader::TakeFileListLine(std::string line, const SourceArgument& argument, std::string& error) {
-  if (std::size_t comment = line.find("//"); comment != std::string::npos) line.erase(comment);
+  line.erase(CommentStart(line));
   line = Trimmed(line);
   if (line.empty() || line[0] == '#') return true;
-  if (line.starts_with(kIncdirPrefix)) {
-    for (std::string& directory : PlusSeparated(std::string_view(line).substr(kIncdirPrefix.size()))) {
-      AddIncludeDir(std::move(directory));
-    }
-    return true;
-  }
-  if (line.starts_with(kDefinePrefix)) {
-    for (const std::string& define : PlusSeparated(std::string_view(line).substr(kDefinePrefix.size()))) {
-      AddDefine(define);
+  if (line.starts_with(kIncdirPrefix) || line.starts_with(kDefinePrefix)) {
+    const bool isDefine = line.starts_with(kDefinePrefix);
+    std::vector<std::string> values =
+        PlusSeparated(std::string_view(line).substr((isDefine ? kDefinePrefix : kIncdirPrefix).size()));
+    for (std::string& value : values) {
+      if (!Options::FitsList(value)) {
+        error = "'" + value + "' holds a ';', which would separate it into more than one entry";
+        return false;
+      }
+      if (isDefine) {
+        AddDefine(value);
+      } else {
+        AddIncludeDir(std::move(value));
+      }
     }
     return true;
   }

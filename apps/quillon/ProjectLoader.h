@@ -3,6 +3,7 @@
 // and gives every source its library and plug-in.
 #pragma once
 
+#include <set>
 #include <string>
 #include <string_view>
 
@@ -38,6 +39,7 @@ class ProjectLoader {
   bool TakeFileListLine(std::string line, const SourceArgument& argument, std::string& error);
 
   ProjectSources& sources_;
+  std::set<std::string> seen_;  // full paths of the sources taken
 };
 
 }  // namespace quillon

@@ -18,6 +18,7 @@ struct ProjectSources {
   std::vector<SourceFile> files;  // in the order given
   // Libraries that the sources name but the project does not hold ("externalLibraries").
   std::vector<std::string> externalLibraries;
+  std::vector<std::string> warnings;  // found while the sources were gathered
 };
 
 }  // namespace quillon

@@ -1,15 +1,18 @@
 #include "Port/Process.h"
 
 #include <fcntl.h>
+#include <poll.h>
 #include <signal.h>
 #include <spawn.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
 #include <cerrno>
+#include <chrono>
 #include <cstdio>
 #include <cstring>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -96,8 +99,10 @@ class SpawnSetup {
     ::sigemptyset(&noMask);
     int error = ::posix_spawnattr_setsigdefault(&attributes_, &defaults);
     if (!error) error = ::posix_spawnattr_setsigmask(&attributes_, &noMask);
+    if (!error) error = ::posix_spawnattr_setpgroup(&attributes_, 0);
     return error ? error
-                 : ::posix_spawnattr_setflags(&attributes_, POSIX_SPAWN_SETSIGDEF | POSIX_SPAWN_SETSIGMASK);
+                 : ::posix_spawnattr_setflags(
+                       &attributes_, POSIX_SPAWN_SETSIGDEF | POSIX_SPAWN_SETSIGMASK | POSIX_SPAWN_SETPGROUP);
   }
 
   int RedirectDescriptors(int outputFd) {
@@ -131,12 +136,87 @@ void TellCannotStart(ChildOutput* sink, const std::string& program, int error) {
   Tell(sink, message.c_str());
 }
 
+int StatusOf(int waitStatus) {
+  if (WIFEXITED(waitStatus)) return WEXITSTATUS(waitStatus);
+  if (WIFSIGNALED(waitStatus)) return Process::kSignalBase + WTERMSIG(waitStatus);
+  return Process::kNotStarted;
+}
+
+int WaitForExit(pid_t pid) {
+  int status = 0;
+  while (::waitpid(pid, &status, 0) < 0) {
+    if (errno != EINTR) return Process::kNotStarted;
+  }
+  return StatusOf(status);
+}
+
+// The child, its process group and the time it may take.
+class ChildWatch {
+ public:
+  ChildWatch(pid_t pid, unsigned seconds)
+      : pid_(pid),
+        deadline_(seconds == 0 ? Clock::time_point::max() : Clock::now() + std::chrono::seconds(seconds)) {}
+
+  // Milliseconds to wait for output before looking again; kills the group once time is up.
+  int NextWait() {
+    constexpr int kLookAgainMs = 100;
+    ReapIfExited();
+    if (Clock::now() >= deadline_ && !timedOut_) {
+      timedOut_ = true;
+      KillGroup();
+    }
+    return kLookAgainMs;
+  }
+  bool timedOut() const { return timedOut_; }
+  // True a while after the group was killed: what still holds the output left the group and
+  // is not waited for.
+  bool GaveUp() const { return killedAt_ && Clock::now() - *killedAt_ > std::chrono::seconds(2); }
+
+  // The child's status once the output is over; also ends what it left behind.
+  int Finish() {
+    KillGroup();
+    if (!exited_) status_ = WaitForExit(pid_);
+    return timedOut_ ? Process::kTimedOut : status_;
+  }
+
+ private:
+  using Clock = std::chrono::steady_clock;
+
+  // A child that exited while something it started keeps the output open: that leftover is
+  // ended, as nothing will read its output.
+  void ReapIfExited() {
+    if (exited_) return;
+    int waitStatus = 0;
+    if (::waitpid(pid_, &waitStatus, WNOHANG) == pid_) {
+      exited_ = true;
+      status_ = StatusOf(waitStatus);
+      KillGroup();
+    }
+  }
+  void KillGroup() {
+    ::kill(-pid_, SIGKILL);
+    if (!killedAt_) killedAt_ = Clock::now();
+  }
+
+  pid_t pid_;
+  Clock::time_point deadline_;
+  bool exited_ = false;
+  bool timedOut_ = false;
+  int status_ = Process::kNotStarted;
+  std::optional<Clock::time_point> killedAt_;
+};
+
 // Reads to the end of the child's output; stops forwarding once the sink declines more.
-void Forward(int readFd, ChildOutput* sink) {
+void Forward(int readFd, ChildOutput* sink, ChildWatch& watch) {
   constexpr std::size_t kChunk = 4096;
   char chunk[kChunk + 1];
   bool forwarding = sink != nullptr;
   for (;;) {
+    pollfd ready{readFd, POLLIN, 0};
+    int polled = ::poll(&ready, 1, watch.NextWait());
+    if (watch.GaveUp()) return;
+    if (polled < 0 && errno != EINTR) return;
+    if (polled <= 0) continue;
     ssize_t count = ::read(readFd, chunk, kChunk);
     if (count < 0 && errno == EINTR) continue;
     if (count <= 0) return;
@@ -146,19 +226,9 @@ void Forward(int readFd, ChildOutput* sink) {
   }
 }
 
-int WaitForExit(pid_t pid) {
-  int status = 0;
-  while (::waitpid(pid, &status, 0) < 0) {
-    if (errno != EINTR) return Process::kNotStarted;
-  }
-  if (WIFEXITED(status)) return WEXITSTATUS(status);
-  if (WIFSIGNALED(status)) return Process::kSignalBase + WTERMSIG(status);
-  return Process::kNotStarted;
-}
-
-int Run(const StringBase& commandLine, bool captureOutput, ChildOutput* sink) {
-  std::vector<std::string> arguments;
-  if (CommandLine::Split(commandLine.view(), &arguments) == 0) {
+int RunArguments(const std::vector<std::string>& arguments, bool captureOutput, unsigned seconds,
+                 ChildOutput* sink) {
+  if (arguments.empty() || arguments[0].empty()) {
     Tell(sink, Process::kEmptyCommand);
     return Process::kNotStarted;
   }
@@ -177,8 +247,19 @@ int Run(const StringBase& commandLine, bool captureOutput, ChildOutput* sink) {
     TellCannotStart(sink, arguments[0], error);
     return Process::kNotStarted;
   }
-  if (captureOutput) Forward(output.readEnd.get(), sink);
-  return WaitForExit(pid);
+  if (!captureOutput) return WaitForExit(pid);
+  ChildWatch watch(pid, seconds);
+  Forward(output.readEnd.get(), sink, watch);
+  return watch.Finish();
+}
+
+int Run(const StringBase& commandLine, bool captureOutput, ChildOutput* sink) {
+  std::vector<std::string> arguments;
+  if (CommandLine::Split(commandLine.view(), &arguments) == 0) {
+    Tell(sink, Process::kEmptyCommand);
+    return Process::kNotStarted;
+  }
+  return RunArguments(arguments, captureOutput, 0, sink);
 }
 
 }  // namespace
@@ -187,6 +268,13 @@ int Process::RunNoWindow(const StringBase& commandLine, bool /*wait*/, bool capt
                          ChildOutput* sink) {
   std::unique_ptr<ChildOutput> owned(sink);
   int status = Run(commandLine, captureOutput, owned.get());
+  if (owned) owned->done();
+  return status;
+}
+
+int Process::RunCaptured(const std::vector<std::string>& arguments, unsigned seconds, ChildOutput* sink) {
+  std::unique_ptr<ChildOutput> owned(sink);
+  int status = RunArguments(arguments, true, seconds, owned.get());
   if (owned) owned->done();
   return status;
 }

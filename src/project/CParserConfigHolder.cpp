@@ -1,5 +1,6 @@
 #include "CParserConfigHolder.h"
 
+#include <charconv>
 #include <utility>
 
 #include "Arch.h"
@@ -171,10 +172,35 @@ void CParserConfigHolder::TakePendingContext(CHdlElement* unit) {
   pendingContext_.clear();
 }
 
+Port::StringBase CParserConfigHolder::DuplicateKey(const Port::StringBase& key, int number) {
+  return Port::StringBase().Format("%s-Instance(%d)", key.c_str(), number);
+}
+
+// A "-Instance(n)" key that is given up makes n the first number to probe again for its base.
+void CParserConfigHolder::FreeDuplicateNumber(const Port::StringBase& key) {
+  constexpr std::string_view kMark = "-Instance(";
+  std::string_view text = key.view();
+  std::size_t mark = text.rfind(kMark);
+  if (mark == std::string_view::npos || !text.ends_with(')')) return;
+  std::string_view digits = text.substr(mark + kMark.size(), text.size() - mark - kMark.size() - 1);
+  int number = 0;
+  auto [end, error] = std::from_chars(digits.data(), digits.data() + digits.size(), number);
+  if (error != std::errc() || end != digits.data() + digits.size()) return;
+  auto next = nextDuplicate_.find(Port::StringBase(text.substr(0, mark)));
+  if (next != nextDuplicate_.end() && number < next->second) next->second = number;
+}
+
 bool CParserConfigHolder::RegisterUnit(const Port::StringBase& key, CHdlElement* record) {
   if (key.IsEmpty() || !record) return false;
   Port::StringBase freeKey = key;
-  for (int n = 1; recordedUnits_.contains(freeKey); ++n) freeKey.Format("%s-Instance(%d)", key.c_str(), n);
+  if (recordedUnits_.contains(freeKey)) {
+    // Probing from the number after the last one given keeps N copies of one name linear.
+    int& next = nextDuplicate_.try_emplace(key, 1).first->second;
+    for (freeKey = DuplicateKey(key, next); recordedUnits_.contains(freeKey);
+         freeKey = DuplicateKey(key, ++next)) {
+    }
+    ++next;
+  }
   recordedUnits_.emplace(std::move(freeKey), Prjrep::AutoPtr<CitI::IInterface>(record));
   return true;
 }
@@ -413,6 +439,7 @@ void CParserConfigHolder::RenameInstance(CHdlElement* instance, const Port::Stri
   // By identity: a duplicate is registered under a "-Instance(n)" key, not under its own.
   for (auto it = recordedUnits_.begin(); it != recordedUnits_.end(); ++it) {
     if (it->second.Get() == static_cast<CitI::IInterface*>(instance)) {
+      FreeDuplicateNumber(it->first);
       recordedUnits_.erase(it);
       break;
     }
@@ -505,6 +532,7 @@ std::shared_ptr<const SiblingPaths> CParserConfigHolder::SiblingPathsOf(
 void CParserConfigHolder::BeginParse(IHdlFileIterator* projectFiles) {
   std::map<Port::StringBase, Prjrep::AutoPtr<CitI::IInterface>> released;
   released.swap(recordedUnits_);
+  nextDuplicate_.clear();
   ForgetParseState();
   ResetForNextUnit();
   siblingPaths_ = SiblingPathsOf(projectFiles);
@@ -516,6 +544,7 @@ void CParserConfigHolder::EndParse() {
     unitSet_->Add(Prjrep::QueryAs<IHdlDesignUnit>(record.Get()));
   std::map<Port::StringBase, Prjrep::AutoPtr<CitI::IInterface>> released;
   released.swap(recordedUnits_);
+  nextDuplicate_.clear();
   ForgetParseState();
   CParserConfigBase* config = file_ ? file_->GetParserConfig() : nullptr;
   if (!config) return;

@@ -175,6 +175,8 @@ class CParserConfigHolder final : public CitI::IInterface {
   std::shared_ptr<const SiblingPaths> SiblingPathsOf(IHdlFileIterator* projectFiles) const;
   // Re-registers an instance under its first label.
   void RenameInstance(CHdlElement* instance, const Port::StringBase& label);
+  static Port::StringBase DuplicateKey(const Port::StringBase& key, int number);
+  void FreeDuplicateNumber(const Port::StringBase& key);
   void CopyInstance(const Port::StringBase& label);
 
   static inline const ParserFactory* parserFactory_ = nullptr;
@@ -189,6 +191,8 @@ class CParserConfigHolder final : public CitI::IInterface {
   std::array<bool, kTypeSlotCount> typeEnabled_{};
   std::int32_t generateDepth_ = 0;
   std::map<Port::StringBase, Prjrep::AutoPtr<CitI::IInterface>> recordedUnits_;
+  // Per key that has duplicates: the first "-Instance(n)" number not known to be taken.
+  std::map<Port::StringBase, int> nextDuplicate_;
   Prjrep::AutoPtr<IHdlDesignUnitSet> unitSet_;
   std::vector<Use*> pendingContext_;
   CHdlElement* currentUnit_ = nullptr;

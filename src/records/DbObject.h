@@ -5,7 +5,6 @@
 #include <cstddef>
 #include <cstdint>
 #include <initializer_list>
-#include <ranges>
 #include <string_view>
 #include <vector>
 
@@ -63,10 +62,9 @@ class DbObject : public CitI::IInterface {
   const Port::StringBase& GetKey() const { return key_; }
   void SetKey(std::string_view key) { key_ = key; }
 
-  // The children in insertion order, as DbObject pointers.
-  auto GetChildren() const {
-    return children_ | std::views::transform([](const Child& child) { return child.object; });
-  }
+  // The children in insertion order, as DbObject pointers, for range-for.
+  class ChildView;
+  ChildView GetChildren() const;
   std::size_t GetChildCount() const { return children_.size(); }
 
   // Sets the back pointer and, for a non-null parent, appends this object to the parent's
@@ -109,9 +107,39 @@ class DbObject : public CitI::IInterface {
   std::uint32_t type_ = 0;
   DbObject* parent_ = nullptr;  // back pointer, no reference
   std::vector<Child> children_;
+
+ public:
+  // A hand-made view: the standard library's transform view does not compile with every
+  // compiler we build with (the fuzzing build uses clang).
+  class ChildView {
+   public:
+    class Iterator {
+     public:
+      explicit Iterator(std::vector<Child>::const_iterator at) : at_(at) {}
+      DbObject* operator*() const { return at_->object; }
+      Iterator& operator++() {
+        ++at_;
+        return *this;
+      }
+      bool operator!=(const Iterator& other) const { return at_ != other.at_; }
+
+     private:
+      std::vector<Child>::const_iterator at_;
+    };
+    explicit ChildView(const std::vector<Child>& children) : children_(children) {}
+    Iterator begin() const { return Iterator(children_.begin()); }
+    Iterator end() const { return Iterator(children_.end()); }
+
+   private:
+    const std::vector<Child>& children_;
+  };
+
+ private:
   Port::StringBase name_;
   Port::StringBase key_;
   Prjrep::TRefCountHelper<DbObject> refCount_{this};
 };
+
+inline DbObject::ChildView DbObject::GetChildren() const { return ChildView(children_); }
 
 }  // namespace Vad

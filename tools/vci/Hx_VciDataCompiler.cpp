@@ -69,6 +69,7 @@ std::unique_ptr<Hx_VpiAccess> DataCompiler::compile(int argc, const char* const*
 // Each file starts from the macro state that the files before it left; the cache compiles only
 // the files it keeps no current result for.
 std::unique_ptr<Hx_VpiAccess> DataCompiler::CompileFiles(int argc, const char* const* argv) {
+  lastFileMessages_.clear();
   const VerilogCommandLine commandLine(argc, argv);
   VerilogMessageLog::Issue(commandLine.messages());
   const std::vector<std::string_view>& files = commandLine.files();
@@ -88,6 +89,7 @@ std::unique_ptr<Hx_VpiAccess> DataCompiler::CompileFiles(int argc, const char* c
   const VerilogFileCache::ChainResult chain = cache_->CompileChain(
       files, MacrosOf(commandLine.defines()), HashOf(commandLine.includeDirs()), compile);
   const VerilogFileResult& result = *chain.result;
+  lastFileMessages_ = result.messages;
   if (!lastCompiled) {
     VerilogMessageLog::Issue(result.messages);  // the file compiled is reported in full every time
   }

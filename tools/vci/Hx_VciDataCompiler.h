@@ -7,8 +7,10 @@
 #pragma once
 
 #include <memory>
+#include <vector>
 
 #include "vci/Hx_VpiAccess.h"
+#include "vci/VerilogMessage.h"
 
 namespace Hx_Vci {
 
@@ -33,10 +35,15 @@ class DataCompiler {
 
   VerilogFileCache& cache() const { return *cache_; }
 
+  // The messages of the last file of the last compile (the file whose modules it answered),
+  // whether that file was compiled or its result came from the cache.
+  const std::vector<VerilogMessage>& lastFileMessages() const { return lastFileMessages_; }
+
  private:
   std::unique_ptr<Hx_VpiAccess> CompileFiles(int argc, const char* const* argv);
 
   std::shared_ptr<VerilogFileCache> cache_;
+  std::vector<VerilogMessage> lastFileMessages_;
 };
 
 }  // namespace Hx_Vci

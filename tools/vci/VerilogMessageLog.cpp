@@ -80,14 +80,17 @@ std::string VerilogMessageLog::Quote(std::string_view text) {
   return quoted;
 }
 
-void VerilogMessageLog::Issue(const std::vector<VerilogMessage>& messages) {
+void VerilogMessageLog::Issue(const std::vector<VerilogMessage>& messages, bool withPlace) {
   for (const VerilogMessage& message : messages) {
     std::unique_ptr<Port_MsgManData> source =
         Port_MsgManData::createObject("VerilogCompiler", message.file.c_str(), message.line, "");
+    std::string text = message.text;
+    if (withPlace && !message.file.empty())
+      text = message.file + ":" + std::to_string(message.line) + ": " + text;
     if (message.severity == VerilogSeverity::kError) {
-      source->issueError("%s\n", message.text.c_str());
+      source->issueError("%s\n", text.c_str());
     } else {
-      source->issueWarning("%s\n", message.text.c_str());
+      source->issueWarning("%s\n", text.c_str());
     }
   }
 }

@@ -36,8 +36,9 @@ class VerilogMessageLog {
   static std::string Format(const char* format, ...) __attribute__((format(printf, 1, 2)));
   // `text` cut to kQuoteLimit characters, with "..." when it was longer; control bytes shown as '?'.
   static std::string Quote(std::string_view text);
-  // Hands the messages to the host's message system, category "VerilogCompiler".
-  static void Issue(const std::vector<VerilogMessage>& messages);
+  // Hands the messages to the host's message system, category "VerilogCompiler"; `withPlace`
+  // also starts each text with "file:line: ", for hosts that show the text alone.
+  static void Issue(const std::vector<VerilogMessage>& messages, bool withPlace = false);
 
  private:
   void Add(VerilogSeverity severity, const std::string& file, int line, std::string text);

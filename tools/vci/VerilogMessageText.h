@@ -33,6 +33,8 @@ inline constexpr char kDirectiveNeedsName[] = "`%s needs a macro name";
 inline constexpr char kIncludeNeedsFile[] = "`include needs a file name in quotes";
 inline constexpr char kIncludeNotFound[] = "include file \"%s\" not found";
 inline constexpr char kIncludeUnreadable[] = "include file \"%s\" cannot be read";
+inline constexpr char kTooManyIncludes[] =
+    "more than %zu `include directives are followed in one file; further ones are ignored";
 inline constexpr char kIncludeTooDeep[] =
     "`include nests deeper than %d files (does a file include itself?); \"%s\" is not included";
 inline constexpr char kConditionalWithoutIf[] = "`%s without `ifdef or `ifndef";

@@ -73,6 +73,7 @@ VerilogPreprocessedText VerilogPreprocessor::Run(const std::string& path, std::s
   dependencyPaths_.clear();
   budgetUsed_ = 0;
   budgetSpent_ = false;
+  includesTaken_ = 0;
 
   Source s;
   s.text = text;
@@ -478,7 +479,7 @@ void VerilogPreprocessor::HandleInclude(Source& s, std::size_t at) {
     Error(s, at, Text::kIncludeTooDeep, limits_.includeDepth, ShortName(name).c_str());
     return;
   }
-  if (budgetSpent_) {
+  if (budgetSpent_ || !TakeInclusion(s, at)) {
     return;
   }
   std::string path;
@@ -500,6 +501,18 @@ void VerilogPreprocessor::HandleInclude(Source& s, std::size_t at) {
   CloseConditionals(included);
 
   BeginSegment(s.fileId, LineAt(s, s.pos));
+}
+
+// Each inclusion counts, so that headers that include the next one twice cannot double the work
+// at every level.
+bool VerilogPreprocessor::TakeInclusion(Source& s, std::size_t at) {
+  if (includesTaken_ == limits_.includeCount) Error(s, at, Text::kTooManyIncludes, limits_.includeCount);
+  if (includesTaken_ >= limits_.includeCount) {
+    includesTaken_ = limits_.includeCount + 1;
+    return false;
+  }
+  ++includesTaken_;
+  return true;
 }
 
 bool VerilogPreprocessor::ReadIncludeName(Source& s, std::string* name) {

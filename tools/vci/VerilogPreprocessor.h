@@ -14,6 +14,7 @@
 #include <unordered_set>
 #include <vector>
 
+#include "Port/InputLimits.h"
 #include "vci/VerilogMacroState.h"
 #include "vci/VerilogMessageLog.h"
 #include "vci/VerilogPreprocessedText.h"
@@ -23,12 +24,14 @@ namespace Hx_Vci {
 class VerilogPreprocessor {
  public:
   struct Limits {
-    int includeDepth = 64;
-    int macroDepth = 64;
+    int includeDepth = Port::InputLimits::kMaxIncludeDepth;
+    int macroDepth = Port::InputLimits::kMaxMacroDepth;
     // Text produced by one macro use in the file itself, nested expansions included.
-    std::size_t macroExpansionBytes = std::size_t{16} << 20;
+    std::size_t macroExpansionBytes = Port::InputLimits::kMaxMacroExpansionBytes;
     // Text added by all macro expansions and included files of the compiled file.
-    std::size_t expansionBudget = std::size_t{128} << 20;
+    std::size_t expansionBudget = Port::InputLimits::kMaxExpansionBytes;
+    // Files included by the compiled file, counted at every inclusion.
+    std::size_t includeCount = Port::InputLimits::kMaxIncludesPerFile;
   };
 
   // `includeDirs` are searched in order after the including file's own directory. All three
@@ -108,6 +111,7 @@ class VerilogPreprocessor {
 
   void HandleInclude(Source& s, std::size_t at);
   bool ReadIncludeName(Source& s, std::string* name);
+  bool TakeInclusion(Source& s, std::size_t at);
   bool FindInclude(Source& s, std::size_t at, const std::string& name, std::string* path, std::string* text);
   void AddDependency(const std::string& path, const VerilogFileStamp& stamp);
 
@@ -144,6 +148,7 @@ class VerilogPreprocessor {
   std::vector<VerilogDependency> dependencies_;
   std::unordered_set<std::string> dependencyPaths_;
   std::size_t budgetUsed_ = 0;
+  std::size_t includesTaken_ = 0;
   bool budgetSpent_ = false;
   std::size_t topExpansionBytes_ = 0;
   bool abortExpansion_ = false;

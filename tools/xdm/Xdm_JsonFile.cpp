@@ -67,21 +67,44 @@ std::string Xdm_JsonFile::ReadText(const std::string& file) {
   return text;
 }
 
+namespace {
+
+// Whether containers nest deeper than `limit` outside the strings of the text.
+bool NestsDeeperThan(const std::string& text, int limit) {
+  int depth = 0;
+  bool inString = false;
+  for (std::size_t at = 0; at < text.size(); ++at) {
+    const char c = text[at];
+    if (inString) {
+      if (c == '\\') {
+        ++at;
+      } else if (c == '"') {
+        inString = false;
+      }
+    } else if (c == '"') {
+      inString = true;
+    } else if (c == '{' || c == '[') {
+      if (++depth > limit) return true;
+    } else if ((c == '}' || c == ']') && depth > 0) {
+      --depth;
+    }
+  }
+  return false;
+}
+
+}  // namespace
+
 nlohmann::json Xdm_JsonFile::Parse(const std::string& text, const std::string& file) {
   // The parser takes a NUL byte for the end of its input and would ignore whatever follows.
   if (text.find('\0') != std::string::npos) {
     throw Xdm_FormatProblem::Error(file, "", std::string(kNotJsonMessage) + " (it holds a NUL byte)");
   }
-  auto limitNesting = [](int depth, nlohmann::json::parse_event_t event, nlohmann::json&) {
-    bool opens = event == nlohmann::json::parse_event_t::object_start ||
-                 event == nlohmann::json::parse_event_t::array_start;
-    if (opens && depth >= Xdm_FileFormat::kMaxJsonDepth) {
-      throw Xdm_FormatProblem(kTooDeepMessage);
-    }
-    return true;
-  };
+  // Checked in one pass ahead of the parser: a parse callback would make the parser rescan the
+  // parent container at the end of every child, quadratic in the number of siblings.
+  if (NestsDeeperThan(text, Xdm_FileFormat::kMaxJsonDepth))
+    throw Xdm_FormatProblem::Error(file, "", kTooDeepMessage);
   try {
-    return nlohmann::json::parse(text, limitNesting);
+    return nlohmann::json::parse(text);
   } catch (const Xdm_FormatProblem& problem) {
     throw problem.At(file, "");
   } catch (const nlohmann::json::exception& error) {

@@ -1,6 +1,9 @@
 // Runs a tool as a child process, without a shell, and hands its output to a sink.
 #pragma once
 
+#include <string>
+#include <vector>
+
 #include "Port/ChildOutput.h"
 #include "Port/StringBase.h"
 
@@ -37,6 +40,16 @@ class Process {
   // when nothing could be run.
   static int RunNoWindow(const StringBase& commandLine, bool wait, bool captureOutput,
                          ChildOutput* sink = nullptr);
+
+  // Result when the time limit of RunCaptured ran out.
+  static constexpr int kTimedOut = -1;
+
+  // Runs `arguments` as they are (the first is the program), with output captured as
+  // RunNoWindow does. The child leads a process group of its own; when `seconds` (0: no limit)
+  // pass before its output ends, or when the child has exited while a process it left behind
+  // still holds the output open, the whole group is killed. Takes ownership of `sink`. The
+  // child's status as RunNoWindow gives it, or kTimedOut.
+  static int RunCaptured(const std::vector<std::string>& arguments, unsigned seconds, ChildOutput* sink);
 };
 
 }  // namespace Port

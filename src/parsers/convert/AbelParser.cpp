@@ -16,12 +16,11 @@ constexpr ConverterMessages kAbelConverterMessages{"Unable to run abelconv - Pro
 void ReadThroughAbelConverter(CParserConfigHolder& holder) {
   const SourceNames source(holder);
   const Port::StringBase outputName = source.baseName + ".hrf";
-  Port::StringBase command;
-  command.Format("abelconv \"%s\" -ohrf only", source.fileName.c_str());
-
   CurrentDirectoryScope inSourceDirectory(source.directory);
-  RunConverter(command, kAbelConverterMessages);
-  qhParser(outputName, holder).Parse();
+  const int status =
+      RunConverter(holder, {"abelconv", source.fileName.str(), "-ohrf", "only"}, kAbelConverterMessages);
+  if (ConverterOutputUsable("abelconv", source.fileName, outputName, status))
+    qhParser(outputName, holder).Parse();
 }
 
 int AbelParser::Parse(CParserConfigHolder& holder) {

@@ -37,20 +37,19 @@ void RecordInstances(const Xdm_Block& block, CParserConfigHolder& holder) {
 int EdifParserPlx::Parse(CParserConfigHolder& holder) {
   const SourceNames source(holder);
   const Port::StringBase databaseName = source.baseName + ".tbx";
-  Port::StringBase command;
-  command.Format("edifconv \"%s\"", source.fileName.c_str());
-
   CurrentDirectoryScope inSourceDirectory(source.directory);
   visitedTypes_.clear();
-  RunConverter(command, kEdifConverterMessages);
+  const int status = RunConverter(holder, {"edifconv", source.fileName.str()}, kEdifConverterMessages);
+  if (!ConverterOutputUsable("edifconv", source.fileName, databaseName, status)) return 0;
   if (!Xdm_Model::CanOpen(databaseName.c_str())) {
-    IssueConverterError(Port::StringBase().Format("Could not open %s\n", databaseName.c_str()));
+    IssueConverterError(NoNetlistDatabaseText(databaseName.c_str()));
     return 0;
   }
   try {
     ReadDatabase(databaseName.c_str(), holder);
-  } catch (const std::exception&) {
-    IssueConverterError(Port::StringBase().Format("The tbx file: %s may be corrupt\n", databaseName.c_str()));
+  } catch (const std::exception& failure) {
+    IssueConverterError(Port::StringBase().Format("The tbx file: %s may be corrupt: %s\n",
+                                                  databaseName.c_str(), failure.what()));
   }
   return 0;
 }

@@ -23,7 +23,7 @@ int PlxParser::Parse(CParserConfigHolder& holder) {
 
 bool PlxParser::ReadDatabase(const char* path, CParserConfigHolder& holder) const {
   if (!Xdm_Model::CanOpen(path)) {
-    IssueConverterWarning("Cannot open as Plx database\n");
+    IssueConverterWarning(NoNetlistDatabaseText(path));
     return false;
   }
   try {
@@ -32,8 +32,9 @@ bool PlxParser::ReadDatabase(const char* path, CParserConfigHolder& holder) cons
     model.CreateTxn("txn", Xdm_Model::kTxnRead);
     RecordTopBlock(model, holder);
     return true;
-  } catch (const std::exception&) {
-    IssueConverterWarning("The plx database may be corrupt\n");
+  } catch (const std::exception& failure) {
+    IssueConverterWarning(
+        Port::StringBase().Format("The plx database %s may be corrupt: %s\n", path, failure.what()));
     return false;
   }
 }

@@ -2,6 +2,8 @@
 
 #include <cstdint>
 #include <new>
+#include <string>
+#include <vector>
 
 #include "CHdlFile.h"
 #include "CParserConfigHolder.h"
@@ -66,17 +68,19 @@ bool NeedsConversion(const Port::StringBase& source, const Port::StringBase& out
   return Port::File::getdatetime(source.c_str(), &sourceTime) && outputTime < sourceTime;
 }
 
-void Convert(const Port::StringBase& family, const Port::StringBase& source, const Port::StringBase& output) {
-  const char* tool = Port_Env::GetEnv("CVN_WSMGR_QT3") ? "drawconv3" : "drawconv";
-  Port::StringBase command;
-  command.Format("%s -intstyle ardent -family %s \"%s\" \"%s\"", tool, family.c_str(), source.c_str(),
-                 output.c_str());
-  Port_MsgManData::debugStub("Cmd line is: %s\n", command.c_str());
+const char* SchematicConverter() { return Port_Env::GetEnv("CVN_WSMGR_QT3") ? "drawconv3" : "drawconv"; }
+
+int Convert(const CParserConfigHolder& holder, const Port::StringBase& family, const Port::StringBase& source,
+            const Port::StringBase& output) {
+  const std::vector<std::string> arguments{SchematicConverter(), "-intstyle",  "ardent",    "-family",
+                                           family.str(),         source.str(), output.str()};
+  Port_MsgManData::debugStub("Cmd line is: %s -intstyle ardent -family %s \"%s\" \"%s\"\n",
+                             arguments[0].c_str(), family.c_str(), source.c_str(), output.c_str());
   Port_MsgManData::debugStub("Extracting hierarchy info from: %s\n", source.c_str());
   Port::StringBase discarded;
   std::int32_t keepTaking = 0;
-  RunConverter(command, kSchematicConverterMessages,
-               new (std::nothrow) DerivedOutput(&discarded, &keepTaking));
+  return RunConverter(holder, arguments, kSchematicConverterMessages,
+                      new (std::nothrow) DerivedOutput(&discarded, &keepTaking));
 }
 
 // The converter's output: "<base name>.hrf" beside the file's host location.
@@ -98,8 +102,13 @@ int SchematicParser::Parse(CParserConfigHolder& holder) {
   const Port::StringBase family = DeviceFamilyOf(holder);
   Port::StringBase source;
   holder.GetFullPath(source);
-  if (NeedsConversion(source, output)) Convert(family, source, output);
+  int status = 0;
+  if (NeedsConversion(source, output)) status = Convert(holder, family, source, output);
 
+  if (status != 0 && Port::File::exist(output.c_str()) &&
+      !ConverterOutputUsable(SchematicConverter(), source, output, status)) {
+    return 1;
+  }
   if (Port::File::exist(output.c_str())) {
     qhParser(output, holder).Parse();
   } else {

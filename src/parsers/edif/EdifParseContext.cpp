@@ -22,6 +22,15 @@ void SplitRenameText(const std::string& text, std::string& edifName, std::string
   displayName = bar < text.size() ? text.substr(bar + 1) : std::string();
 }
 
+// Cells and library references name a library by its EDIF name, not by its display name.
+std::string EdifNameOf(const std::string& text) {
+  if (!IsRenameText(text)) return text;
+  std::string edifName;
+  std::string displayName;
+  SplitRenameText(text, edifName, displayName);
+  return edifName;
+}
+
 std::string DisplayNameOf(const std::string& text) {
   if (!IsRenameText(text)) return text;
   std::string edifName;
@@ -103,6 +112,6 @@ void EdifParseContext::AddDesign(std::uint32_t cellRef) {
   NewNode().designCellName = std::move(cell);
 }
 
-void EdifParseContext::SetLibrary(std::uint32_t name) { library = DisplayNameOf(texts.Text(name)); }
+void EdifParseContext::SetLibrary(std::uint32_t name) { library = EdifNameOf(texts.Text(name)); }
 
 }  // namespace Vad

@@ -9,6 +9,7 @@
 #include <map>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 namespace Port {
@@ -63,6 +64,13 @@ class EdifTextRing {
   std::uint32_t Add(std::string_view text) {
     next_ = (next_ + 1) % kSlots;
     texts_[next_].assign(text.substr(0, kMaxLength));
+    return next_;
+  }
+  // Texts joined from others: each part was cut already, so that cutting the whole could not
+  // cut away a later part.
+  std::uint32_t AddJoined(std::string text) {
+    next_ = (next_ + 1) % kSlots;
+    texts_[next_] = std::move(text);
     return next_;
   }
   const std::string& Text(std::uint32_t slot) const { return texts_[slot % kSlots]; }

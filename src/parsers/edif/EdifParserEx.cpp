@@ -41,7 +41,8 @@ int EdifParserEx::Parse(CParserConfigHolder& holder) {
   const bool always = IsSet(kAlwaysHierarchical);
   const bool never = IsSet(kNeverHierarchical);
   ResetTables();
-  Summary summary = ReadEdif(path, true);
+  // Forced flat, a partition changes nothing: the scan goes on to the design.
+  Summary summary = ReadEdif(path, !never);
   if (always || (!never && summary.hasPartition)) return ParseHierarchy(holder, path);
   RecordTopModules(holder, summary);
   return 1;

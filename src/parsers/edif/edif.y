@@ -27,7 +27,7 @@ using Vad::EdifParseContext;
 void edif_error(void*, EdifParseContext&, const char*) {}
 
 std::uint32_t Joined(EdifParseContext& ctx, const char* before, std::uint32_t first, std::uint32_t second) {
-  return ctx.texts.Add(before + ctx.texts.Text(first) + "|" + ctx.texts.Text(second));
+  return ctx.texts.AddJoined(before + ctx.texts.Text(first) + "|" + ctx.texts.Text(second));
 }
 
 }  // namespace

@@ -7,6 +7,7 @@
 #include <cstdint>
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include "Port/StringBase.h"
 
@@ -47,12 +48,19 @@ class HierarchyNameRing {
 };
 
 struct HierarchyParseContext {
-  HierarchyParseContext(CParserConfigHolder& recorder, Port::Stream& source)
-      : holder(recorder), input(source) {}
+  HierarchyParseContext(CParserConfigHolder& recorder, Port::Stream& source, std::string sourcePath)
+      : holder(recorder), input(source), path(std::move(sourcePath)) {}
+
+  // Issues an error of the file at the line of the token read last: "<path>:<line>: <text>".
+  void Error(const char* format, ...) __attribute__((format(printf, 2, 3)));
 
   CParserConfigHolder& holder;
   Port::Stream& input;
+  std::string path;
   HierarchyNameRing names;
+  std::uint32_t line = 1;       // of the next character the scanner reads
+  std::uint32_t tokenLine = 1;  // of the token read last
+  std::uint64_t labels = 0;     // instance labels that ranges made so far
 };
 
 // Runs the scanner and grammar over the context's input. 0 when the input was read to its end,

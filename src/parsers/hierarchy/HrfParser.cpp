@@ -1,8 +1,10 @@
 #include "HrfParser.h"
 
 #include <array>
+#include <cerrno>
 #include <charconv>
 #include <cstdint>
+#include <cstring>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -10,6 +12,7 @@
 
 #include "CParserConfigHolder.h"
 #include "Port/File.h"
+#include "Port/MsgManData.h"
 #include "Port/StringBase.h"
 
 namespace Vad {
@@ -155,14 +158,25 @@ class BlockReader {
   Port::StringBase currentName_;
 };
 
+void ReportError(const Port::StringBase& path, const Port::StringBase& text) {
+  Port_MsgManData::createObject("ProjectMgmt", path.c_str(), 0, "")->issueError("%s", text.c_str());
+}
+
 }  // namespace
 
 int HrfParser::Parse(CParserConfigHolder& holder) {
   Port::StringBase path;
   holder.GetFullPath(path);
   std::unique_ptr<Port::Stream> input = Port::File::open(path.c_str(), "r");
-  if (!input) return 1;
+  if (!input) {
+    ReportError(path, Port::StringBase().Format("cannot open %s: %s\n", path.c_str(), std::strerror(errno)));
+    return 1;
+  }
   BlockReader(holder).Read(*input);
+  // A line that does not fit in memory ends the reading as the end of the file would.
+  if (input->error() || !input->geteof()) {
+    ReportError(path, Port::StringBase().Format("%s could not be read to its end\n", path.c_str()));
+  }
   Port::File::close(input);
   return 1;
 }

@@ -18,6 +18,7 @@
 #include <cstring>
 
 #include "CParserConfigHolder.h"
+#include "Port/InputLimits.h"
 
 int qh_lex(QH_STYPE* value, void* scanner);
 
@@ -26,16 +27,14 @@ namespace {
 using Vad::CParserConfigHolder;
 using Vad::HierarchyParseContext;
 
-/* Bison calls this for the first error of a recovery and for a stack overflow; the messages are
-   the ones this system has always written. */
-void qh_error(void*, HierarchyParseContext&, const char* message) {
+/* Bison calls this for the first error of a recovery and for a stack overflow. */
+void qh_error(void*, HierarchyParseContext& ctx, const char* message) {
   const bool overflow = std::strcmp(message, "memory exhausted") == 0;
-  std::fprintf(stderr, "Syntax error: %s\n", overflow ? "parser stack overflow" : "parse error");
-  std::fflush(stderr);
+  ctx.Error("Syntax error: %s", overflow ? "parser stack overflow" : "parse error");
 }
 
-/* A range wider than this would copy the instance without end; it is refused. */
-constexpr std::uint32_t kMaxRangeLabels = 65536;
+using Port::InputLimits::kMaxRangeLabels;
+using Port::InputLimits::kMaxHierarchyLabels;
 
 Port::StringBase NameOf(const HierarchyParseContext& ctx, const Vad::HierarchyValue& value) {
   return ctx.names.String(value.name);
@@ -87,10 +86,17 @@ void RecordInstanceRange(HierarchyParseContext& ctx, const Vad::HierarchyValue& 
   const std::uint32_t high = std::max(from, to);
   Port::StringBase base = NameOf(ctx, name);
   if (high - low >= kMaxRangeLabels) {
-    std::fprintf(stderr, "Syntax error: instance range %s(%u:%u) too wide\n", base.c_str(), from, to);
-    std::fflush(stderr);
+    ctx.Error(Port::InputLimits::kRangeTooWide, base.c_str(), from, to);
     return;
   }
+  const std::uint64_t count = std::uint64_t{high} - low + 1;
+  if (ctx.labels + count > kMaxHierarchyLabels) {
+    /* Said once: every later range is refused as well. */
+    if (ctx.labels <= kMaxHierarchyLabels) ctx.Error(Port::InputLimits::kTooManyLabels, static_cast<unsigned long long>(kMaxHierarchyLabels));
+    ctx.labels = kMaxHierarchyLabels + 1;
+    return;
+  }
+  ctx.labels += count;
   for (std::uint64_t k = low; k <= high; ++k) {
     Port::StringBase label;
     label.Format("%s_%u", base.c_str(), static_cast<unsigned>(k));

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <memory>
+#include <string>
 
 #include "Port/Stream.h"
 
@@ -32,6 +33,7 @@ class qhParser {
 
  private:
   std::unique_ptr<Port::Stream> input_;
+  std::string path_;
   CParserConfigHolder& holder_;
 };
 

@@ -10,6 +10,8 @@
 #include "VerilogArguments.h"
 #include "pep/PepExtractor.h"
 #include "vci/Hx_Vci.h"
+#include "vci/Hx_VciDataCompiler.h"
+#include "vci/VerilogMessageLog.h"
 
 namespace Vad {
 namespace {
@@ -55,10 +57,15 @@ int VerilogParser::Parse(CParserConfigHolder& holder) {
   if (!compiler_) return 0;
   try {
     const VerilogArguments arguments(holder);
-    MsgCapture capture;
-    std::unique_ptr<Hx_VpiAccess> access = compiler_->compile(arguments.Count(), arguments.Vector());
-    if (access) RecordModules(*access, holder);
-    capturedMessages_ = capture.CapturedText();
+    {
+      MsgCapture capture;
+      std::unique_ptr<Hx_VpiAccess> access = compiler_->compile(arguments.Count(), arguments.Vector());
+      if (access) RecordModules(*access, holder);
+      capturedMessages_ = capture.CapturedText();
+    }
+    // The compile repeats the messages of the files before this one; the user sees each file's
+    // own messages once, when that file is parsed.
+    Hx_Vci::VerilogMessageLog::Issue(compiler_->lastFileMessages(), true);
   } catch (const std::bad_alloc&) {
     // Running out of memory ends this file's parse early; what was recorded stays.
   }

@@ -78,16 +78,24 @@ TEST_F(NetlistParse, MissingOrCorruptIntermediateFileIsReported) {
   InstallTool("edifconv", "exit 1\n");
   std::string path = Source("design.edf", "");
   EXPECT_THAT(Parse(path, "PLUGIN_Edif"), IsEmpty());
-  EXPECT_THAT(Messages(), ElementsAre("error: Unable to run edifconv - Process Failed\n",
-                                      "error: Could not open design.tbx\n"));
+  EXPECT_THAT(Messages(), ElementsAre("error: Unable to run edifconv - Process Failed (" + path +
+                                          ": edifconv exited with status 1)\n",
+                                      "error: edifconv wrote no output design.tbx for design.edf\n"));
 
   messages_.clearRecords();
   InstallNetlistConverter(Database("", "SOURCE", R"({"properties": {"TYPE": "nameless"}})"));
   EXPECT_THAT(ParseAgain(), IsEmpty());
   InstallNetlistConverter(Database("", "LAYOUT", Block("top", "top_cell", kGate)));
   EXPECT_THAT(ParseAgain(), IsEmpty());
-  EXPECT_THAT(Messages(), ElementsAre("error: The tbx file: design.tbx may be corrupt\n",
-                                      "error: The tbx file: design.tbx may be corrupt\n"));
+  EXPECT_THAT(Messages(),
+              ElementsAre(testing::StartsWith("error: The tbx file: design.tbx may be corrupt: "),
+                          testing::StartsWith("error: The tbx file: design.tbx may be corrupt: ")));
+
+  // A database that exists but is none is not said to be impossible to open.
+  messages_.clearRecords();
+  InstallTool("edifconv", "echo 'not a database' > design.tbx\n");
+  EXPECT_THAT(ParseAgain(), IsEmpty());
+  EXPECT_THAT(Messages(), ElementsAre("error: design.tbx is no netlist database\n"));
 }
 
 TEST_F(NetlistParse, DeepestAllowedBlockTreeIsWalkedWithoutExhaustingTheStack) {
@@ -123,8 +131,10 @@ TEST_F(NetlistParse, UnreadableDatabaseStillYieldsAModuleNamedAfterTheFile) {
               ElementsAre("|Module||garbage line 0 placed-database flag"));
   EXPECT_THAT(Parse(Source("broken.tdb", Database("", "V", R"({"name": 7})")), "PLUGIN_TBX"),
               ElementsAre("|Module||broken line 0 intermediate-database flag"));
-  EXPECT_THAT(Messages(), ElementsAre("warning: Cannot open as Plx database\n",
-                                      "warning: The plx database may be corrupt\n"));
+  EXPECT_THAT(Messages(),
+              ElementsAre("warning: " + sources_.Path("garbage.pdb") + " is no netlist database\n",
+                          testing::StartsWith("warning: The plx database " + sources_.Path("broken.tdb") +
+                                              " may be corrupt: ")));
   EXPECT_EQ(Part(), "");
 }
 

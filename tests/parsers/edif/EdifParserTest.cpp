@@ -1,5 +1,6 @@
 #include <string>
 
+#include "EdifParseContext.h"
 #include "EdifTestFixture.h"
 #include "ScopedEnv.h"
 
@@ -84,8 +85,8 @@ TEST_F(EdifRead, PartitionedNetlistIsReadAsHierarchyUnlessTheEnvironmentForbidsI
   EXPECT_EQ(part_, "DEV-100-A");
   {
     ScopedEnv never(kNever, "");
-    // The keyword scan stops at the first partition property, before the design form.
-    EXPECT_THAT(Read<Vad::EdifParserEx>(Netlist(true)), IsEmpty());
+    // Forced flat, the keyword scan goes past the partition properties to the design form.
+    EXPECT_THAT(Read<Vad::EdifParserEx>(Netlist(true)), ElementsAre("|Module||top top"));
     EXPECT_THAT(Read<Vad::EdifParserEx>(Netlist(false)), ElementsAre("|Module||top top"));
     ScopedEnv always(kAlways, "");
     EXPECT_EQ(Read<Vad::EdifParserEx>(Netlist(true)), hierarchy);
@@ -120,6 +121,31 @@ TEST_F(EdifRead, DesignNamingAnUnknownCellOrLibraryIsAnError) {
   EXPECT_THAT(log.Lines(),
               ElementsAre(missing, missing, "error ProjectMgmt: No design in edif file: nodesign.edf"));
   EXPECT_THAT(Read<Vad::EdifParserEx>(known), ElementsAre("|Module||known_cell top"));
+}
+
+TEST_F(EdifRead, RenamedLibraryIsReferencedByItsEdifName) {
+  const std::string netlist =
+      "(edif d (library (rename lib_1 \"LibOne\") (edifLevel 0)\n"
+      "  (cell leaf (view v (contents (net n1))))\n"
+      "  (cell top (view v (contents (instance u1 (viewRef v (cellRef leaf (libraryRef lib_1))))))))\n"
+      "  (design d (cellRef top (libraryRef lib_1))))\n";
+  MessageLog log;
+  EXPECT_THAT(Read<Vad::EdifParser>(netlist), ElementsAre("|Module||top top"));
+  ScopedEnv always(kAlways, "1");
+  EXPECT_THAT(Read<Vad::EdifParserEx>(netlist),
+              ElementsAre("|ComponentInstantiation||top|top|u1|leaf| instance parent |Module||top",
+                          "|Module||leaf module", "|Module||top top"));
+  EXPECT_THAT(log.Lines(), IsEmpty());
+}
+
+TEST_F(EdifRead, LongestCellNameKeepsItsLibraryInTheDesignReference) {
+  const std::string cell(Vad::EdifTextRing::kMaxLength, 'c');
+  std::string netlist = DesignOf(cell, "lib_x");
+  netlist.replace(netlist.find("known_cell"), std::string_view("known_cell").size(), cell);
+  ScopedEnv always(kAlways, "1");
+  MessageLog log;
+  EXPECT_THAT(Read<Vad::EdifParserEx>(netlist), ElementsAre("|Module||" + cell + " top"));
+  for (const std::string& line : log.Lines()) EXPECT_THAT(line, testing::Not(HasSubstr("not found")));
 }
 
 TEST_F(EdifRead, SiblingHierarchyFileInTheCurrentDirectoryIsReadInstead) {

@@ -7,6 +7,7 @@
 #include "CParserConfigHolder.h"
 #include "HrfParser.h"
 #include "HrfTestFixture.h"
+#include "Port/InputLimits.h"
 #include "SeededRandom.h"
 
 using hrf_test::HierarchyRead;
@@ -71,20 +72,6 @@ TEST_F(HierarchyRead, ProjectReaderTakesVeryLongLinesWholeAndIgnoresBinaryLines)
   EXPECT_EQ(units[1], "|Entity||" + name + " line 3 entity flag");
 }
 
-TEST_F(HierarchyRead, ProjectFileThatCannotBeOpenedRecordsNothingSilently) {
-  std::string missing = dir_.Path("absent.hrf");
-  file_ = AddNewFile(project_.Get(), missing, "PLUGIN_Hrf");
-  Vad::CParserConfigHolder* holder = HolderOf(file_.Get());
-  holder->BeginParse(nullptr);
-  testing::internal::CaptureStdout();
-  testing::internal::CaptureStderr();
-  EXPECT_EQ(Vad::HrfParser().Parse(*holder), 1);
-  EXPECT_EQ(testing::internal::GetCapturedStderr(), "");
-  EXPECT_EQ(testing::internal::GetCapturedStdout(), "");
-  holder->EndParse();
-  EXPECT_THAT(Describe(holder->GetUnitSet()), IsEmpty());
-}
-
 TEST_F(HierarchyRead, ConverterInstanceRangeLabelsTheLastInstanceInEitherOrder) {
   int result = -1;
   testing::internal::CaptureStderr();
@@ -111,16 +98,15 @@ TEST_F(HierarchyRead, ConverterInstanceRangeLabelsTheLastInstanceInEitherOrder) 
   EXPECT_EQ(result, 0);
 }
 
-TEST_F(HierarchyRead, ConverterInstanceRangeTooWideIsRefusedWithAMessage) {
+TEST_F(HierarchyRead, ConverterInstanceRangeTooWideIsRefusedWithAnErrorNamingFileAndLine) {
   int result = -1;
-  testing::internal::CaptureStderr();
   std::vector<std::string> units = ReadConverterOutput(
       "MODULE top\n"
       "SUBMODULE and2 4\n"
       "INSTANCE u (4000000000:0)\n",
       result);
-  EXPECT_EQ(testing::internal::GetCapturedStderr(),
-            "Syntax error: instance range u(4000000000:0) too wide\n");
+  EXPECT_EQ(Errors(),
+            dir_.Path("design1.hrf") + ":3: Syntax error: instance range u(4000000000:0) too wide\n");
   EXPECT_THAT(units,
               ElementsAre("|ComponentInstantiation||top|top|and2|and2| line 4 instance parent |Module||top",
                           "|Module||top line 0 module flag"));
@@ -178,10 +164,11 @@ TEST_F(HierarchyRead, ConverterLinesThatFitNoRuleAreSyntaxErrorsAndTheNextLinesS
       "MODULE after 4\n"
       "ENDHIERARCHY\n",
       result);
-  std::string messages = testing::internal::GetCapturedStderr();
+  testing::internal::GetCapturedStderr();
   EXPECT_THAT(units, ElementsAre("|Module||after line 4 module flag", "|Module||top line 1 module flag"));
-  EXPECT_THAT(messages, testing::StartsWith("Syntax error: parse error\n"));
-  EXPECT_THAT(messages, testing::MatchesRegex("(Syntax error: parse error\n)+"));
+  const std::string path = dir_.Path("design1.hrf");
+  EXPECT_THAT(Errors(), testing::StartsWith(path + ":1: Syntax error: parse error\n"));
+  EXPECT_THAT(Errors(), testing::HasSubstr(path + ":3: Syntax error: parse error\n"));
   EXPECT_EQ(result, 0);
 }
 
@@ -231,10 +218,44 @@ TEST_F(HierarchyRead, ConverterCutsOverlongNamesAndSurvivesJunk) {
                      std::string(100000, 'x') + "\nMODULE last 5\n";
   testing::internal::CaptureStderr();
   units = ReadConverterOutput(junk, result);
-  std::string messages = testing::internal::GetCapturedStderr();
-  EXPECT_THAT(messages, testing::StartsWith("Syntax error: parse error\n"));
+  testing::internal::GetCapturedStderr();
+  EXPECT_THAT(Errors(), testing::StartsWith(dir_.Path("design2.hrf") + ":1: Syntax error: parse error\n"));
   EXPECT_THAT(units, testing::Contains("|Module||last line 5 module flag"));
   EXPECT_EQ(result, 0);
+}
+
+TEST_F(HierarchyRead, ConverterRangesOfOneFileShareABudgetOfLabels) {
+  int result = -1;
+  std::string text = "MODULE top\nSUBMODULE and2 4\n";
+  const std::uint64_t linesWithin =
+      Port::InputLimits::kMaxHierarchyLabels / Port::InputLimits::kMaxRangeLabels;
+  for (std::uint64_t line = 0; line < linesWithin + 3; ++line)
+    text += "INSTANCE v" + std::to_string(line) + " (0:65535)\n";
+  std::vector<std::string> units = ReadConverterOutput(text, result);
+  EXPECT_EQ(Errors(), dir_.Path("design1.hrf") + ":" + std::to_string(linesWithin + 3) +
+                          ": the instance ranges of this file make more than " +
+                          std::to_string(Port::InputLimits::kMaxHierarchyLabels) +
+                          " labels; further ranges are ignored\n");
+  EXPECT_EQ(result, 0);
+}
+
+// Reading this process's memory file from its start fails at once, as a damaged disk would.
+constexpr const char* kUnreadable = "/proc/self/mem";
+
+TEST_F(HierarchyRead, ConverterFileThatCannotBeReadToItsEndIsAnError) {
+  int result = -1;
+  ReadConverterPath(kUnreadable, result);
+  EXPECT_EQ(Errors(), std::string(kUnreadable) + ":1: the file could not be read to its end\n");
+}
+
+TEST_F(HierarchyRead, ProjectFileThatCannotBeOpenedOrReadIsAnError) {
+  testing::internal::CaptureStderr();
+  EXPECT_THAT(ReadProjectPath(dir_.Path("absent.hrf")), IsEmpty());
+  EXPECT_EQ(Errors(), "cannot open " + dir_.Path("absent.hrf") + ": No such file or directory\n");
+  messages_.clearRecords();
+  ReadProjectPath(kUnreadable);
+  EXPECT_EQ(Errors(), std::string(kUnreadable) + " could not be read to its end\n");
+  testing::internal::GetCapturedStderr();
 }
 
 }  // namespace

@@ -14,6 +14,8 @@
 #include "CHdlElement.h"
 #include "CParserConfigHolder.h"
 #include "PipelineFixtures.h"
+#include "Port/MsgCollector.h"
+#include "Port/MsgDispatcher.h"
 #include "ScopedTempDir.h"
 #include "qhParser.h"
 
@@ -21,7 +23,20 @@ namespace hrf_test {
 
 class HierarchyRead : public pipeline_test::PipelineTest {
  protected:
-  void SetUp() override { project_ = NewProject(); }
+  void SetUp() override {
+    project_ = NewProject();
+    Port_MsgDispatcher::addMsgMan(&messages_);
+  }
+  void TearDown() override { Port_MsgDispatcher::removeMsgMan(&messages_); }
+
+  // The texts of the errors issued, one after another.
+  std::string Errors() const {
+    std::string texts;
+    for (const Port_MsgRecord& record : messages_.records()) {
+      if (record.type == Port_MsgMan::kError) texts += record.text;
+    }
+    return texts;
+  }
 
   // Reads `text` as a hierarchy file of the project (plug-in "PLUGIN_Hrf").
   std::vector<std::string> ReadProjectFile(std::string_view text) { return ReadProjectPath(Write(text)); }
@@ -76,6 +91,7 @@ class HierarchyRead : public pipeline_test::PipelineTest {
   Prjrep::AutoPtr<Vad::IHdlProject> project_;
   Prjrep::AutoPtr<Vad::IHdlFile> file_;
   int fileCount_ = 0;
+  Port_MsgCollector messages_;
 };
 
 }  // namespace hrf_test

@@ -192,20 +192,31 @@ TEST_F(VerilogParse, BadInputGivesACapturedMessageAndKeepsWhatWasRecognised) {
   EXPECT_THAT(Describe(unreadable.Get()), IsEmpty());
 }
 
-TEST_F(VerilogParse, HostManagersHearNothingFromTheCompilerAndGetTheirStatesBack) {
+TEST_F(VerilogParse, HostManagersHearTheFilesOwnCompilerMessagesOnceWithFileAndLine) {
   HostManager listening(/*enabled=*/true), silent(/*enabled=*/false);
-  auto noisy = AddVerilog(Write("noisy.v", "module noisy; `no_such_macro endmodule\nstray words;\n"), 1);
+  const std::string path = Write("noisy.v", "module noisy; `no_such_macro endmodule\nstray words;\n");
+  auto noisy = AddVerilog(path, 1);
 
   EXPECT_THAT(ParseAlone(noisy.Get()), HasSubstr(CompilerText(Text::kUndefinedMacro, "no_such_macro")));
   EXPECT_THAT(Describe(noisy.Get()), ElementsAre("|Module||noisy line 1 module"));
-  EXPECT_THAT(listening.collector().records(), IsEmpty());
+  const std::vector<Port_MsgRecord>& heard = listening.collector().records();
+  ASSERT_FALSE(heard.empty());
+  EXPECT_EQ(heard[0].type, Port_MsgMan::kError);
+  EXPECT_EQ(heard[0].text, path + ":1: " + CompilerText(Text::kUndefinedMacro, "no_such_macro") + "\n");
+  for (const Port_MsgRecord& record : heard) {
+    EXPECT_EQ(record.category, "VerilogCompiler");
+    EXPECT_EQ(record.sourceFile, path);
+    EXPECT_GT(record.line, 0);
+  }
   EXPECT_THAT(silent.collector().records(), IsEmpty());
   ASSERT_TRUE(listening.IsRegistered() && silent.IsRegistered());
   EXPECT_TRUE(listening.collector().isEnabled());
   EXPECT_FALSE(silent.collector().isEnabled());
 
-  Port_MsgManData::createObject("VerilogParserTest", __FILE__, __LINE__, "")->issueWarning("heard again\n");
-  EXPECT_EQ(listening.collector().records().size(), 1u);
+  // Parsed again, the file's messages are heard again, once.
+  const std::size_t once = heard.size();
+  ParseAlone(noisy.Get());
+  EXPECT_EQ(listening.collector().records().size(), 2 * once);
 }
 
 }  // namespace

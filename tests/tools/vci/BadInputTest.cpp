@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "Port/InputLimits.h"
 #include "VciTestSupport.h"
 #include "vci/VerilogMessageText.h"
 #include "vci/VerilogModuleParser.h"
@@ -33,6 +34,26 @@ TEST(VerilogBadInput, FileIncludingItselfStopsAtTheDepthLimit) {
   EXPECT_EQ(modules.front().name, "a");
   EXPECT_EQ(modules.back().name, "b");
   EXPECT_EQ(modules.back().line, 3);
+}
+
+TEST(VerilogBadInput, IncludeFanOutStopsAtTheInclusionCountWithAMessage) {
+  MessageCapture messages;
+  Project project;
+  // Each header includes the next twice: 2^20 inclusions without a count.
+  constexpr int kLevels = 20;
+  for (int level = 0; level < kLevels; ++level) {
+    const std::string next = "h" + std::to_string(level + 1) + ".vh";
+    project.Write("h" + std::to_string(level) + ".vh",
+                  "`include \"" + next + "\"\n`include \"" + next + "\"\n");
+  }
+  project.Write("h" + std::to_string(kLevels) + ".vh", "");
+  const std::string path = project.Write("fan.v", "`include \"h0.vh\"\nmodule after; endmodule\n");
+  std::vector<Module> modules = project.Compile({path});
+  EXPECT_EQ(NamesOf(modules), (Strings{"after"}));
+  const std::string expected =
+      VerilogMessageLog::Format(Text::kTooManyIncludes, Port::InputLimits::kMaxIncludesPerFile);
+  EXPECT_EQ(messages.With(expected).size(), 1u) << messages.All();
+  EXPECT_EQ(messages.records().size(), 1u) << messages.All();
 }
 
 TEST(VerilogBadInput, MutuallyRecursiveMacrosStopWithAMessage) {

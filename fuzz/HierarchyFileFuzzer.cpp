@@ -1,0 +1,10 @@
+// Any input as a hierarchy file of a project: parsed, elaborated and ordered.
+#include <cstddef>
+#include <cstdint>
+
+#include "FuzzProject.h"
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+  fuzz::ParseAsSource(data, size, ".hrf", "PLUGIN_Hrf");
+  return 0;
+}
