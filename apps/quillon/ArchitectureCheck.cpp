@@ -24,19 +24,20 @@ bool AnalysedAfter(const Candidate& a, const Candidate& b) {
 
 // The candidates in the order they are analysed, so the one bound by default comes last; the
 // diagnostic stands at that one.
-Diagnostic Describe(const std::string& entity, const std::string& library, std::vector<Candidate> candidates) {
+Diagnostic Describe(const std::string& entity, const std::string& library,
+                    std::vector<Candidate> candidates) {
   std::stable_sort(candidates.begin(), candidates.end(),
                    [](const Candidate& a, const Candidate& b) { return AnalysedAfter(b, a); });
-  std::string text = "entity " + entity + " (library " + library + ") has " + std::to_string(candidates.size()) +
-                     " architectures:";
+  std::string text = "entity " + entity + " (library " + library + ") has " +
+                     std::to_string(candidates.size()) + " architectures:";
   for (const Candidate& candidate : candidates) {
     text += (&candidate == &candidates.front() ? " " : ", ") + candidate.name + " (" + candidate.path + ":" +
             std::to_string(candidate.line) + ")";
   }
   const Candidate& chosen = candidates.back();
   text += "; an instance that names none is bound to " + chosen.name + ", the one analysed last";
-  return {Diagnostic::Severity::kWarning, DiagnosticCode::kAmbiguousArchitecture, std::move(text), chosen.path,
-          chosen.line};
+  return {Diagnostic::Severity::kWarning, DiagnosticCode::kAmbiguousArchitecture, std::move(text),
+          chosen.path, chosen.line};
 }
 
 }  // namespace
@@ -64,7 +65,8 @@ std::vector<Diagnostic> ArchitectureCheck::Find(const std::vector<FileInfo>& fil
   }
   std::vector<Diagnostic> diagnostics;
   for (const auto& [key, entity] : entities) {
-    if (entity.candidates.size() > 1) diagnostics.push_back(Describe(entity.name, entity.library, entity.candidates));
+    if (entity.candidates.size() > 1)
+      diagnostics.push_back(Describe(entity.name, entity.library, entity.candidates));
   }
   return diagnostics;
 }

@@ -41,7 +41,8 @@ constexpr const char* kCutOrder =
     "breaks those dependencies";
 
 bool HasCode(const std::vector<Diagnostic>& diagnostics, std::string_view code) {
-  return std::any_of(diagnostics.begin(), diagnostics.end(), [&](const Diagnostic& d) { return d.code == code; });
+  return std::any_of(diagnostics.begin(), diagnostics.end(),
+                     [&](const Diagnostic& d) { return d.code == code; });
 }
 
 std::string ResultText(CitI::Result result) {

@@ -10,7 +10,8 @@ namespace {
 constexpr std::string_view kListingHeader = "Found circular dependency consisting of the following files:\n";
 constexpr std::string_view kListingFilePrefix = "          ";
 constexpr std::string_view kListingEnd = "\n";
-constexpr std::string_view kOrderCut = "Due to the above cyclic loop(s) a valid compile order could not be generated.\n";
+constexpr std::string_view kOrderCut =
+    "Due to the above cyclic loop(s) a valid compile order could not be generated.\n";
 
 }  // namespace
 

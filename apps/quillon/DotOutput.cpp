@@ -63,7 +63,8 @@ void DotOutput::Tree(const TreeInfo& tree, std::ostream& out) {
     Open& top = open.back();
     const TreeNodeInfo& node = tree.nodes[top.index];
     if (top.nextChild == node.children.size()) {
-      if (top.index != 0 && node.parent != 0) out << "  " << ids[node.parent] << " -> " << ids[top.index] << ";\n";
+      if (top.index != 0 && node.parent != 0)
+        out << "  " << ids[node.parent] << " -> " << ids[top.index] << ";\n";
       open.pop_back();
       continue;
     }

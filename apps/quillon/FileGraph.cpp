@@ -18,8 +18,8 @@ using VerilogFiles = std::vector<bool>;
 
 // The edges from each node's file to its children's files, walked from `start` without
 // recursing; a shared subtree once, and nothing below a node without a file.
-void CollectEdges(const TreeInfo& tree, std::size_t start, const FileIndex& files, const VerilogFiles& verilog,
-                  EdgeSet& edges, std::vector<bool>& walked) {
+void CollectEdges(const TreeInfo& tree, std::size_t start, const FileIndex& files,
+                  const VerilogFiles& verilog, EdgeSet& edges, std::vector<bool>& walked) {
   auto resolved = [&](std::size_t index) { return tree.nodes[index].sharedWith.value_or(index); };
   std::vector<std::size_t> pending{start};
   while (!pending.empty()) {

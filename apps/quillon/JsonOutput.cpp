@@ -73,7 +73,9 @@ Json FileObject(const FileInfo& file) {
 
 std::string Scalar(const Json& value) { return value.dump(-1, ' ', false, Json::error_handler_t::replace); }
 
-std::string Indent(std::size_t level) { return std::string(std::min(level, JsonOutput::kDeepestIndent) * 2, ' '); }
+std::string Indent(std::size_t level) {
+  return std::string(std::min(level, JsonOutput::kDeepestIndent) * 2, ' ');
+}
 
 // "/root/children/I/children/J..." of the node at `index`.
 std::string PointerTo(const TreeInfo& tree, std::size_t index) {

@@ -4,9 +4,7 @@ namespace Host {
 
 namespace {
 
-unsigned char Folded(char c) {
-  return static_cast<unsigned char>(c >= 'A' && c <= 'Z' ? c - 'A' + 'a' : c);
-}
+unsigned char Folded(char c) { return static_cast<unsigned char>(c >= 'A' && c <= 'Z' ? c - 'A' + 'a' : c); }
 
 }  // namespace
 

@@ -289,7 +289,8 @@ CitI::Result CElaborator::RegisterShortKey(CElabTables& tables, const Port::Stri
 void CElaborator::PutDefaultArchitecturesFirst(CElabTables& tables) {
   for (auto& [shortKey, unit] : tables.m_sArchitectureMultiMapList) {
     if (unit.elements.size() < 2) continue;
-    auto chosen = std::find(unit.elements.begin(), unit.elements.end(), ArchitectureChoice::Default(unit.elements));
+    auto chosen =
+        std::find(unit.elements.begin(), unit.elements.end(), ArchitectureChoice::Default(unit.elements));
     auto index = chosen - unit.elements.begin();
     std::rotate(unit.elements.begin(), chosen, chosen + 1);
     std::rotate(unit.keys.begin(), unit.keys.begin() + index, unit.keys.begin() + index + 1);
@@ -698,7 +699,9 @@ using NameSet = std::unordered_set<std::string_view>;
 // unit, or a unit that references itself); only these can reach themselves in the tree.
 NameSet UnitsOnCycles(const CElabTables& tables) {
   std::unordered_map<std::string_view, std::size_t> index;
-  auto vertexOf = [&index](std::string_view name) { return index.try_emplace(name, index.size()).first->second; };
+  auto vertexOf = [&index](std::string_view name) {
+    return index.try_emplace(name, index.size()).first->second;
+  };
   std::vector<std::pair<std::size_t, std::size_t>> edges;
   NameSet cycles;
   for (const auto& [name, targets] : tables.m_DependsTable) {
@@ -856,7 +859,8 @@ CitI::Result CElaborator::AddNextChild(HierarchyBuild& build, std::vector<BuildF
   IHdlElement* element = nullptr;
   FindElementByKey(build.tables, target, true, &element);
   // Such a subtree is the same under every parent: no ancestor's unit can occur in it.
-  bool shared = build.share && element && (!label || label->IsEmpty()) && !build.onCycle.contains(target.view());
+  bool shared =
+      build.share && element && (!label || label->IsEmpty()) && !build.onCycle.contains(target.view());
   if (shared) {
     auto built = build.shared.find(target.view());
     if (built != build.shared.end()) return CNetListNode::FromInterface(parent)->AddChild(built->second);
@@ -1016,7 +1020,8 @@ CitI::Result CElaborator::DumpTree(IHdlNetListNode* node, int depth) const {
     if (tree->HasSeveralParents() && !dumped.insert(tree).second) continue;
     const std::vector<IHdlNetListNode*>& children = tree->Children();
     for (auto child = children.rbegin(); child != children.rend(); ++child) {
-      if (CNetListNode* childNode = CNetListNode::FromInterface(*child)) pending.emplace_back(childNode, level + 1);
+      if (CNetListNode* childNode = CNetListNode::FromInterface(*child))
+        pending.emplace_back(childNode, level + 1);
     }
   }
   return CitI::kOk;

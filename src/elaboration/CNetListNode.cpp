@@ -127,7 +127,8 @@ CNetListNode::~CNetListNode() {
   for (std::size_t i = 0; i < children.size(); ++i) {
     CNetListNode* node = FromInterface(children[i]);
     if (!node) continue;
-    if (!slotsKnown || !node->parents_.ForgetAt(parentSlots_[i], &nodeFace_)) node->parents_.Forget(&nodeFace_);
+    if (!slotsKnown || !node->parents_.ForgetAt(parentSlots_[i], &nodeFace_))
+      node->parents_.Forget(&nodeFace_);
   }
   ReleaseWithoutRecursion(children_.Detach());
 }
@@ -229,7 +230,8 @@ void CNetListNode::ComputePaths(const Port::StringBase& parentPath) {
 
 Port::StringBase CNetListNode::Path() const {
   std::vector<const Port::StringBase*> pieces;
-  for (const PathPiece* piece = path_.get(); piece; piece = piece->prefix.get()) pieces.push_back(&piece->text);
+  for (const PathPiece* piece = path_.get(); piece; piece = piece->prefix.get())
+    pieces.push_back(&piece->text);
   Port::StringBase path;
   for (auto piece = pieces.rbegin(); piece != pieces.rend(); ++piece) path.Append((*piece)->view());
   return path;

@@ -168,7 +168,8 @@ void CCompileOrder::NoteArchitecture(IHdlElement* element) {
   library.Append(':');
   library.Append(architecture->GetEntityName().view());
   std::vector<IHdlElement*>& candidates = architectures_[library];
-  if (std::find(candidates.begin(), candidates.end(), element) == candidates.end()) candidates.push_back(element);
+  if (std::find(candidates.begin(), candidates.end(), element) == candidates.end())
+    candidates.push_back(element);
 }
 
 void CCompileOrder::OrderArchitectureFiles() {

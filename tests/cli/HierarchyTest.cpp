@@ -199,9 +199,7 @@ TEST(Hierarchy, DeepChainsPrintAndOrderWithoutRecursion) {
   }
   ScopedTextFile verilog(modules, "chain.v");
   std::string vhdl = verilog.Beside("chain.vhd");
-  {
-    std::ofstream(vhdl) << packages;
-  }
+  { std::ofstream(vhdl) << packages; }
 
   CliResult tree = RunQuillon({"tree", verilog.path(), vhdl});
   ASSERT_EQ(tree.status, 0) << tree.err;
@@ -209,7 +207,8 @@ TEST(Hierarchy, DeepChainsPrintAndOrderWithoutRecursion) {
   ASSERT_EQ(lines.size(), 2u * kChainDepth);
   std::string indent(2 * 100, ' ');
   EXPECT_EQ(lines[kChainDepth - 1], indent + "(level " + std::to_string(kChainDepth - 1) + ") u: m" +
-                                        std::to_string(kChainDepth - 1) + " [work:Module]  " + verilog.path());
+                                        std::to_string(kChainDepth - 1) + " [work:Module]  " +
+                                        verilog.path());
 
   CliResult order = RunQuillon({"order", verilog.path(), vhdl});
   ASSERT_EQ(order.status, 0) << order.err;
@@ -221,7 +220,8 @@ TEST(Hierarchy, DeepChainsPrintAndOrderWithoutRecursion) {
   Json answer = Json::parse(json.out, nullptr, false);
   ASSERT_FALSE(answer.is_discarded());
   int depth = 0;
-  for (const Json* node = &answer["root"]; !(*node)["children"].empty(); node = &(*node)["children"][0]) ++depth;
+  for (const Json* node = &answer["root"]; !(*node)["children"].empty(); node = &(*node)["children"][0])
+    ++depth;
   EXPECT_EQ(depth, kChainDepth);
 
   CliResult dot = RunQuillon({"--format", "dot", "tree", verilog.path()});

@@ -79,8 +79,8 @@ TEST(VhdlNames, UseClausesAndPrimaryUnitsIgnoreLetterCase) {
        "library VLIB;\nuse VLIB.ScoreboardPkg_slv.all;\nuse work.my_pkg.all;\n"
        "entity user is\nend entity;\narchitecture rtl of OTHER is\nbegin\nend architecture;\n"},
   };
-  const std::vector<std::string> sources{src("user.vhd"), src("other.vhd"), src("pkg.vhd"), "-l", "vlib",
-                                         src("vlib_pkg.vhd")};
+  const std::vector<std::string> sources{src("user.vhd"), src("other.vhd"),   src("pkg.vhd"), "-l",
+                                         "vlib",          src("vlib_pkg.vhd")};
   std::vector<std::string> bindings = BindingsOf(TreeOf(sources));
   // The keys keep the spelling of the declarations; nothing is left outside the project.
   EXPECT_TRUE(Has(bindings, "work:PackageDecl|My_Pkg -> pkg.vhd")) << testing::PrintToString(bindings);
@@ -166,7 +166,8 @@ TEST(VerilogOrder, ModuleMissingFromTheProjectIsLabelledAModule) {
   Sources src{{"top.v", "module top;\n  lost u_lost();\nendmodule\n"}};
   CliResult tree = RunQuillon({"tree", src("top.v")});
   EXPECT_EQ(tree.status, 0) << tree.err;
-  EXPECT_NE(tree.out.find("  u_lost: lost [work:Module] (not in the project)\n"), std::string::npos) << tree.out;
+  EXPECT_NE(tree.out.find("  u_lost: lost [work:Module] (not in the project)\n"), std::string::npos)
+      << tree.out;
 }
 
 // Entity leaf with architectures alpha (z_alpha.vhd) and zeta (a_zeta.vhd); top binds leaf once
@@ -184,9 +185,9 @@ const std::pair<const char*, const char*> kLeafSources[] = {
 std::string BoundTo(const Json& tree, const std::string& label) {
   for (const Json& top : tree["root"]["children"]) {
     for (const Json& child : top["children"]) {
-      if (child["instance"] == label) return child["name"].get<std::string>() + " -> " +
-                                             child["file"].get<std::string>().substr(
-                                                 child["file"].get<std::string>().rfind('/') + 1);
+      if (child["instance"] == label)
+        return child["name"].get<std::string>() + " -> " +
+               child["file"].get<std::string>().substr(child["file"].get<std::string>().rfind('/') + 1);
     }
   }
   return "none";
@@ -202,9 +203,13 @@ TEST(DefaultArchitecture, TheOneAnalysedLastIsBoundAndOrderedLast) {
   };
   const Case cases[] = {
       {{src("leaf.vhd"), src("z_alpha.vhd"), src("a_zeta.vhd"), src("top.vhd")},
-       "work:Architecture|leaf|zeta -> a_zeta.vhd", src("z_alpha.vhd"), src("a_zeta.vhd")},
+       "work:Architecture|leaf|zeta -> a_zeta.vhd",
+       src("z_alpha.vhd"),
+       src("a_zeta.vhd")},
       {{src("top.vhd"), src("a_zeta.vhd"), src("z_alpha.vhd"), src("leaf.vhd")},
-       "work:Architecture|leaf|alpha -> z_alpha.vhd", src("a_zeta.vhd"), src("z_alpha.vhd")},
+       "work:Architecture|leaf|alpha -> z_alpha.vhd",
+       src("a_zeta.vhd"),
+       src("z_alpha.vhd")},
   };
   for (const Case& each : cases) {
     Json tree = TreeOf(each.given);
@@ -215,7 +220,9 @@ TEST(DefaultArchitecture, TheOneAnalysedLastIsBoundAndOrderedLast) {
     CliResult order = RunQuillon(With({"order"}, each.given));
     EXPECT_EQ(order.status, 0) << order.err;
     std::vector<std::string> files = Lines(order.out);
-    auto at = [&](const std::string& path) { return std::find(files.begin(), files.end(), path) - files.begin(); };
+    auto at = [&](const std::string& path) {
+      return std::find(files.begin(), files.end(), path) - files.begin();
+    };
     EXPECT_LT(at(each.before), at(each.after)) << order.out;
     EXPECT_LT(at(each.after), at(src("top.vhd"))) << order.out;
     EXPECT_EQ(order.err, "");
@@ -223,7 +230,8 @@ TEST(DefaultArchitecture, TheOneAnalysedLastIsBoundAndOrderedLast) {
 
   CliResult check = RunQuillon(With({"check"}, cases[0].given));
   EXPECT_EQ(check.status, 0) << check.err;
-  EXPECT_EQ(check.err, src("a_zeta.vhd") + ":1: warning: entity leaf (library work) has 2 architectures: alpha (" +
+  EXPECT_EQ(check.err, src("a_zeta.vhd") +
+                           ":1: warning: entity leaf (library work) has 2 architectures: alpha (" +
                            src("z_alpha.vhd") + ":1), zeta (" + src("a_zeta.vhd") +
                            ":1); an instance that names none is bound to zeta, the one analysed last "
                            "[ambiguous-architecture]\n");
@@ -271,15 +279,18 @@ TEST(InvalidOrder, CutOrderIsPrintedButFailsAndCheckListsEachCycleOnce) {
 
   CliResult check = RunQuillon(With({"check"}, sources));
   EXPECT_EQ(check.status, 1);
-  EXPECT_EQ(Count(check.err, "Found circular dependency consisting of the following files:"), 1u) << check.err;
+  EXPECT_EQ(Count(check.err, "Found circular dependency consisting of the following files:"), 1u)
+      << check.err;
   EXPECT_EQ(Count(check.err, "WARNING:           " + tangled + "x.vhd"), 1u) << check.err;
 
   // A cycle that the relaxed rule resolves leaves a valid order.
   Sources src{
-      {"f1.vhd", "entity a is\nend entity;\narchitecture rtl of a is\nbegin\n"
-                 "  u : entity work.b port map (x => open);\nend architecture;\n"},
+      {"f1.vhd",
+       "entity a is\nend entity;\narchitecture rtl of a is\nbegin\n"
+       "  u : entity work.b port map (x => open);\nend architecture;\n"},
       {"f2.vhd", "entity b is\nend entity;\n"},
-      {"f3.vhd", "architecture rtl of b is\nbegin\n  u : entity work.a port map (x => open);\nend architecture;\n"},
+      {"f3.vhd",
+       "architecture rtl of b is\nbegin\n  u : entity work.a port map (x => open);\nend architecture;\n"},
   };
   CliResult valid = RunQuillon({"order", src("f1.vhd"), src("f2.vhd"), src("f3.vhd")});
   EXPECT_EQ(valid.status, 0) << valid.err;

@@ -36,7 +36,8 @@ struct Outcome {
 
 std::vector<std::string> MessageTexts(const MessageLog& log) {
   std::vector<std::string> texts;
-  for (const Port_MsgRecord& record : log.Records()) texts.push_back(std::to_string(record.type) + record.text);
+  for (const Port_MsgRecord& record : log.Records())
+    texts.push_back(std::to_string(record.type) + record.text);
   return texts;
 }
 
@@ -68,7 +69,8 @@ class SharedSubtrees : public ElabTest {
 
   // Every node below the root in pre-order, one line each: depth, name, label, path, type, file
   // and the library-cell flag, as a host walking GetChildren sees them.
-  static std::vector<std::string> Walk(Vad::IHdlNetListNode* root, std::set<Vad::IHdlNetListNode*>& distinct) {
+  static std::vector<std::string> Walk(Vad::IHdlNetListNode* root,
+                                       std::set<Vad::IHdlNetListNode*>& distinct) {
     std::vector<std::string> lines;
     std::vector<std::pair<Vad::IHdlNetListNode*, int>> pending{{root, 0}};
     while (!pending.empty()) {
@@ -82,10 +84,11 @@ class SharedSubtrees : public ElabTest {
       auto* tcl = Prjrep::QueryAs<UtilI::ITclCollectable>(node);
       tcl->GetName(&path);
       tcl->GetType(&type);
-      lines.push_back(std::to_string(depth) + " " + NameOf(node) + " [" + label.str() + "] {" + path.str() + "} " +
-                      type.str() + " @" + FileNameOf(node) + (node->IsLibraryCell() ? " cell" : ""));
+      lines.push_back(std::to_string(depth) + " " + NameOf(node) + " [" + label.str() + "] {" + path.str() +
+                      "} " + type.str() + " @" + FileNameOf(node) + (node->IsLibraryCell() ? " cell" : ""));
       std::vector<Vad::IHdlNetListNode*> children = ChildrenOf(node);
-      for (auto child = children.rbegin(); child != children.rend(); ++child) pending.emplace_back(*child, depth + 1);
+      for (auto child = children.rbegin(); child != children.rend(); ++child)
+        pending.emplace_back(*child, depth + 1);
     }
     return lines;
   }
@@ -121,8 +124,8 @@ class SharedSubtrees : public ElabTest {
     outcome.distinctNodes = distinct.size();
     MessageLog log;
     Prjrep::AutoRelease<Vad::IHdlFileIterator> files;
-    EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), References(), root.Get(), nullptr, nullptr, false,
-                                             files.Out()),
+    EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), References(), root.Get(), nullptr, nullptr,
+                                             false, files.Out()),
               CitI::kOk);
     outcome.order = FileNames(files.Get());
     outcome.orderMessages = MessageTexts(log);
@@ -201,7 +204,8 @@ TEST_F(SharedSubtrees, SharedAndExpandedBuildsLookTheSameOnRandomProjects) {
     SCOPED_TRACE("seed " + std::to_string(seed));
     project_ = NewProject();
     ScopedTempDir dir;
-    for (const std::string& path : RandomProject(seed, seed % 2 == 0).Write(dir)) AddFile(project_.Get(), path);
+    for (const std::string& path : RandomProject(seed, seed % 2 == 0).Write(dir))
+      AddFile(project_.Get(), path);
     Outcome expanded = Run(false);
     Outcome shared = Run(true);
     ASSERT_FALSE(expanded.tree.empty());
@@ -242,7 +246,8 @@ class DeepHierarchy : public SharedSubtrees {
   Prjrep::AutoPtr<Vad::IHdlNetListNode> Elaborate(Vad::CElaborator& elaborator) {
     std::vector<CitI::IInterface*> designUnits;
     for (const auto& unit : units_) {
-      if (RecordOf<Vad::DbObject>(unit.Get())->GetType() != Vad::DbType::kUse) designUnits.push_back(unit.Get());
+      if (RecordOf<Vad::DbObject>(unit.Get())->GetType() != Vad::DbType::kUse)
+        designUnits.push_back(unit.Get());
     }
     auto iterator = IterateUnits(designUnits);
     Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
@@ -278,8 +283,8 @@ TEST_F(DeepHierarchy, InstanceChainAndPackageChainElaborateOrderAndFree) {
     std::string suffix = std::to_string(i / kUnitsPerFile);
     Vad::IHdlFile* verilog = i % kUnitsPerFile == 0 ? File("/chain/m" + suffix + ".v", "PLUGIN_Verilog")
                                                     : files_[files_.size() - 2].Get();
-    Vad::IHdlFile* vhdl = i % kUnitsPerFile == 0 ? File("/chain/p" + suffix + ".vhd", "PLUGIN_Vhdl")
-                                                 : files_.back().Get();
+    Vad::IHdlFile* vhdl =
+        i % kUnitsPerFile == 0 ? File("/chain/p" + suffix + ".vhd", "PLUGIN_Vhdl") : files_.back().Get();
     CitI::IInterface* module = Keep(MakeUnit<Vad::module>(verilog, "m" + std::to_string(i), nullptr));
     if (i + 1 < kChainDepth) {
       Prjrep::AutoRelease<CitI::IInterface> instance(
@@ -303,7 +308,8 @@ TEST_F(DeepHierarchy, InstanceChainAndPackageChainElaborateOrderAndFree) {
   EXPECT_EQ(DepthAlongFirstChildren(tops[1], lastPath), static_cast<std::size_t>(kChainDepth));
 
   Prjrep::AutoRelease<Vad::IHdlFileIterator> files;
-  ASSERT_EQ(Vad::CCompileOrder::OrderBelow(elaborator, References(), root.Get(), nullptr, nullptr, false, files.Out()),
+  ASSERT_EQ(Vad::CCompileOrder::OrderBelow(elaborator, References(), root.Get(), nullptr, nullptr, false,
+                                           files.Out()),
             CitI::kOk);
   std::vector<std::string> order = FileNames(files.Get());
   std::vector<std::string> expected;
@@ -333,7 +339,8 @@ TEST_F(DeepHierarchy, PackageUsedByManyUnitsIsOneNodeWithEveryParent) {
   ASSERT_EQ(tops.size(), static_cast<std::size_t>(kUsers));
   Vad::IHdlNetListNode* shared = ChildrenOf(tops[0]).front();
   EXPECT_EQ(NameOf(shared), "work:PackageDecl|common");
-  for (Vad::IHdlNetListNode* top : tops) EXPECT_EQ(ChildrenOf(top), std::vector<Vad::IHdlNetListNode*>{shared});
+  for (Vad::IHdlNetListNode* top : tops)
+    EXPECT_EQ(ChildrenOf(top), std::vector<Vad::IHdlNetListNode*>{shared});
   Prjrep::AutoRelease<Vad::IHdlNetListNodeIterator> parent;
   ASSERT_EQ(shared->GetParents(parent.Out()), CitI::kOk);
   std::vector<Vad::IHdlNetListNode*> parents;

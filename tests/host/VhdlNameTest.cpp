@@ -1,9 +1,9 @@
-#include "Host/VhdlName.h"
-
 #include <gtest/gtest.h>
 
 #include <map>
 #include <string>
+
+#include "Host/VhdlName.h"
 
 namespace {
 
