@@ -353,7 +353,6 @@ std::vector<Diagnostic> CommandRunner::Diagnose(ProjectReader& reader, Vad::IHdl
 }
 
 void CommandRunner::ShowDiagnostics(const std::vector<Diagnostic>& diagnostics) const {
-  log_->FlushListing();
   if (!options_.quiet) DiagnosticReport::Write(diagnostics, std::cerr);
 }
 

@@ -1,7 +1,10 @@
 #include "MessageLog.h"
 
+#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
+#include <cwchar>
+#include <cwctype>
 #include <string>
 
 #include "Port/MsgDispatcher.h"
@@ -52,7 +55,6 @@ MessageLog::MessageLog(bool quiet, bool verbose) : Port_MsgManDefault("quillon")
 }
 
 MessageLog::~MessageLog() {
-  FlushListing();
   if (sinkInstalled_) Port_MsgManData::setDebugSink(previousSink_);
   Port_MsgDispatcher::removeMsgMan(this);
   if (defaultWasRegistered_) Port_MsgDispatcher::addMsgMan(Port_MsgDispatcher::getDefaultMsgMan());
@@ -83,23 +85,16 @@ void MessageLog::onMessage(const Port_MsgRecord& record) {
       {SeverityOf(record.type), WithoutTrailingLineEnds(record.text), record.sourceFile, record.line});
 }
 
+// Repeated cycle listings never get here (CycleListings drops them); blank messages are not printed.
 void MessageLog::writeMsgLines(MsgType type, const wchar_t* const* lines, int count) {
   if (quiet_ || !lines || count < 1) return;
-  ListingFilter::Message message{type, {}};
-  for (int i = 0; i < count; ++i) message.lines.emplace_back(lines[i] ? lines[i] : L"");
-  Write(listings_.Take(std::move(message)));
-}
-
-void MessageLog::FlushListing() { Write(listings_.Flush()); }
-
-void MessageLog::Write(const std::vector<ListingFilter::Message>& messages) {
-  if (messages.empty()) return;
+  bool blank = std::all_of(lines, lines + count, [](const wchar_t* line) {
+    return !line ||
+           std::all_of(line, line + std::wcslen(line), [](wchar_t c) { return std::iswspace(c) != 0; });
+  });
+  if (blank) return;
   if (progress_) progress_->Clear();
-  for (const ListingFilter::Message& message : messages) {
-    std::vector<const wchar_t*> lines;
-    for (const std::wstring& line : message.lines) lines.push_back(line.c_str());
-    Port_MsgManDefault::writeMsgLines(message.type, lines.data(), static_cast<int>(lines.size()));
-  }
+  Port_MsgManDefault::writeMsgLines(type, lines, count);
 }
 
 void MessageLog::writeMsgEnd(MsgType type) {

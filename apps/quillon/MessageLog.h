@@ -8,7 +8,6 @@
 
 #include "CycleListings.h"
 #include "DesignModel.h"
-#include "ListingFilter.h"
 #include "Port/MsgManData.h"
 #include "Port/MsgManDefault.h"
 #include "Progress.h"
@@ -25,9 +24,6 @@ class MessageLog : public Port_MsgManDefault {
   // An error message of quillon itself, through the message system like any other.
   void ReportError(std::string_view text);
   void ReportWarning(std::string_view text);
-
-  // Writes a listing still held back (see ListingFilter); the destructor does too.
-  void FlushListing();
 
   // A progress line to take off the terminal before a message is written; null for none.
   void SetProgress(Progress* progress) { progress_ = progress; }
@@ -47,14 +43,11 @@ class MessageLog : public Port_MsgManDefault {
   void writeMsgEnd(MsgType type) override;
 
  private:
-  void Write(const std::vector<ListingFilter::Message>& messages);
-
   bool quiet_;
   Progress* progress_ = nullptr;
   bool defaultWasRegistered_ = false;
   bool sinkInstalled_ = false;
   Port_MsgManData::DebugSink previousSink_;
-  ListingFilter listings_;
   std::vector<MessageInfo> messages_;
   CycleListings cycles_;
 };
