@@ -4,6 +4,8 @@
 
 #include <cstdio>
 #include <cstdlib>
+#include <filesystem>
+#include <system_error>
 
 #include "CHdlFile.h"
 #include "HdlSets.h"
@@ -27,11 +29,24 @@ namespace {
 // the dispatcher rather than disabled, since a parse's message capture enables it again.
 void SilenceMessages() { Port_MsgDispatcher::removeMsgMan(Port_MsgDispatcher::getDefaultMsgMan()); }
 
+std::string& MadeDirectory() {
+  static std::string directory;
+  return directory;
+}
+
+// libFuzzer ends a time-boxed run through exit(), so the directory goes with the process.
+void RemoveMadeDirectory() {
+  std::error_code ignored;
+  std::filesystem::remove_all(MadeDirectory(), ignored);
+}
+
 std::string InputDirectory() {
   static const std::string directory = [] {
     char pattern[] = "/tmp/quillon-fuzz-XXXXXX";
     const char* made = ::mkdtemp(pattern);
     if (!made) std::abort();
+    MadeDirectory() = made;
+    std::atexit(RemoveMadeDirectory);
     return std::string(made);
   }();
   return directory;
