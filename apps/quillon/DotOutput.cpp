@@ -35,7 +35,9 @@ struct DotNode {
 };
 
 void WriteHeader(std::string_view name, std::ostream& out) {
-  out << "digraph " << name << " {\n  rankdir=LR;\n  node [shape=box, fontsize=10];\n";
+  // Left to right with ranks shared across the clusters and little room between the nodes of a
+  // rank: a wide hierarchy stays a page, not a strip.
+  out << "digraph " << name << " {\n  rankdir=LR;\n  newrank=true;\n  nodesep=0.15;\n  node [shape=box, fontsize=10];\n";
 }
 
 // The nodes of each library in a cluster of their own, libraries in the order they first appear.
