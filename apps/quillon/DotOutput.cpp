@@ -37,7 +37,8 @@ struct DotNode {
 void WriteHeader(std::string_view name, std::ostream& out) {
   // Left to right with ranks shared across the clusters and little room between the nodes of a
   // rank: a wide hierarchy stays a page, not a strip.
-  out << "digraph " << name << " {\n  rankdir=LR;\n  newrank=true;\n  nodesep=0.15;\n  node [shape=box, fontsize=10];\n";
+  out << "digraph " << name
+      << " {\n  rankdir=LR;\n  newrank=true;\n  nodesep=0.15;\n  node [shape=box, fontsize=10];\n";
 }
 
 // The nodes of each library in a cluster of their own, libraries in the order they first appear.
@@ -54,7 +55,8 @@ void WriteNodes(const std::vector<DotNode>& nodes, std::ostream& out) {
     if (!library.empty()) {
       out << "  subgraph " << Quoted("cluster_" + library) << " {\n    label=" << Quoted(library) << ";\n";
     }
-    for (const DotNode* node : members[library]) out << indent << node->id << " [" << node->attributes << "];\n";
+    for (const DotNode* node : members[library])
+      out << indent << node->id << " [" << node->attributes << "];\n";
     if (!library.empty()) out << "  }\n";
   }
 }
@@ -69,7 +71,8 @@ std::string UnitLabel(const TreeNodeInfo& node) {
 }
 
 std::string UnitAttributes(const TreeNodeInfo& node) {
-  std::string attributes = "label=" + Quoted(UnitLabel(node)) + ", tooltip=" + Quoted(node.file.value_or(node.name));
+  std::string attributes =
+      "label=" + Quoted(UnitLabel(node)) + ", tooltip=" + Quoted(node.file.value_or(node.name));
   if (node.type != "instance") attributes += ", shape=ellipse";
   if (node.libraryCell) attributes += ", style=dashed";
   if (!node.libraryCell && !node.elementType) attributes += ", style=dotted";
@@ -83,7 +86,10 @@ class UnitNodes {
   std::size_t Of(const TreeNodeInfo& node) {
     std::string identity = node.file.value_or("") + '\n' + std::string(TreeView::UnitKeyOf(node));
     auto [entry, added] = numbers_.try_emplace(std::move(identity), nodes_.size());
-    if (added) nodes_.push_back({"n" + std::to_string(entry->second), node.library.value_or(""), UnitAttributes(node)});
+    if (added) {
+      std::string id = "n" + std::to_string(entry->second);
+      nodes_.push_back({std::move(id), node.library.value_or(""), UnitAttributes(node)});
+    }
     return entry->second;
   }
   const std::vector<DotNode>& nodes() const { return nodes_; }
@@ -120,7 +126,8 @@ void DotOutput::Order(const FileGraphInfo& graph, std::ostream& out) {
   for (std::size_t i = 0; i < graph.files.size(); ++i) {
     const OrderEntry& file = graph.files[i];
     std::string label = std::to_string(i + 1) + ". " + std::string(BaseNameOf(file.path));
-    files.push_back({"f" + std::to_string(i), file.library, "label=" + Quoted(label) + ", tooltip=" + Quoted(file.path)});
+    files.push_back(
+        {"f" + std::to_string(i), file.library, "label=" + Quoted(label) + ", tooltip=" + Quoted(file.path)});
   }
   WriteHeader("compile_order", out);
   WriteNodes(files, out);

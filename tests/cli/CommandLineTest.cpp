@@ -27,8 +27,8 @@ void ExpectOneLineNaming(const CliResult& result, const std::string& named) {
 TEST(CommandLine, HelpListsEveryCommandAndExitsZero) {
   CliResult result = RunQuillon({"--help"});
   EXPECT_EQ(result.status, 0);
-  for (const char* command : {"units", "tree", "order", "ports UNIT", "check", "--top", "--depth", "--instances",
-                              "--with-library"}) {
+  for (const char* command : {"units", "tree", "order", "ports UNIT", "check", "--top", "--depth",
+                              "--instances", "--with-library"}) {
     EXPECT_NE(result.out.find(command), std::string::npos) << command;
   }
 }

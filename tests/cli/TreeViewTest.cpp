@@ -54,7 +54,8 @@ TEST(TreeView, TopShowsTheSubtreeOfOneUnitAndAnEntityStandsForItsArchitecture) {
             (std::vector<std::string>{"u_lane: lane(rtl) [work:Architecture]  lane.vhd",
                                       "  lane [work:Entity]  lane.vhd"}));
 
-  CliResult json = RunQuillon({"-q", "--format", "json", "tree", "--top", "lane", "-P", DataPath("mixed/project.json")});
+  CliResult json =
+      RunQuillon({"-q", "--format", "json", "tree", "--top", "lane", "-P", DataPath("mixed/project.json")});
   ASSERT_EQ(json.status, 0) << json.err;
   Json answer = Json::parse(json.out, nullptr, false);
   ASSERT_EQ(answer["root"]["children"].size(), 1u) << json.out;
@@ -101,7 +102,8 @@ TEST(TreeView, DepthCountsWhatItLeavesOutAndInstancesLeaveOutEntitiesAndPackages
   EXPECT_EQ(TreeLines({"--instances", "--depth", "0", "--top", "top"}),
             (std::vector<std::string>{"top(rtl) [Architecture]  top.vhd", "  ... (2 more below)"}));
 
-  CliResult json = RunQuillon({"-q", "--format", "json", "tree", "--depth", "1", "-P", DataPath("mixed/project.json")});
+  CliResult json =
+      RunQuillon({"-q", "--format", "json", "tree", "--depth", "1", "-P", DataPath("mixed/project.json")});
   ASSERT_EQ(json.status, 0) << json.err;
   Json answer = Json::parse(json.out, nullptr, false);
   const Json& core = answer["root"]["children"][0]["children"][0];
