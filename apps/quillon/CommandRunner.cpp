@@ -253,7 +253,7 @@ int CommandRunner::Tree(ProjectReader& reader, Vad::IHdlProject* project, std::o
       built = false;
     }
   }
-  if (built) tree = TreeView::Select(tree, view);
+  if (built && !view.ShowsAll()) tree = TreeView::Select(tree, view);
   // The order is not asked for: its cycle messages belong to the order command.
   std::vector<Diagnostic> diagnostics = DiagnosticReport::AsWarnings(Diagnose(reader, project, nullptr));
   ShowDiagnostics(diagnostics);

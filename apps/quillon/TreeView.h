@@ -19,6 +19,8 @@ class TreeView {
     std::optional<std::size_t> depth;
     // Leaves out every node that is no instance (entities, packages); their children move up.
     bool instancesOnly = false;
+
+    bool ShowsAll() const { return !top && !depth && !instancesOnly; }
   };
 
   // The design-unit key of the node's unit, as "Architecture|cpu|rtl".
