@@ -13,8 +13,10 @@
 #include "DiagnosticReport.h"
 #include "DotOutput.h"
 #include "ExitStatus.h"
+#include "FileFacts.h"
 #include "FileGraph.h"
 #include "Host/HostComponents.h"
+#include "IHdlElement.h"
 #include "IName.h"
 #include "JsonOutput.h"
 #include "ModuleLoader.h"
@@ -25,6 +27,7 @@
 #include "RavA/Factory.h"
 #include "TextOutput.h"
 #include "TreeReader.h"
+#include "TreeView.h"
 #include "UnitFinder.h"
 
 namespace quillon {
@@ -59,6 +62,14 @@ std::string KeyOf(Vad::IHdlDesignUnit* unit) {
   Port::StringBase key;
   if (auto* name = Prjrep::QueryAs<Prjrep::IName>(unit)) name->GetName(&key);
   return key.str();
+}
+
+// The path of the unit's file; empty when it cannot say.
+std::string FileOf(Vad::IHdlDesignUnit* unit) {
+  Prjrep::AutoRelease<Vad::IHdlFile> file;
+  auto* element = Prjrep::QueryAs<Vad::IHdlElement>(unit);
+  if (!element || element->GetFile(file.Out()) != CitI::kOk || !file) return {};
+  return FileFacts::PathOf(file.Get());
 }
 
 // Every file the run reads: the sources and the project files and lists that named them.
@@ -223,11 +234,26 @@ int CommandRunner::Units(ProjectReader& reader, std::ostream& out) {
 }
 
 int CommandRunner::Tree(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out) {
+  TreeView::Settings view{std::nullopt, options_.depth, options_.instancesOnly};
+  Vad::IHdlDesignUnit* top = nullptr;
+  if (!options_.top.empty()) {
+    top = UnitFinder(reader.designUnits()).Find(options_.top);
+    if (!top) return BadInput("unknown design unit '" + options_.top + "'");
+  }
   TreeInfo tree;
   bool json = options_.format == Format::kJson;
   CitI::Result result = TreeReader::Read(project, tree, json);
   int status = result == CitI::kOk ? Finished() : Failed("the design hierarchy is not available", result);
   bool built = result == CitI::kOk;
+  if (built && top) {
+    view.top = TreeView::FindUnit(tree, KeyOf(top), FileOf(top));
+    if (!view.top) {
+      log_->ReportError("'" + options_.top + "' has no place in the design hierarchy");
+      status = kExitFailed;
+      built = false;
+    }
+  }
+  if (built && !view.ShowsAll()) tree = TreeView::Select(tree, view);
   // The order is not asked for: its cycle messages belong to the order command.
   std::vector<Diagnostic> diagnostics = DiagnosticReport::AsWarnings(Diagnose(reader, project, nullptr));
   ShowDiagnostics(diagnostics);
@@ -236,7 +262,7 @@ int CommandRunner::Tree(ProjectReader& reader, Vad::IHdlProject* project, std::o
   } else if (built && options_.format == Format::kDot) {
     DotOutput::Tree(tree, out);
   } else if (built) {
-    TextOutput::Tree(tree, out);
+    TextOutput::Tree(tree, options_.verbose, out);
   }
   return status;
 }

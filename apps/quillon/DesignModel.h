@@ -6,9 +6,16 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace quillon {
+
+// The file name after the last '/' of `path`.
+inline std::string_view BaseNameOf(std::string_view path) {
+  std::size_t slash = path.rfind('/');
+  return slash == std::string_view::npos ? path : path.substr(slash + 1);
+}
 
 // A message of the host message system, as the JSON output lists it.
 struct MessageInfo {
@@ -57,6 +64,7 @@ struct TreeNodeInfo {
   std::string partition;
   std::optional<std::string> elementType;
   std::optional<std::string> file;
+  std::optional<std::string> library;  // the library of the element's file
   // Indices of the children in TreeInfo::nodes, in child order.
   std::vector<std::size_t> children;
   // Set on a later occurrence of a shared subtree: the index of its first occurrence. Such an
@@ -65,6 +73,8 @@ struct TreeNodeInfo {
   // The parent's index and this node's place among its children; zero for the root.
   std::size_t parent = 0;
   std::size_t position = 0;
+  // How many nodes a depth limit left out below this one.
+  std::size_t moreBelow = 0;
 };
 
 // A hierarchy as a flat list in pre-order, the root first. A subtree that several parents share
@@ -100,7 +110,7 @@ struct FileEdge {
 };
 
 struct FileGraphInfo {
-  std::vector<std::string> files;
+  std::vector<OrderEntry> files;
   std::vector<FileEdge> edges;
 };
 

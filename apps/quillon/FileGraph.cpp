@@ -58,7 +58,7 @@ FileGraphInfo FileGraph::Build(const TreeInfo& tree, const std::vector<OrderEntr
   VerilogFiles verilog;
   for (const OrderEntry& entry : order) {
     if (!index.emplace(entry.path, graph.files.size()).second) continue;
-    graph.files.push_back(entry.path);
+    graph.files.push_back(entry);
     verilog.push_back(entry.plugin == "PLUGIN_Verilog");
   }
   EdgeSet edges;

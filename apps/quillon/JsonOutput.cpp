@@ -108,6 +108,7 @@ void WriteNodeFields(const TreeInfo& tree, const TreeNodeInfo& node, std::size_t
     field("shared", true);
     field("firstOccurrence", PointerTo(tree, *node.sharedWith));
   }
+  if (node.moreBelow > 0) field("moreBelow", node.moreBelow);
   out << inner << "\"children\": ";
 }
 

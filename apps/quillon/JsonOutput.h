@@ -16,7 +16,8 @@ class JsonOutput {
   static void Units(const std::vector<FileInfo>& files, const std::vector<MessageInfo>& messages,
                     std::ostream& out);
   // A later occurrence of a shared subtree is a NODE with "shared": true, "firstOccurrence" (a
-  // JSON pointer to the node printed in full, as "/root/children/0/children/2") and no children.
+  // JSON pointer to the node printed in full, as "/root/children/0/children/2") and no children. A
+  // node whose children a depth limit left out has "moreBelow": N.
   // Deeper than kDeepestIndent levels the indent stops growing. Tree, Order and Check also list
   // quillon's own diagnostics under "diagnostics".
   static void Tree(const TreeInfo* tree, const std::vector<MessageInfo>& messages, std::ostream& out,

@@ -34,6 +34,11 @@ constexpr const char* kUsage =
     "  --property KEY=VALUE  any project property\n"
     "  --converter-timeout SECONDS  the time a converter may take (default 300, 0 for none)\n"
     "\n"
+    "tree:\n"
+    "  --top UNIT            the subtree below UNIT\n"
+    "  --depth N             N levels below the first; deeper nodes are counted\n"
+    "  --instances           instances only, no entity or package nodes\n"
+    "\n"
     "order:\n"
     "  --top UNIT            the order for UNIT and what it needs\n"
     "  --unit UNIT           the order for UNIT alone\n"
@@ -130,6 +135,8 @@ void Parser::Declare() {
   app_.add_option("--top", top_);
   app_.add_option("--unit", unit_);
   app_.add_flag("--with-library", options_.withLibrary);
+  app_.add_option("--depth", options_.depth)->check(CLI::NonNegativeNumber);
+  app_.add_flag("--instances", options_.instancesOnly);
   app_.add_option("--format", format_)->check(CLI::IsMember({"text", "json", "dot"}));
   app_.add_option("-o", options_.outputPath);
   app_.add_flag("-q", options_.quiet);
@@ -234,8 +241,16 @@ bool Parser::CheckCombination(std::string& error) const {
     error = "--top and --unit exclude each other";
     return false;
   }
-  if ((!o.top.empty() || o.withLibrary) && o.command != Command::kOrder) {
-    error = "--top, --unit and --with-library apply to the order command only";
+  if ((o.byUnit || o.withLibrary) && o.command != Command::kOrder) {
+    error = "--unit and --with-library apply to the order command only";
+    return false;
+  }
+  if (!o.top.empty() && o.command != Command::kOrder && o.command != Command::kTree) {
+    error = "--top applies to the tree and order commands only";
+    return false;
+  }
+  if ((o.depth || o.instancesOnly) && o.command != Command::kTree) {
+    error = "--depth and --instances apply to the tree command only";
     return false;
   }
   if (o.format == Format::kDot && o.command != Command::kTree && o.command != Command::kOrder) {

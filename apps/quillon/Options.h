@@ -49,6 +49,9 @@ class Options {
   bool byUnit = false;  // --unit
   bool withLibrary = false;
 
+  std::optional<std::size_t> depth;  // tree --depth N: levels shown below the first
+  bool instancesOnly = false;        // tree --instances
+
   Format format = Format::kText;
   std::string outputPath;
   bool quiet = false;

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <string>
+#include <string_view>
 #include <utility>
 
 namespace quillon {
@@ -33,7 +34,7 @@ void TextOutput::Units(const std::vector<FileInfo>& files, std::ostream& out) {
   }
 }
 
-void TextOutput::Tree(const TreeInfo& tree, std::ostream& out) {
+void TextOutput::Tree(const TreeInfo& tree, bool fullPaths, std::ostream& out) {
   if (tree.nodes.empty()) return;
   std::vector<std::pair<std::size_t, std::size_t>> pending;  // node index, depth
   const std::vector<std::size_t>& tops = tree.Root().children;
@@ -42,15 +43,19 @@ void TextOutput::Tree(const TreeInfo& tree, std::ostream& out) {
     auto [index, depth] = pending.back();
     pending.pop_back();
     const TreeNodeInfo& node = tree.nodes[index];
-    Node(node, depth, out);
+    Node(node, depth, fullPaths, out);
     for (auto child = node.children.rbegin(); child != node.children.rend(); ++child)
       pending.emplace_back(*child, depth + 1);
   }
 }
 
-void TextOutput::Node(const TreeNodeInfo& node, std::size_t depth, std::ostream& out) {
+void TextOutput::Indent(std::size_t depth, std::ostream& out) {
   out << std::string(std::min(depth, kDeepestIndent) * 2, ' ');
   if (depth > kDeepestIndent) out << "(level " << depth << ") ";
+}
+
+void TextOutput::Node(const TreeNodeInfo& node, std::size_t depth, bool fullPaths, std::ostream& out) {
+  Indent(depth, out);
   if (!node.instance.empty()) out << node.instance << ": ";
   out << (node.unit.empty() ? node.name : node.unit);
   if (!node.architecture.empty()) out << '(' << node.architecture << ')';
@@ -59,11 +64,14 @@ void TextOutput::Node(const TreeNodeInfo& node, std::size_t depth, std::ostream&
     out << " (shared, see above)\n";
     return;
   }
-  if (node.file) out << "  " << *node.file;
+  if (node.file) out << "  " << (fullPaths ? std::string_view(*node.file) : BaseNameOf(*node.file));
   if (node.libraryCell) out << " (library cell)";
   if (!node.libraryCell && !node.elementType) out << " (not in the project)";
   if (!node.partition.empty()) out << " (partition " << node.partition << ')';
   out << '\n';
+  if (node.moreBelow == 0) return;
+  Indent(depth + 1, out);
+  out << "... (" << node.moreBelow << " more below)\n";
 }
 
 void TextOutput::Order(const std::vector<OrderEntry>& order, bool withLibrary, std::ostream& out) {

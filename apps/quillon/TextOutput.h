@@ -17,8 +17,9 @@ class TextOutput {
   // architecture, kind, file and the flags (library cell, not in the project, partition). A
   // shared subtree is printed in full once; later occurrences are one line ending in "(shared,
   // see above)". Below kDeepestIndent levels the indent stops growing and the line starts with
-  // its level instead.
-  static void Tree(const TreeInfo& tree, std::ostream& out);
+  // its level instead. Files show by their base names unless `fullPaths`. A node whose children a
+  // depth limit left out is followed by a line "... (N more below)".
+  static void Tree(const TreeInfo& tree, bool fullPaths, std::ostream& out);
   static constexpr std::size_t kDeepestIndent = 100;
   // One path a line; with the library and a blank before it when asked.
   static void Order(const std::vector<OrderEntry>& order, bool withLibrary, std::ostream& out);
@@ -28,7 +29,8 @@ class TextOutput {
   static void CheckSummary(std::size_t files, std::size_t units, int errors, int warnings, std::ostream& out);
 
  private:
-  static void Node(const TreeNodeInfo& node, std::size_t depth, std::ostream& out);
+  static void Node(const TreeNodeInfo& node, std::size_t depth, bool fullPaths, std::ostream& out);
+  static void Indent(std::size_t depth, std::ostream& out);
 };
 
 }  // namespace quillon

@@ -30,10 +30,12 @@ std::optional<std::string> ElementTypeOf(Vad::IHdlElement* element) {
   return key.substr(0, key.find('|'));
 }
 
-std::optional<std::string> ElementFileOf(Vad::IHdlElement* element) {
+// The path and library of the element's file; both unset when it has none.
+void DescribeFileOf(Vad::IHdlElement* element, TreeNodeInfo& info) {
   Prjrep::AutoRelease<Vad::IHdlFile> file;
-  if (!element || element->GetFile(file.Out()) != CitI::kOk || !file) return std::nullopt;
-  return FileFacts::PathOf(file.Get());
+  if (!element || element->GetFile(file.Out()) != CitI::kOk || !file) return;
+  info.file = FileFacts::PathOf(file.Get());
+  info.library = FileFacts::LibraryOf(file.Get());
 }
 
 std::vector<Vad::IHdlNetListNode*> ChildrenOf(Vad::IHdlNetListNode* node) {
@@ -64,7 +66,7 @@ TreeNodeInfo TreeReader::Describe(Vad::IHdlNetListNode* node, bool withPaths) {
       TextOf(Prjrep::QueryAs<Vad::IHdlPartitionData>(node), &Vad::IHdlPartitionData::GetPartition);
   Vad::IHdlElement* element = node->GetElement();
   info.elementType = ElementTypeOf(element);
-  info.file = ElementFileOf(element);
+  DescribeFileOf(element, info);
   return info;
 }
 

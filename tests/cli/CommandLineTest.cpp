@@ -27,7 +27,8 @@ void ExpectOneLineNaming(const CliResult& result, const std::string& named) {
 TEST(CommandLine, HelpListsEveryCommandAndExitsZero) {
   CliResult result = RunQuillon({"--help"});
   EXPECT_EQ(result.status, 0);
-  for (const char* command : {"units", "tree", "order", "ports UNIT", "check", "--top", "--with-library"}) {
+  for (const char* command : {"units", "tree", "order", "ports UNIT", "check", "--top", "--depth",
+                              "--instances", "--with-library"}) {
     EXPECT_NE(result.out.find(command), std::string::npos) << command;
   }
 }
@@ -44,6 +45,10 @@ TEST(CommandLine, UsageMistakesAreRejectedWithStatusTwo) {
       {{"--format", "dot", "units", top}, "--format dot"},
       {{"--top", "top", "units", top}, "--top"},
       {{"--top", "top", "--unit", "top", "order", top}, "--unit"},
+      {{"--unit", "top", "tree", top}, "--unit"},
+      {{"--depth", "1", "order", top}, "--depth"},
+      {{"--instances", "units", top}, "--instances"},
+      {{"--depth", "-1", "tree", top}, "--depth"},
       {{"--property", "NOVALUE", "units", top}, "NOVALUE"},
       {{"-D", "=1", "units", top}, "-D"},
   };
