@@ -56,6 +56,7 @@ struct TreeNodeInfo {
   bool libraryCell = false;
   std::string partition;
   std::optional<std::string> elementType;
+  std::optional<std::string> elementKey;  // design-unit key of the node's element
   std::optional<std::string> file;
   // Indices of the children in TreeInfo::nodes, in child order.
   std::vector<std::size_t> children;
