@@ -103,14 +103,14 @@ py::object OrNone(const std::optional<Number>& number) {
 
 py::dict UnitDict(const UnitInfo& unit, const FileInfo& file) {
   py::object uses = py::none();
-  if (unit.uses) uses = py::cast(*unit.uses);
+  if (unit.uses) uses = py::tuple(py::cast(*unit.uses));
   return py::dict("type"_a = unit.type, "name"_a = unit.name, "key"_a = unit.key, "file"_a = file.path,
                   "library"_a = file.library, "line"_a = unit.line, "store_key"_a = unit.storeKey,
                   "parent"_a = OrNone(unit.parent), "in_generate"_a = unit.inGenerate,
-                  "unit_flag"_a = unit.unitFlag, "partition"_a = unit.partition, "entity"_a = OrNone(unit.entity),
-                  "architecture"_a = OrNone(unit.architecture), "component"_a = OrNone(unit.component),
-                  "named_library"_a = OrNone(unit.library), "package"_a = OrNone(unit.package),
-                  "item"_a = OrNone(unit.item), "uses"_a = uses);
+                  "unit_flag"_a = unit.unitFlag, "partition"_a = unit.partition,
+                  "entity"_a = OrNone(unit.entity), "architecture"_a = OrNone(unit.architecture),
+                  "component"_a = OrNone(unit.component), "named_library"_a = OrNone(unit.library),
+                  "package"_a = OrNone(unit.package), "item"_a = OrNone(unit.item), "uses"_a = uses);
 }
 
 py::list Units(ScriptProject& project) {
@@ -131,13 +131,13 @@ py::dict NodeDict(const TreeNodeInfo& node, const ScriptProject::NodePlace& plac
   } else if (colon != std::string::npos) {
     library = py::str(node.kind.substr(0, colon));
   }
-  return py::dict("name"_a = node.name, "kind"_a = node.kind, "unit"_a = node.unit,
-                  "architecture"_a = node.architecture, "instance"_a = node.instance, "library"_a = library,
-                  "file"_a = OrNone(node.file), "line"_a = place.line ? py::object(py::int_(place.line)) : py::none(),
-                  "key"_a = OrNone(node.elementKey), "element_type"_a = OrNone(node.elementType),
-                  "path"_a = node.path, "type"_a = node.type, "library_cell"_a = node.libraryCell,
-                  "partition"_a = node.partition, "children"_a = py::cast(node.children),
-                  "shared_with"_a = OrNone(node.sharedWith));
+  return py::dict(
+      "name"_a = node.name, "kind"_a = node.kind, "unit"_a = node.unit, "architecture"_a = node.architecture,
+      "instance"_a = node.instance, "library"_a = library, "file"_a = OrNone(node.file),
+      "line"_a = place.line ? py::object(py::int_(place.line)) : py::none(),
+      "key"_a = OrNone(node.elementKey), "element_type"_a = OrNone(node.elementType), "path"_a = node.path,
+      "type"_a = node.type, "library_cell"_a = node.libraryCell, "partition"_a = node.partition,
+      "children"_a = py::cast(node.children), "shared_with"_a = OrNone(node.sharedWith));
 }
 
 py::tuple Tree(ScriptProject& project, const std::string& top) {
@@ -162,8 +162,8 @@ py::list Ports(ScriptProject& project, const std::string& unit) {
   py::list list;
   for (const PortInfo& port : ports) {
     list.append(py::dict("name"_a = port.name, "position"_a = port.position, "type"_a = port.type,
-                         "direction"_a = port.direction, "low"_a = OrNone(port.low), "high"_a = OrNone(port.high),
-                         "span"_a = OrNone(port.span)));
+                         "direction"_a = port.direction, "low"_a = OrNone(port.low),
+                         "high"_a = OrNone(port.high), "span"_a = OrNone(port.span)));
   }
   return list;
 }
@@ -192,11 +192,12 @@ py::list Messages(ScriptProject& project) {
   return list;
 }
 
-ProjectHolder MakeProject(const std::vector<std::tuple<std::string, std::string, std::string, std::string>>& sources,
-                          const std::vector<std::string>& defines, const std::vector<std::string>& includeDirs,
-                          const std::vector<std::pair<std::string, std::string>>& properties,
-                          const std::optional<std::string>& target, const std::optional<std::string>& family,
-                          const std::vector<std::string>& externalLibraries, bool strict) {
+ProjectHolder MakeProject(
+    const std::vector<std::tuple<std::string, std::string, std::string, std::string>>& sources,
+    const std::vector<std::string>& defines, const std::vector<std::string>& includeDirs,
+    const std::vector<std::pair<std::string, std::string>>& properties,
+    const std::optional<std::string>& target, const std::optional<std::string>& family,
+    const std::vector<std::string>& externalLibraries, bool strict) {
   Options options;
   for (const auto& [kind, path, library, plugin] : sources)
     options.sources.push_back({KindNamed(kind), path, library, plugin});

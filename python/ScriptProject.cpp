@@ -36,7 +36,8 @@ std::pair<std::string, std::string> TypeAndNameOf(const std::string& key) {
   std::size_t first = key.find('|');
   if (first == std::string::npos) return {key, ""};
   std::size_t second = key.find('|', first + 1);
-  return {key.substr(0, first), key.substr(first + 1, second == std::string::npos ? second : second - first - 1)};
+  return {key.substr(0, first),
+          key.substr(first + 1, second == std::string::npos ? second : second - first - 1)};
 }
 
 // An entity stands for the architectures over it, which hold its instances.
@@ -136,7 +137,8 @@ ScriptProject::Hierarchy ScriptProject::Tree(const std::string& top) {
   if (unit) {
     std::string key = KeyOf(unit);
     const std::vector<TreeNodeInfo>& nodes = hierarchy.tree.nodes;
-    auto found = std::find_if(nodes.begin(), nodes.end(), [&](const TreeNodeInfo& node) { return StandsFor(node, key); });
+    auto found = std::find_if(nodes.begin(), nodes.end(),
+                              [&](const TreeNodeInfo& node) { return StandsFor(node, key); });
     if (found == nodes.end()) request.Fail("'" + top + "' has no place in the design hierarchy");
     hierarchy.top = static_cast<std::size_t>(found - nodes.begin());
   }
@@ -148,7 +150,8 @@ ScriptProject::Hierarchy ScriptProject::Tree(const std::string& top) {
 void ScriptProject::PlaceNodes(Hierarchy& hierarchy) const {
   std::map<std::pair<std::string, std::string>, NodePlace> places;
   for (const FileInfo& file : reader_->Files()) {
-    for (const UnitInfo& unit : file.units) places.try_emplace({file.path, unit.key}, NodePlace{file.library, unit.line});
+    for (const UnitInfo& unit : file.units)
+      places.try_emplace({file.path, unit.key}, NodePlace{file.library, unit.line});
   }
   hierarchy.places.resize(hierarchy.tree.nodes.size());
   for (std::size_t index = 0; index < hierarchy.tree.nodes.size(); ++index) {

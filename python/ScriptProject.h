@@ -13,9 +13,9 @@
 #include "Diagnostic.h"
 #include "MessageLog.h"
 #include "Options.h"
+#include "Progress.h"
 #include "ProjectBuilder.h"
 #include "ProjectReader.h"
-#include "Progress.h"
 
 namespace quillon {
 

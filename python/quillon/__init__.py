@@ -49,6 +49,9 @@ class Unit:
     uses: Optional[Tuple[str, ...]]
 
 
+_NODE_FIELDS_SHOWN = ("name", "kind", "instance", "library", "file", "line")
+
+
 @dataclass(eq=False, repr=False)
 class Node:
     """A node of the instance hierarchy. A subtree that several parents share is one Node object
@@ -83,7 +86,7 @@ class Node:
             pending.extend(reversed(node.children))
 
     def __repr__(self) -> str:
-        shown = ", ".join(f"{name}={getattr(self, name)!r}" for name in ("name", "kind", "instance", "library", "file", "line"))
+        shown = ", ".join(f"{name}={getattr(self, name)!r}" for name in _NODE_FIELDS_SHOWN)
         return f"Node({shown}, children={len(self.children)})"
 
 
@@ -212,7 +215,7 @@ class Project:
 
     def units(self) -> list:
         """Every record of every file's design-unit set, file by file."""
-        return [Unit(**dict(unit, uses=None if unit["uses"] is None else tuple(unit["uses"]))) for unit in self._project.units()]
+        return [Unit(**unit) for unit in self._project.units()]
 
     def tree(self, top: Optional[str] = None) -> Node:
         """The instance hierarchy: its unnamed root, whose children are the top units; with `top`
@@ -223,7 +226,8 @@ class Project:
             fields = {name: value for name, value in entry.items() if name not in ("children", "shared_with")}
             nodes.append(Node(**fields))
         # A later occurrence of a shared subtree stands for its first occurrence.
-        first = [index if entry["shared_with"] is None else entry["shared_with"] for index, entry in enumerate(entries)]
+        first = [index if entry["shared_with"] is None else entry["shared_with"]
+                 for index, entry in enumerate(entries)]
         for node, entry in zip(nodes, entries):
             node.children = [nodes[first[child]] for child in entry["children"]]
         return nodes[first[top_index]]

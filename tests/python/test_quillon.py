@@ -50,8 +50,8 @@ class ExampleProjectTest(unittest.TestCase):
         tops = [node.unit for node in root.children]
         self.assertIn("crossing", tops)
         crossing = self.project.tree("crossing")
-        self.assertEqual((crossing.unit, crossing.architecture, crossing.library), ("crossing", "structural", "work"))
-        self.assertEqual(crossing.line, 16)
+        self.assertEqual((crossing.unit, crossing.architecture, crossing.library, crossing.line),
+                         ("crossing", "structural", "work", 16))
         labels = {child.instance: child for child in crossing.children if child.instance}
         self.assertEqual(set(labels), {"input", "control", "cars", "people", "bell"})
         self.assertTrue(labels["bell"].file.endswith("chime.v"))
@@ -69,7 +69,7 @@ class ExampleProjectTest(unittest.TestCase):
         self.assertEqual(names[-1], "crossing.vhd")
         self.assertLess(names.index("light_pkg.vhd"), names.index("lamp_driver.vhd"))
         self.assertEqual({entry.language for entry in order}, {"VHDL", "Verilog"})
-        controller = [(entry.library, os.path.basename(entry.path)) for entry in self.project.order("controller")]
+        controller = [(f.library, os.path.basename(f.path)) for f in self.project.order("controller")]
         self.assertEqual(controller, [("common", "timing_pkg.vhd"), ("work", "phase_timer.vhd"),
                                       ("work", "light_pkg.vhd"), ("work", "controller.vhd")])
         alone = self.project.order("Architecture|controller|rtl", alone=True)
@@ -105,7 +105,8 @@ class FixtureTest(unittest.TestCase):
         self.assertEqual(libraries, {"mixer.vhd": "work", "gauge.vhd": "meters", "sizes_pkg.vhd": "sizes"})
 
     def test_port_ranges_follow_generic_defaults(self):
-        project = quillon.Project([data("ports", name) for name in ("sizes_pkg.vhd", "gauge.vhd", "mixer.vhd", "pair.v")])
+        names = ("sizes_pkg.vhd", "gauge.vhd", "mixer.vhd", "pair.v")
+        project = quillon.Project([data("ports", name) for name in names])
         ports = {port.name: port for port in project.ports("mixer")}
         self.assertEqual((ports["samples"].high, ports["samples"].low), (7, 0))
         self.assertEqual((ports["level"].high, ports["level"].low), (7, 0))
@@ -118,12 +119,15 @@ class FixtureTest(unittest.TestCase):
 
     def test_diagnostics_and_messages_of_broken_designs(self):
         with tempfile.TemporaryDirectory() as folder:
-            cycle = quillon.Project([written(folder, "a.vhd", "use work.pkg_b.all;\npackage pkg_a is end;\n"),
-                                     written(folder, "b.vhd", "use work.pkg_a.all;\npackage pkg_b is end;\n")])
-            self.assertEqual([(d.severity, d.code) for d in cycle.diagnostics()], [("error", "no-valid-order")])
+            cycle = quillon.Project([
+                written(folder, "a.vhd", "use work.pkg_b.all;\npackage pkg_a is end;\n"),
+                written(folder, "b.vhd", "use work.pkg_a.all;\npackage pkg_b is end;\n")])
+            found = [(d.severity, d.code) for d in cycle.diagnostics()]
+            self.assertEqual(found, [("error", "no-valid-order")])
             self.assertEqual(len(cycle.order()), 2, "a cut order still lists every file")
-            self.assertTrue(any("circular dependency" in m.text for m in cycle.messages() if m.severity == "warning"))
-        duplicate = quillon.Project([data("elab", "duplicate", "dup_a.vhd"), data("elab", "duplicate", "dup_b.vhd")])
+            warnings = [m.text for m in cycle.messages() if m.severity == "warning"]
+            self.assertTrue(any("circular dependency" in text for text in warnings))
+        duplicate = quillon.Project([data("elab", "duplicate", name) for name in ("dup_a.vhd", "dup_b.vhd")])
         found = {d.code: d for d in duplicate.diagnostics()}
         self.assertEqual(set(found), {"duplicate-unit", "ambiguous-architecture"})
         self.assertEqual((found["duplicate-unit"].file, found["duplicate-unit"].line),
@@ -132,14 +136,16 @@ class FixtureTest(unittest.TestCase):
     def test_file_list_defines_and_include_dirs(self):
         with tempfile.TemporaryDirectory() as folder:
             written(folder, "width.vh", "`define WIDE\n")
-            source = written(folder, "switch.v", "`include \"width.vh\"\n`ifdef WIDE\nmodule wide; endmodule\n"
-                                                 "`else\nmodule narrow; endmodule\n`endif\n`ifdef EXTRA\n"
-                                                 "module extra; endmodule\n`endif\n")
+            source = written(folder, "switch.v",
+                             "`include \"width.vh\"\n`ifdef WIDE\nmodule wide; endmodule\n"
+                             "`else\nmodule narrow; endmodule\n`endif\n"
+                             "`ifdef EXTRA\nmodule extra; endmodule\n`endif\n")
             keys = lambda **options: {u.key for u in quillon.Project(**options).units() if u.type == "Module"}
             self.assertEqual(keys(files=[source], include_dirs=folder), {"Module|wide"})
             self.assertEqual(keys(files=source, include_dirs=[folder], defines={"EXTRA": None}),
                              {"Module|wide", "Module|extra"})
-            listed = written(folder, "sources.f", f"+incdir+{folder}\n+define+EXTRA=1\n// the design\n{source}\n")
+            listed = written(folder, "sources.f",
+                             f"+incdir+{folder}\n+define+EXTRA=1\n// the design\n{source}\n")
             self.assertEqual(keys(file_list=listed), {"Module|wide", "Module|extra"})
             with self.assertRaises(ValueError):
                 quillon.Project([source], defines=["A;B"])
