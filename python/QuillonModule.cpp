@@ -224,6 +224,7 @@ PYBIND11_MODULE(_core, module) {
   UseInstalledCellLibraries();
 
   static py::exception<ScriptError> error(module, "Error");
+  error.attr("__module__") = "quillon";
   error.doc() = "A request to Quillon failed; .messages holds the reason and the error messages.";
   py::register_exception_translator([](std::exception_ptr failure) {
     try {
