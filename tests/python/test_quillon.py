@@ -133,6 +133,19 @@ class FixtureTest(unittest.TestCase):
         self.assertEqual((found["duplicate-unit"].file, found["duplicate-unit"].line),
                          (data("elab", "duplicate", "dup_b.vhd"), 3))
 
+    def test_strict_and_external_libraries_shape_the_findings(self):
+        with tempfile.TemporaryDirectory() as folder:
+            top = written(folder, "top.vhd",
+                          "library vendor;\nuse vendor.parts.all;\nentity top is end;\n"
+                          "architecture rtl of top is\n"
+                          "  component mystery port (a : in bit); end component;\n  signal s : bit;\n"
+                          "begin\n  u : mystery port map (a => s);\nend;\n")
+            found = lambda **options: [(d.severity, d.code, d.line) for d in
+                                       quillon.Project(top, **options).diagnostics()]
+            self.assertEqual(found(), [("warning", "black-box", 8), ("error", "unknown-library", 1)])
+            self.assertEqual(found(strict=True), [("error", "black-box", 8), ("error", "unknown-library", 1)])
+            self.assertEqual(found(external_libraries="vendor"), [("warning", "black-box", 8)])
+
     def test_file_list_defines_and_include_dirs(self):
         with tempfile.TemporaryDirectory() as folder:
             written(folder, "width.vh", "`define WIDE\n")
