@@ -9,6 +9,7 @@
 #include <optional>
 
 #include "ArchitectureCheck.h"
+#include "DeveloperTextCapture.h"
 #include "DiagnosticFinder.h"
 #include "DiagnosticReport.h"
 #include "DotOutput.h"
@@ -79,36 +80,6 @@ std::vector<std::string> InputPaths(const ProjectSources& sources, const Options
   for (const SourceArgument& argument : options.sources) paths.push_back(argument.path);
   return paths;
 }
-
-// Keeps the module's developer texts of one query, passing them on as well. The module gives the
-// reason for a missing port list as a developer text ("ports of KEY: reason").
-class DeveloperTextCapture {
- public:
-  DeveloperTextCapture()
-      : previous_(Port_MsgManData::setDebugSink([this](std::string_view text) {
-          text_.append(text);
-          if (previous_) previous_(text);
-        })) {}
-  ~DeveloperTextCapture() { Port_MsgManData::setDebugSink(std::move(previous_)); }
-  DeveloperTextCapture(const DeveloperTextCapture&) = delete;
-  DeveloperTextCapture& operator=(const DeveloperTextCapture&) = delete;
-
-  // The last line that starts with `lead`, without its line end; empty when there is none.
-  std::string LastLineStartingWith(const std::string& lead) const {
-    std::string found;
-    for (std::size_t start = 0; start < text_.size();) {
-      std::size_t end = text_.find('\n', start);
-      if (end == std::string::npos) end = text_.size();
-      if (text_.compare(start, lead.size(), lead) == 0) found = text_.substr(start, end - start);
-      start = end + 1;
-    }
-    return found;
-  }
-
- private:
-  std::string text_;
-  Port_MsgManData::DebugSink previous_;
-};
 
 }  // namespace
 

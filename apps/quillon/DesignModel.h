@@ -63,6 +63,7 @@ struct TreeNodeInfo {
   bool libraryCell = false;
   std::string partition;
   std::optional<std::string> elementType;
+  std::optional<std::string> elementKey;  // design-unit key of the node's element
   std::optional<std::string> file;
   std::optional<std::string> library;  // the library of the element's file
   // Indices of the children in TreeInfo::nodes, in child order.

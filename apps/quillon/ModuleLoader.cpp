@@ -10,9 +10,11 @@ ModuleLoader::~ModuleLoader() {
   // The module stays loaded until the process ends: objects it made may outlive this loader.
 }
 
-bool ModuleLoader::Load(std::string& error) {
+bool ModuleLoader::Load(std::string& error) { return LoadInstead(QUILLON_DEFAULT_MODULE, error); }
+
+bool ModuleLoader::LoadInstead(const std::string& defaultPath, std::string& error) {
   const char* fromEnvironment = std::getenv("QUILLON_MODULE");
-  path_ = fromEnvironment && *fromEnvironment ? fromEnvironment : QUILLON_DEFAULT_MODULE;
+  path_ = fromEnvironment && *fromEnvironment ? fromEnvironment : defaultPath;
   handle_ = dlopen(path_.c_str(), RTLD_NOW | RTLD_LOCAL);
   if (!handle_) {
     const char* reason = dlerror();

@@ -15,6 +15,9 @@ class ModuleLoader {
   // Opens the module named by QUILLON_MODULE, else the one built with this program, and calls
   // its InstFactoryEntry. False with a one-line reason in `error`.
   bool Load(std::string& error);
+  // The same with another module than the one built with this program, for hosts installed
+  // elsewhere; QUILLON_MODULE still comes first.
+  bool LoadInstead(const std::string& defaultPath, std::string& error);
   const std::string& path() const { return path_; }
 
  private:

@@ -23,11 +23,15 @@ std::string TextOf(Interface* object, Getter getter) {
   return text.str();
 }
 
-// A design-unit key starts with the unit's type name: "Architecture|cpu|rtl".
-std::optional<std::string> ElementTypeOf(Vad::IHdlElement* element) {
+std::optional<std::string> ElementKeyOf(Vad::IHdlElement* element) {
   if (!element) return std::nullopt;
-  std::string key = TextOf(Prjrep::QueryAs<Prjrep::IName>(element), &Prjrep::IName::GetName);
-  return key.substr(0, key.find('|'));
+  return TextOf(Prjrep::QueryAs<Prjrep::IName>(element), &Prjrep::IName::GetName);
+}
+
+// A design-unit key starts with the unit's type name: "Architecture|cpu|rtl".
+std::optional<std::string> TypeOfKey(const std::optional<std::string>& key) {
+  if (!key) return std::nullopt;
+  return key->substr(0, key->find('|'));
 }
 
 // The path and library of the element's file; both unset when it has none.
@@ -65,7 +69,8 @@ TreeNodeInfo TreeReader::Describe(Vad::IHdlNetListNode* node, bool withPaths) {
   info.partition =
       TextOf(Prjrep::QueryAs<Vad::IHdlPartitionData>(node), &Vad::IHdlPartitionData::GetPartition);
   Vad::IHdlElement* element = node->GetElement();
-  info.elementType = ElementTypeOf(element);
+  info.elementKey = ElementKeyOf(element);
+  info.elementType = TypeOfKey(info.elementKey);
   DescribeFileOf(element, info);
   return info;
 }
