@@ -7,6 +7,7 @@
 #include <fstream>
 #include <iostream>
 #include <optional>
+#include <sstream>
 
 #include "ArchitectureCheck.h"
 #include "DiagnosticFinder.h"
@@ -317,10 +318,13 @@ int CommandRunner::Export(ProjectReader& reader, Vad::IHdlProject* project, std:
     if (!plan.top)
       log_->ReportWarning(key + " is no entity, architecture or module: the export names no top");
   }
-  if (!ExportWriter::Write(options_.exportTo, plan, out, error)) {
+  // A format that cannot carry some path is found out midway: nothing is written then.
+  std::ostringstream text;
+  if (!ExportWriter::Write(options_.exportTo, plan, text, error)) {
     log_->ReportError(error);
     return kExitFailed;
   }
+  out << text.str();
   return status;
 }
 
