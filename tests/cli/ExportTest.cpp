@@ -108,6 +108,22 @@ TEST(Export, DepfileAndNinjaCarryTheSameNeedsAsTheMakefile) {
   EXPECT_NE(plan.output.find("[8/8]"), std::string::npos) << plan.output;
 }
 
+// A cycle's cut edge would make the stamps depend on each other; a Verilog file sees the macros
+// of the Verilog file before it.
+TEST(Export, StampsNeedOnlyEarlierSourcesAndVerilogTheVerilogBefore) {
+  CliResult cycle =
+      RunQuillon({"-q", "export", "--to", "depfile", DataPath("cycle/ping.vhd"), DataPath("cycle/pong.vhd")});
+  ASSERT_EQ(cycle.status, 0) << cycle.err;
+  EXPECT_EQ(Lines(cycle.out),
+            (std::vector<std::string>{".quillon-build/0-pong.vhd.stamp: " + DataPath("cycle/pong.vhd"),
+                                      ".quillon-build/1-ping.vhd.stamp: " + DataPath("cycle/ping.vhd") +
+                                          " .quillon-build/0-pong.vhd.stamp"}));
+  CliResult verilog =
+      RunQuillon({"export", "--to", "depfile", DataPath("verilog/first.v"), DataPath("verilog/second.v")});
+  EXPECT_EQ(Lines(verilog.out).back(), ".quillon-build/1-second.v.stamp: " + DataPath("verilog/second.v") +
+                                           " .quillon-build/0-first.v.stamp");
+}
+
 TEST(Export, GhdlScriptAnalysesTheExampleInOrderAndElaboratesTheTop) {
   ScopedTempDir dir;
   CliResult exported = RunQuillon({"-P", Example("project.json"), "export", "--to", "ghdl", "--top",
