@@ -1,5 +1,7 @@
 #include "BuildFileWriter.h"
 
+#include <map>
+
 #include "ExportText.h"
 
 namespace quillon {
@@ -63,11 +65,19 @@ std::string DepfilePath(const std::string& path) {
 
 }  // namespace
 
-std::string BuildFileWriter::StampName(const ExportPlan& plan, std::size_t index) {
-  return std::to_string(index) + '-' + ExportText::SafeBaseName(plan.sources[index].path) + ".stamp";
+std::vector<std::string> BuildFileWriter::StampNames(const ExportPlan& plan) {
+  std::vector<std::string> names;
+  std::map<std::string, std::size_t> uses;
+  for (const ExportSource& source : plan.sources) {
+    std::string name = source.library + '.' + ExportText::SafeBaseName(source.path);
+    std::size_t earlier = uses[name]++;
+    names.push_back(name + (earlier == 0 ? "" : '-' + std::to_string(earlier + 1)) + ".stamp");
+  }
+  return names;
 }
 
 bool BuildFileWriter::Make(const ExportPlan& plan, std::ostream& out, std::string& error) {
+  const std::vector<std::string> stamps = StampNames(plan);
   out << "# Compiles the sources in dependency order: make -f THIS_FILE [VAR=VALUE...].\n"
          "# Every source has a stamp file under BUILD_DIR; VHDL_COMPILE runs with the source's library\n"
          "# in $(LIB), and both compile commands get the source appended.\n"
@@ -75,15 +85,15 @@ bool BuildFileWriter::Make(const ExportPlan& plan, std::ostream& out, std::strin
       << "\nVERILOG_FLAGS ?=" << ExportText::DollarsDoubled(VerilogFlags(plan))
       << "\nVERILOG_COMPILE ?= " << kVerilogCompile << " $(VERILOG_FLAGS)\n\n.PHONY: all clean\nall:";
   for (std::size_t index = 0; index < plan.sources.size(); ++index)
-    out << " \\\n  $(BUILD_DIR)/" << StampName(plan, index);
+    out << " \\\n  $(BUILD_DIR)/" << stamps[index];
   out << "\n\nclean:\n\trm -rf $(BUILD_DIR)\n";
   for (std::size_t index = 0; index < plan.sources.size(); ++index) {
     const ExportSource& source = plan.sources[index];
     std::string path;
     if (!MakePath(source.path, path, error)) return false;
-    std::string stamp = "$(BUILD_DIR)/" + StampName(plan, index);
+    std::string stamp = "$(BUILD_DIR)/" + stamps[index];
     out << '\n' << stamp << ": LIB = " << source.library << '\n' << stamp << ": " << path;
-    for (std::size_t need : source.needs) out << " $(BUILD_DIR)/" << StampName(plan, need);
+    for (std::size_t need : source.needs) out << " $(BUILD_DIR)/" << stamps[need];
     out << "\n\t@mkdir -p $(BUILD_DIR)/ghdl\n\t"
         << (IsVhdl(source) ? "$(VHDL_COMPILE) " : "$(VERILOG_COMPILE) ")
         << ExportText::DollarsDoubled(ExportText::ShellWord(source.path)) << "\n\t@touch $@\n";
@@ -92,6 +102,7 @@ bool BuildFileWriter::Make(const ExportPlan& plan, std::ostream& out, std::strin
 }
 
 bool BuildFileWriter::Ninja(const ExportPlan& plan, std::ostream& out, std::string& error) {
+  const std::vector<std::string> stamps = StampNames(plan);
   out << "# Compiles the sources in dependency order: ninja -f THIS_FILE. Every source has a stamp\n"
          "# file under build_dir; change the compile commands below to use other tools.\n"
       << "build_dir = " << kBuildDir
@@ -104,20 +115,19 @@ bool BuildFileWriter::Ninja(const ExportPlan& plan, std::ostream& out, std::stri
     const ExportSource& source = plan.sources[index];
     std::string path;
     if (!NinjaPath(source.path, path, error)) return false;
-    out << "\nbuild $build_dir/" << StampName(plan, index) << ": " << (IsVhdl(source) ? "vhdl " : "verilog ")
-        << path;
+    out << "\nbuild $build_dir/" << stamps[index] << ": " << (IsVhdl(source) ? "vhdl " : "verilog ") << path;
     if (!source.needs.empty()) out << " |";
-    for (std::size_t need : source.needs) out << " $build_dir/" << StampName(plan, need);
+    for (std::size_t need : source.needs) out << " $build_dir/" << stamps[need];
     out << "\n  lib = " << source.library << '\n';
   }
   return true;
 }
 
 bool BuildFileWriter::Depfile(const ExportPlan& plan, std::ostream& out, std::string&) {
+  const std::vector<std::string> stamps = StampNames(plan);
   for (std::size_t index = 0; index < plan.sources.size(); ++index) {
-    out << kBuildDir << '/' << StampName(plan, index) << ": " << DepfilePath(plan.sources[index].path);
-    for (std::size_t need : plan.sources[index].needs)
-      out << ' ' << kBuildDir << '/' << StampName(plan, need);
+    out << kBuildDir << '/' << stamps[index] << ": " << DepfilePath(plan.sources[index].path);
+    for (std::size_t need : plan.sources[index].needs) out << ' ' << kBuildDir << '/' << stamps[need];
     out << '\n';
   }
   return true;

@@ -6,6 +6,7 @@
 #include <ostream>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "ExportModel.h"
 
@@ -23,8 +24,10 @@ class BuildFileWriter {
   // One "STAMP: SOURCE STAMP..." line a source, paths escaped as make reads them.
   static bool Depfile(const ExportPlan& plan, std::ostream& out, std::string& error);
 
-  // The stamp file of source `index`, relative to the build directory.
-  static std::string StampName(const ExportPlan& plan, std::size_t index);
+  // The stamp file of every source, relative to the build directory: LIBRARY.FILENAME.stamp, with
+  // "-2", "-3"... added to a later source of the same name, so that a stamp keeps its name when
+  // sources are added before it.
+  static std::vector<std::string> StampNames(const ExportPlan& plan);
 };
 
 }  // namespace quillon

@@ -88,9 +88,10 @@ TEST(Export, DepfileAndNinjaCarryTheSameNeedsAsTheMakefile) {
   ASSERT_EQ(depfile.status, 0) << depfile.err;
   std::vector<std::string> lines = Lines(depfile.out);
   ASSERT_EQ(lines.size(), 8u);
-  EXPECT_EQ(lines[0], ".quillon-build/0-timing_pkg.vhd.stamp: " + Example("common/timing_pkg.vhd"));
-  EXPECT_EQ(lines[5], ".quillon-build/5-controller.vhd.stamp: " + Example("rtl/controller.vhd") +
-                          " .quillon-build/1-phase_timer.vhd.stamp .quillon-build/2-light_pkg.vhd.stamp");
+  EXPECT_EQ(lines[0], ".quillon-build/common.timing_pkg.vhd.stamp: " + Example("common/timing_pkg.vhd"));
+  EXPECT_EQ(lines[5],
+            ".quillon-build/work.controller.vhd.stamp: " + Example("rtl/controller.vhd") +
+                " .quillon-build/work.phase_timer.vhd.stamp .quillon-build/work.light_pkg.vhd.stamp");
 
   ScopedTempDir dir;
   CliResult ninja =
@@ -98,8 +99,9 @@ TEST(Export, DepfileAndNinjaCarryTheSameNeedsAsTheMakefile) {
   ASSERT_EQ(ninja.status, 0) << ninja.err;
   std::string text = ReadText(dir.Path("build.ninja"));
   EXPECT_NE(
-      text.find("build $build_dir/5-controller.vhd.stamp: vhdl " + Example("rtl/controller.vhd") +
-                " | $build_dir/1-phase_timer.vhd.stamp $build_dir/2-light_pkg.vhd.stamp\n  lib = work\n"),
+      text.find(
+          "build $build_dir/work.controller.vhd.stamp: vhdl " + Example("rtl/controller.vhd") +
+          " | $build_dir/work.phase_timer.vhd.stamp $build_dir/work.light_pkg.vhd.stamp\n  lib = work\n"),
       std::string::npos)
       << text;
   if (!OnPath("ninja")) GTEST_SKIP() << "ninja missing";
@@ -115,13 +117,13 @@ TEST(Export, StampsNeedOnlyEarlierSourcesAndVerilogTheVerilogBefore) {
       RunQuillon({"-q", "export", "--to", "depfile", DataPath("cycle/ping.vhd"), DataPath("cycle/pong.vhd")});
   ASSERT_EQ(cycle.status, 0) << cycle.err;
   EXPECT_EQ(Lines(cycle.out),
-            (std::vector<std::string>{".quillon-build/0-pong.vhd.stamp: " + DataPath("cycle/pong.vhd"),
-                                      ".quillon-build/1-ping.vhd.stamp: " + DataPath("cycle/ping.vhd") +
-                                          " .quillon-build/0-pong.vhd.stamp"}));
+            (std::vector<std::string>{".quillon-build/work.pong.vhd.stamp: " + DataPath("cycle/pong.vhd"),
+                                      ".quillon-build/work.ping.vhd.stamp: " + DataPath("cycle/ping.vhd") +
+                                          " .quillon-build/work.pong.vhd.stamp"}));
   CliResult verilog =
       RunQuillon({"export", "--to", "depfile", DataPath("verilog/first.v"), DataPath("verilog/second.v")});
-  EXPECT_EQ(Lines(verilog.out).back(), ".quillon-build/1-second.v.stamp: " + DataPath("verilog/second.v") +
-                                           " .quillon-build/0-first.v.stamp");
+  EXPECT_EQ(Lines(verilog.out).back(), ".quillon-build/work.second.v.stamp: " + DataPath("verilog/second.v") +
+                                           " .quillon-build/work.first.v.stamp");
 }
 
 TEST(Export, GhdlScriptAnalysesTheExampleInOrderAndElaboratesTheTop) {
