@@ -7,6 +7,7 @@
 #include <fstream>
 #include <iostream>
 #include <optional>
+#include <sstream>
 
 #include "ArchitectureCheck.h"
 #include "DeveloperTextCapture.h"
@@ -15,6 +16,8 @@
 #include "DotOutput.h"
 #include "ExitStatus.h"
 #include "FileFacts.h"
+#include "ExportPlanner.h"
+#include "ExportWriter.h"
 #include "FileGraph.h"
 #include "Host/HostComponents.h"
 #include "IHdlElement.h"
@@ -125,6 +128,10 @@ int CommandRunner::RunOnProject() {
   externalLibraries_ = sources.externalLibraries;
   externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
                             options_.externalLibraries.end());
+  verilog_.includeDirs =
+      ExportPlanner::ListEntries(sources.properties[std::string(ProjectLoader::kIncludeDirsProperty)]);
+  verilog_.defines =
+      ExportPlanner::ListEntries(sources.properties[std::string(ProjectLoader::kMacrosProperty)]);
 
   OutputFile file;
   const bool toFile = !options_.outputPath.empty();
@@ -188,6 +195,8 @@ int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount,
       return Ports(reader, out);
     case Command::kCheck:
       return Check(reader, project, fileCount, out);
+    case Command::kExport:
+      return Export(reader, project, out);
     case Command::kFactories:
       break;
   }
@@ -238,9 +247,9 @@ int CommandRunner::Tree(ProjectReader& reader, Vad::IHdlProject* project, std::o
   return status;
 }
 
-int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out) {
-  std::vector<OrderEntry> order;
+int CommandRunner::ComputeOrder(ProjectReader& reader, std::vector<OrderEntry>& order, bool& ordered) {
   CitI::Result result;
+  ordered = false;
   if (options_.top.empty()) {
     result = reader.Order(order);
   } else {
@@ -248,23 +257,29 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
     if (!unit) return BadInput("unknown design unit '" + options_.top + "'");
     result = reader.OrderOf(unit, options_.byUnit, order);
   }
-  bool ordered = result == CitI::kOk;
+  ordered = result == CitI::kOk;
   if (ordered && log_->OrderWasCut()) log_->ReportError(kCutOrder);
-  int status = Finished();
   if (result == kNoOrderForKind) {
-    status = Failed("a compile order of a single unit is given for entities, architectures and modules only",
-                    result);
-  } else if (result == kNotInHierarchy) {
-    status = Failed("'" + options_.top + "' has no place in the design hierarchy", result);
-  } else if (!ordered) {
-    status = Failed("the compile order is not available", result);
+    return Failed("a compile order of a single unit is given for entities, architectures and modules only",
+                  result);
   }
+  if (result == kNotInHierarchy)
+    return Failed("'" + options_.top + "' has no place in the design hierarchy", result);
+  if (!ordered) return Failed("the compile order is not available", result);
+  return Finished();
+}
+
+int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out) {
+  std::vector<OrderEntry> order;
+  bool ordered = false;
+  int status = ComputeOrder(reader, order, ordered);
+  if (status == kExitBadInput) return status;
 
   std::vector<Diagnostic> diagnostics =
       DiagnosticReport::AsWarnings(Diagnose(reader, project, ordered ? &order : nullptr));
   ShowDiagnostics(diagnostics);
   if (options_.format == Format::kJson) {
-    JsonOutput::Order(ordered ? &order : nullptr, log_->messages(), out, diagnostics);
+    JsonOutput::Order(ordered ? &order : nullptr, verilog_, log_->messages(), out, diagnostics);
   } else if (ordered && options_.format == Format::kDot) {
     TreeInfo tree;
     TreeReader::Read(project, tree, false);
@@ -272,6 +287,41 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
   } else if (ordered) {
     TextOutput::Order(order, options_.withLibrary, out);
   }
+  return status;
+}
+
+// Sources that no compiling tool takes (netlists, hierarchy files) are left out with a warning.
+int CommandRunner::Export(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out) {
+  std::vector<OrderEntry> order;
+  bool ordered = false;
+  int status = ComputeOrder(reader, order, ordered);
+  if (!ordered) return status;
+  ShowDiagnostics(DiagnosticReport::AsWarnings(Diagnose(reader, project, &order)));
+
+  TreeInfo tree;
+  TreeReader::Read(project, tree, false);
+  ExportPlan plan{{}, verilog_.includeDirs, verilog_.defines, std::nullopt};
+  std::vector<std::string> leftOut;
+  std::string error;
+  if (!ExportPlanner::Plan(order, FileGraph::Build(tree, order), plan, leftOut, error)) {
+    log_->ReportError(error);
+    return kExitFailed;
+  }
+  for (const std::string& path : leftOut)
+    log_->ReportWarning(path + " is left out of the export: only VHDL and Verilog sources are compiled");
+  if (!options_.top.empty()) {
+    std::string key = KeyOf(UnitFinder(reader.designUnits()).Find(options_.top));
+    plan.top = ExportPlanner::TopOf(key, reader.Files());
+    if (!plan.top)
+      log_->ReportWarning(key + " is no entity, architecture or module: the export names no top");
+  }
+  // A format that cannot carry some path is found out midway: nothing is written then.
+  std::ostringstream text;
+  if (!ExportWriter::Write(options_.exportTo, plan, text, error)) {
+    log_->ReportError(error);
+    return kExitFailed;
+  }
+  out << text.str();
   return status;
 }
 

@@ -28,6 +28,10 @@ class CommandRunner {
   int Units(ProjectReader& reader, std::ostream& out);
   int Tree(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out);
   int Order(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out);
+  int Export(ProjectReader& reader, Vad::IHdlProject* project, std::ostream& out);
+  // The order of the whole project or of --top/--unit, failures reported: the exit status so far
+  // and whether `order` was filled.
+  int ComputeOrder(ProjectReader& reader, std::vector<OrderEntry>& order, bool& ordered);
   int Ports(ProjectReader& reader, std::ostream& out);
   int Check(ProjectReader& reader, Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out);
 
@@ -48,6 +52,7 @@ class CommandRunner {
   MessageLog* log_ = nullptr;
   // From the command line and the project file.
   std::vector<std::string> externalLibraries_;
+  VerilogSettings verilog_;
 };
 
 }  // namespace quillon

@@ -92,6 +92,12 @@ struct OrderEntry {
   std::string plugin;
 };
 
+// The project's Verilog include directories and macros (NAME or NAME=VALUE), in the order given.
+struct VerilogSettings {
+  std::vector<std::string> includeDirs;
+  std::vector<std::string> defines;
+};
+
 // One port of a design unit; the bounds are unset when the port has no range.
 struct PortInfo {
   std::string name;

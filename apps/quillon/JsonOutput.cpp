@@ -190,8 +190,9 @@ void JsonOutput::Tree(const TreeInfo* tree, const std::vector<MessageInfo>& mess
   out << ",\n  \"diagnostics\": " << indented(DiagnosticList(diagnostics)) << "\n}\n";
 }
 
-void JsonOutput::Order(const std::vector<OrderEntry>* order, const std::vector<MessageInfo>& messages,
-                       std::ostream& out, const std::vector<Diagnostic>& diagnostics) {
+void JsonOutput::Order(const std::vector<OrderEntry>* order, const VerilogSettings& verilog,
+                       const std::vector<MessageInfo>& messages, std::ostream& out,
+                       const std::vector<Diagnostic>& diagnostics) {
   Json list = nullptr;
   if (order) {
     list = Json::array();
@@ -200,6 +201,8 @@ void JsonOutput::Order(const std::vector<OrderEntry>* order, const std::vector<M
     }
   }
   Write({{"order", std::move(list)},
+         {"includeDirs", verilog.includeDirs},
+         {"defines", verilog.defines},
          {"messages", MessageList(messages)},
          {"diagnostics", DiagnosticList(diagnostics)}},
         out);

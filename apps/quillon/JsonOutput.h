@@ -23,8 +23,10 @@ class JsonOutput {
   static void Tree(const TreeInfo* tree, const std::vector<MessageInfo>& messages, std::ostream& out,
                    const std::vector<Diagnostic>& diagnostics = {});
   static constexpr std::size_t kDeepestIndent = 100;
-  static void Order(const std::vector<OrderEntry>* order, const std::vector<MessageInfo>& messages,
-                    std::ostream& out, const std::vector<Diagnostic>& diagnostics = {});
+  // "includeDirs" and "defines" come with the order, so that its reader can compile the files.
+  static void Order(const std::vector<OrderEntry>* order, const VerilogSettings& verilog,
+                    const std::vector<MessageInfo>& messages, std::ostream& out,
+                    const std::vector<Diagnostic>& diagnostics = {});
   static void Check(std::size_t files, std::size_t units, const std::vector<MessageInfo>& messages,
                     const std::vector<Diagnostic>& diagnostics, std::ostream& out);
   // "low", "high" and "span" are null for a port without a range; "ports" is null when the

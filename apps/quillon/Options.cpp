@@ -18,6 +18,8 @@ constexpr const char* kUsage =
     "  ports UNIT   the ports of a design unit\n"
     "  check        read everything and report problems only\n"
     "  factories    the classes the module registers\n"
+    "  export --to make|ninja|depfile|ghdl|iverilog|edam|tcl\n"
+    "               the compile order as a build file or tool script (--top UNIT: its files)\n"
     "\n"
     "sources:\n"
     "  SOURCE                a source file; the plug-in follows from its extension\n"
@@ -57,8 +59,9 @@ constexpr const char* kUsage =
 
 const std::map<std::string, Command>& CommandNames() {
   static const std::map<std::string, Command> names = {
-      {"units", Command::kUnits}, {"tree", Command::kTree},   {"order", Command::kOrder},
-      {"ports", Command::kPorts}, {"check", Command::kCheck}, {"factories", Command::kFactories}};
+      {"units", Command::kUnits},  {"tree", Command::kTree},   {"order", Command::kOrder},
+      {"ports", Command::kPorts},  {"check", Command::kCheck}, {"factories", Command::kFactories},
+      {"export", Command::kExport}};
   return names;
 }
 
@@ -137,6 +140,8 @@ void Parser::Declare() {
   app_.add_flag("--with-library", options_.withLibrary);
   app_.add_option("--depth", options_.depth)->check(CLI::NonNegativeNumber);
   app_.add_flag("--instances", options_.instancesOnly);
+  app_.add_option("--to", options_.exportTo)
+      ->check(CLI::IsMember({"make", "ninja", "depfile", "ghdl", "iverilog", "edam", "tcl"}));
   app_.add_option("--format", format_)->check(CLI::IsMember({"text", "json", "dot"}));
   app_.add_option("-o", options_.outputPath);
   app_.add_flag("-q", options_.quiet);
@@ -241,16 +246,25 @@ bool Parser::CheckCombination(std::string& error) const {
     error = "--top and --unit exclude each other";
     return false;
   }
-  if ((o.byUnit || o.withLibrary) && o.command != Command::kOrder) {
-    error = "--unit and --with-library apply to the order command only";
+  if (o.byUnit && o.command != Command::kOrder && o.command != Command::kExport) {
+    error = "--unit applies to the order and export commands only";
     return false;
   }
-  if (!o.top.empty() && o.command != Command::kOrder && o.command != Command::kTree) {
-    error = "--top applies to the tree and order commands only";
+  if (o.withLibrary && o.command != Command::kOrder) {
+    error = "--with-library applies to the order command only";
+    return false;
+  }
+  if (!o.top.empty() && o.command != Command::kOrder && o.command != Command::kTree &&
+      o.command != Command::kExport) {
+    error = "--top applies to the tree, order and export commands only";
     return false;
   }
   if ((o.depth || o.instancesOnly) && o.command != Command::kTree) {
     error = "--depth and --instances apply to the tree command only";
+    return false;
+  }
+  if (o.exportTo.empty() != (o.command != Command::kExport)) {
+    error = "export needs --to FORMAT, and --to applies to export only";
     return false;
   }
   if (o.format == Format::kDot && o.command != Command::kTree && o.command != Command::kOrder) {

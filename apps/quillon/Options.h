@@ -9,7 +9,7 @@
 
 namespace quillon {
 
-enum class Command { kUnits, kTree, kOrder, kPorts, kCheck, kFactories };
+enum class Command { kUnits, kTree, kOrder, kPorts, kCheck, kFactories, kExport };
 enum class Format { kText, kJson, kDot };
 
 // One argument that names sources, in command-line order, with the library and plug-in that the
@@ -48,6 +48,7 @@ class Options {
   std::string top;      // --top or --unit
   bool byUnit = false;  // --unit
   bool withLibrary = false;
+  std::string exportTo;  // export --to FORMAT
 
   std::optional<std::size_t> depth;  // tree --depth N: levels shown below the first
   bool instancesOnly = false;        // tree --instances
