@@ -33,15 +33,16 @@ Prjrep::AutoRelease<Vad::IHdlFileIterator> FilesOf(Vad::IHdlProject* project) {
   return files;
 }
 
+// The records are listed first so that their large descriptions are built in place, never moved.
 std::vector<UnitInfo> UnitsOf(Vad::IHdlFile* file) {
   std::vector<UnitInfo> units;
   Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> iterator;
   if (file->getDesignUnits(nullptr, iterator.Out()) != CitI::kOk) return units;
-  ForEachIn(iterator.Get(), [&](Vad::IHdlDesignUnit* unit) {
-    UnitInfo info;
-    UnitRecordReader::Read(unit, info);
-    units.push_back(std::move(info));
-  });
+  std::vector<Vad::IHdlDesignUnit*> records;
+  ForEachIn(iterator.Get(), [&](Vad::IHdlDesignUnit* unit) { records.push_back(unit); });
+  units.resize(records.size());
+  UnitRecordReader reader;
+  for (std::size_t i = 0; i < records.size(); ++i) reader.Read(records[i], units[i]);
   return units;
 }
 

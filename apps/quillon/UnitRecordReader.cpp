@@ -208,21 +208,27 @@ std::string UnitRecordReader::TypeName(std::uint32_t typeCode) {
   return "Unknown";
 }
 
+const std::optional<std::string>& UnitRecordReader::ParentKeyOf(Prjrep::IPersist* parent) {
+  auto [entry, added] = parentKeys_.try_emplace(parent);
+  if (added) {
+    RecordFields fields;
+    if (ReadFields(parent, fields) || !fields.storeKey.empty()) entry->second = std::move(fields.storeKey);
+  }
+  return entry->second;
+}
+
 bool UnitRecordReader::Read(CitI::IInterface* unit, UnitInfo& info) {
   info.key = DesignUnitKeyOf(unit);
   RecordFields fields;
   bool complete = ReadFields(Prjrep::QueryAs<Prjrep::IPersist>(unit), fields);
   info.type = TypeName(fields.type);
-  info.name = fields.name;
-  info.storeKey = fields.storeKey;
+  info.name = std::move(fields.name);
+  info.storeKey = std::move(fields.storeKey);
   info.line = fields.line;
   info.unitFlag = fields.unitFlag;
   info.inGenerate = fields.inGenerate;
-  info.partition = fields.partition;
-  if (fields.parent) {
-    RecordFields parent;
-    if (ReadFields(fields.parent, parent) || !parent.storeKey.empty()) info.parent = parent.storeKey;
-  }
+  info.partition = std::move(fields.partition);
+  if (fields.parent) info.parent = ParentKeyOf(fields.parent);
   info.uses = UseStoreKeysOf(unit);
   TakeKindFields(fields, info);
   return complete;
