@@ -17,6 +17,7 @@
 #include "Host/HostComponents.h"
 #include "IName.h"
 #include "JsonOutput.h"
+#include "LibraryResolver.h"
 #include "ModuleLoader.h"
 #include "OutputFile.h"
 #include "Port/MsgManData.h"
@@ -161,6 +162,8 @@ int CommandRunner::RunOnProject() {
   }
   for (const std::string& warning : sources.warnings) log_->ReportWarning(warning);
   ProjectBuilder::SetInstallRootWhenUnset();
+  if (!AddLibraryModules(sources)) return kExitFailed;
+  shownPaths_ = ShownPaths(sources, options_.absolutePaths);
   ProjectBuilder builder;
   if (!builder.Build(sources, error)) {
     log_->ReportError(error);
@@ -177,6 +180,17 @@ int CommandRunner::RunOnProject() {
     return kExitFailed;
   }
   return status;
+}
+
+bool CommandRunner::AddLibraryModules(ProjectSources& sources) {
+  const ProjectSources::LibrarySearch& search = sources.librarySearch;
+  if (search.directories.empty() && search.files.empty()) return true;
+  std::string error;
+  log_->disable();
+  bool resolved = LibraryResolver(sources).Resolve(error);
+  log_->enable();
+  if (!resolved) log_->ReportError(error);
+  return resolved;
 }
 
 int CommandRunner::RunCommand(Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out) {
@@ -214,6 +228,7 @@ int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount,
 
 int CommandRunner::Units(ProjectReader& reader, std::ostream& out) {
   std::vector<FileInfo> files = reader.Files();
+  shownPaths_.Apply(files);
   if (options_.format == Format::kJson) {
     JsonOutput::Units(files, log_->messages(), out);
   } else {
@@ -230,6 +245,8 @@ int CommandRunner::Tree(ProjectReader& reader, Vad::IHdlProject* project, std::o
   bool built = result == CitI::kOk;
   // The order is not asked for: its cycle messages belong to the order command.
   std::vector<Diagnostic> diagnostics = DiagnosticReport::AsWarnings(Diagnose(reader, project, nullptr));
+  shownPaths_.Apply(tree);
+  shownPaths_.Apply(diagnostics);
   ShowDiagnostics(diagnostics);
   if (json) {
     JsonOutput::Tree(built ? &tree : nullptr, log_->messages(), out, diagnostics);
@@ -265,12 +282,15 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
 
   std::vector<Diagnostic> diagnostics =
       DiagnosticReport::AsWarnings(Diagnose(reader, project, ordered ? &order : nullptr));
+  shownPaths_.Apply(order);
+  shownPaths_.Apply(diagnostics);
   ShowDiagnostics(diagnostics);
   if (options_.format == Format::kJson) {
     JsonOutput::Order(ordered ? &order : nullptr, log_->messages(), out, diagnostics);
   } else if (ordered && options_.format == Format::kDot) {
     TreeInfo tree;
     TreeReader::Read(project, tree, false);
+    shownPaths_.Apply(tree);
     DotOutput::Order(FileGraph::Build(tree, order), out);
   } else if (ordered) {
     TextOutput::Order(order, options_.withLibrary, out);
@@ -323,6 +343,7 @@ int CommandRunner::Check(ProjectReader& reader, Vad::IHdlProject* project, std::
     if (log_->OrderWasCut() && !HasCode(diagnostics, DiagnosticCode::kNoValidOrder))
       diagnostics.push_back({Diagnostic::Severity::kError, DiagnosticCode::kNoValidOrder, kCutOrder, "", 0});
   }
+  shownPaths_.Apply(diagnostics);
   ShowDiagnostics(diagnostics);
   std::size_t errors = DiagnosticReport::Count(diagnostics, Diagnostic::Severity::kError);
   std::size_t warnings = DiagnosticReport::Count(diagnostics, Diagnostic::Severity::kWarning);

@@ -39,10 +39,11 @@ struct UnitInfo {
 };
 
 struct FileInfo {
-  std::string path;
+  std::string path;  // full, or as shown once ShownPaths applied
   std::string plugin;
   std::string library;
   std::vector<UnitInfo> units;
+  std::string fullPath = {};  // set by ShownPaths
 };
 
 struct TreeNodeInfo {
@@ -57,6 +58,7 @@ struct TreeNodeInfo {
   std::string partition;
   std::optional<std::string> elementType;
   std::optional<std::string> file;
+  std::optional<std::string> fileFullPath;  // set by ShownPaths
   // Indices of the children in TreeInfo::nodes, in child order.
   std::vector<std::size_t> children;
   // Set on a later occurrence of a shared subtree: the index of its first occurrence. Such an
@@ -76,9 +78,10 @@ struct TreeInfo {
 };
 
 struct OrderEntry {
-  std::string path;
+  std::string path;  // full, or as shown once ShownPaths applied
   std::string library;
   std::string plugin;
+  std::string fullPath = {};  // set by ShownPaths
 };
 
 // One port of a design unit; the bounds are unset when the port has no range.

@@ -141,7 +141,7 @@ TEST(Units, OutputFileTakesTheAnswerInsteadOfStandardOutput) {
 TEST(Units, VerboseAddsTheDeveloperTexts) {
   const std::vector<std::pair<std::string, std::string>> noDebugVariable{{"QUILLON_DEBUG", ""}};
   const std::vector<std::string> args{"--plugin", "PLUGIN_Unheard", "units", DataPath("mixed/top.vhd")};
-  std::vector<std::string> verbose{"-v"};
+  std::vector<std::string> verbose{"--verbose"};
   verbose.insert(verbose.end(), args.begin(), args.end());
   const std::string text = "Parser PLUGIN_Unheard not found. Using PLUGIN_General";
 
