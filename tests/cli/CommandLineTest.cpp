@@ -46,6 +46,9 @@ TEST(CommandLine, UsageMistakesAreRejectedWithStatusTwo) {
       {{"--top", "top", "--unit", "top", "order", top}, "--unit"},
       {{"--property", "NOVALUE", "units", top}, "NOVALUE"},
       {{"-D", "=1", "units", top}, "-D"},
+      {{"units", top, "-l", "common"}, "--library common applies to no source"},
+      {{"units", top, "--plugin", "PLUGIN_Vhdl"}, "--plugin PLUGIN_Vhdl applies to no source"},
+      {{"units", "--lib", "common"}, "--lib needs NAME=PATH"},
   };
   for (const BadInput& bad : cases) {
     SCOPED_TRACE(bad.named);

@@ -41,7 +41,7 @@ std::string ExpectedText(const std::string& name) {
 
 const Json* FileNamed(const Json& units, const std::string& path) {
   for (const Json& file : units["files"]) {
-    if (file["path"] == path) return &file;
+    if (file["fullPath"] == path) return &file;
   }
   return nullptr;
 }
@@ -73,7 +73,7 @@ TEST(Units, FileListReadsTheSameFilesAsTheProjectFile) {
   Json fromProject = UnitsOf({"-P", DataPath("mixed/project.json")});
   ASSERT_EQ(fromList["files"].size(), fromProject["files"].size());
   for (std::size_t i = 0; i < fromList["files"].size(); ++i) {
-    EXPECT_EQ(fromList["files"][i]["path"], fromProject["files"][i]["path"]);
+    EXPECT_EQ(fromList["files"][i]["fullPath"], fromProject["files"][i]["path"]);
     EXPECT_EQ(KeysOf(fromList["files"][i]), KeysOf(fromProject["files"][i]));
   }
   // The list names no library: everything goes to work.
