@@ -5,6 +5,7 @@
 #include <cctype>
 #include <filesystem>
 #include <iterator>
+#include <set>
 #include <string_view>
 
 #include "Options.h"
@@ -90,14 +91,19 @@ std::string FileList::Resolved(const std::string& path, const std::string& baseD
 
 bool FileList::Read(const std::string& path, bool relativeToList, const std::string& library,
                     const std::string& plugin, Contents& out, std::string& error) {
-  std::vector<Frame> stack(1);
-  stack.front().library = library;
-  stack.front().plugin = plugin;
-  if (!Open(path, "", relativeToList, stack.front(), error)) return false;
+  Frame first;
+  first.library = library;
+  first.plugin = plugin;
+  if (!Open(path, "", relativeToList, first, error)) return false;
+  std::vector<Frame> stack;
+  std::set<std::string> open;  // the keys of the lists on the stack
+  open.insert(first.key);
+  stack.push_back(std::move(first));
   while (!stack.empty()) {
     if (stack.back().next == stack.back().tokens.size()) {
+      open.erase(stack.back().key);
       stack.pop_back();
-    } else if (!TakeToken(stack, out, error)) {
+    } else if (!TakeToken(stack, open, out, error)) {
       return false;
     }
   }
@@ -216,7 +222,8 @@ bool FileList::ExpandVariable(const std::string& text, std::size_t& at, std::str
   return true;
 }
 
-bool FileList::TakeToken(std::vector<Frame>& stack, Contents& out, std::string& error) {
+bool FileList::TakeToken(std::vector<Frame>& stack, std::set<std::string>& open, Contents& out,
+                         std::string& error) {
   Frame& frame = stack.back();
   const Token& token = frame.tokens[frame.next++];
   const std::string& text = token.text;
@@ -243,8 +250,7 @@ bool FileList::TakeToken(std::vector<Frame>& stack, Contents& out, std::string& 
         error = where + error;
         return false;
       }
-      auto same = [&](const Frame& open) { return open.key == nested.key; };
-      if (std::any_of(stack.begin(), stack.end(), same)) {
+      if (!open.insert(nested.key).second) {
         error = where + "the list " + nested.name + " includes itself";
         return false;
       }

@@ -6,6 +6,7 @@
 #include <functional>
 #include <istream>
 #include <optional>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -68,7 +69,7 @@ class FileList {
             std::string& error);
   bool Tokenize(const std::string& text, std::vector<Token>& tokens, int& line, std::string& error) const;
   bool ExpandVariable(const std::string& text, std::size_t& at, std::string& into, std::string& error) const;
-  bool TakeToken(std::vector<Frame>& stack, Contents& out, std::string& error);
+  bool TakeToken(std::vector<Frame>& stack, std::set<std::string>& open, Contents& out, std::string& error);
 
   ReadFile read_;
   Lookup lookup_;

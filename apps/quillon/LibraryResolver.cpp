@@ -47,9 +47,7 @@ bool LibraryResolver::Resolve(std::string& error) {
         std::optional<SourceFile> definer = Find(name);
         if (!definer || !taken.insert(definer->path).second) continue;
         // The other modules of a -v file come with it.
-        for (const auto& [module, offerer] : offered_) {
-          if (offerer.path == definer->path) defined_.insert(module);
-        }
+        for (const std::string& module : modulesOfFile_[definer->path]) defined_.insert(module);
         toScan.push_back(*definer);
         sources_.files.push_back(WithDefaults(*definer));
       }
@@ -90,7 +88,9 @@ bool LibraryResolver::OfferLibraryFileModules(std::string& error) {
     auto file = byPath.find(info.path);
     if (file == byPath.end()) continue;
     for (const UnitInfo& unit : info.units) {
-      if (unit.type == kModuleType) offered_.emplace(unit.name, *file->second);
+      if (unit.type != kModuleType) continue;
+      offered_.emplace(unit.name, *file->second);
+      modulesOfFile_[info.path].push_back(unit.name);
     }
   }
   return true;
