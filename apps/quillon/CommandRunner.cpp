@@ -182,6 +182,12 @@ int CommandRunner::RunOnProject() {
   return status;
 }
 
+std::vector<MessageInfo> CommandRunner::Messages() const {
+  std::vector<MessageInfo> messages = log_->messages();
+  shownPaths_.Apply(messages);
+  return messages;
+}
+
 bool CommandRunner::AddLibraryModules(ProjectSources& sources) {
   const ProjectSources::LibrarySearch& search = sources.librarySearch;
   if (search.directories.empty() && search.files.empty()) return true;
@@ -206,7 +212,7 @@ int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount,
   ProjectReader reader(project, progress);
   if (CitI::Result result = reader.Parse(); result != CitI::kOk) {
     int status = Failed("the sources could not be read", result);
-    if (options_.format == Format::kJson) JsonOutput::Messages(log_->messages(), out);
+    if (options_.format == Format::kJson) JsonOutput::Messages(Messages(), out);
     return status;
   }
   switch (options_.command) {
@@ -230,7 +236,7 @@ int CommandRunner::Units(ProjectReader& reader, std::ostream& out) {
   std::vector<FileInfo> files = reader.Files();
   shownPaths_.Apply(files);
   if (options_.format == Format::kJson) {
-    JsonOutput::Units(files, log_->messages(), out);
+    JsonOutput::Units(files, Messages(), out);
   } else {
     TextOutput::Units(files, out);
   }
@@ -249,7 +255,7 @@ int CommandRunner::Tree(ProjectReader& reader, Vad::IHdlProject* project, std::o
   shownPaths_.Apply(diagnostics);
   ShowDiagnostics(diagnostics);
   if (json) {
-    JsonOutput::Tree(built ? &tree : nullptr, log_->messages(), out, diagnostics);
+    JsonOutput::Tree(built ? &tree : nullptr, Messages(), out, diagnostics);
   } else if (built && options_.format == Format::kDot) {
     DotOutput::Tree(tree, out);
   } else if (built) {
@@ -286,7 +292,7 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
   shownPaths_.Apply(diagnostics);
   ShowDiagnostics(diagnostics);
   if (options_.format == Format::kJson) {
-    JsonOutput::Order(ordered ? &order : nullptr, log_->messages(), out, diagnostics);
+    JsonOutput::Order(ordered ? &order : nullptr, Messages(), out, diagnostics);
   } else if (ordered && options_.format == Format::kDot) {
     TreeInfo tree;
     TreeReader::Read(project, tree, false);
@@ -323,7 +329,7 @@ int CommandRunner::Ports(ProjectReader& reader, std::ostream& out) {
     status = kExitFailed;
   }
   if (options_.format == Format::kJson) {
-    JsonOutput::Ports(key, ports ? &*ports : nullptr, log_->messages(), out);
+    JsonOutput::Ports(key, ports ? &*ports : nullptr, Messages(), out);
   } else if (ports) {
     TextOutput::Ports(*ports, out);
   }
@@ -351,7 +357,7 @@ int CommandRunner::Check(ProjectReader& reader, Vad::IHdlProject* project, std::
     status = kExitFailed;
   std::size_t units = reader.designUnits() ? reader.designUnits()->GetCount() : 0;
   if (options_.format == Format::kJson) {
-    JsonOutput::Check(fileCount, units, log_->messages(), diagnostics, out);
+    JsonOutput::Check(fileCount, units, Messages(), diagnostics, out);
   } else {
     TextOutput::CheckSummary(fileCount, units, log_->getErrCount() + static_cast<int>(errors),
                              log_->getWarnCount() + static_cast<int>(warnings), out);

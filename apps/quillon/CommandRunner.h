@@ -37,6 +37,8 @@ class CommandRunner {
                                    const std::vector<OrderEntry>* order) const;
   // Writes the diagnostics to standard error unless quiet.
   void ShowDiagnostics(const std::vector<Diagnostic>& diagnostics) const;
+  // The messages so far, with their source files as the output shows them.
+  std::vector<MessageInfo> Messages() const;
   // Adds the -y and -v files that the sources need; false after reporting why not.
   bool AddLibraryModules(ProjectSources& sources);
 

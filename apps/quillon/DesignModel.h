@@ -14,8 +14,9 @@ namespace quillon {
 struct MessageInfo {
   std::string severity;  // "error", "warning" or "info"
   std::string text;
-  std::string source;
+  std::string source;  // a file's path, as shown once ShownPaths applied, or a program's name
   int line = 0;
+  std::string sourceFullPath = {};  // set by ShownPaths
 };
 
 // One record of a file's design-unit set. Fields that a record kind does not have stay unset.

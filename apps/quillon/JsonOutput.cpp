@@ -26,6 +26,7 @@ Json MessageList(const std::vector<MessageInfo>& messages) {
     list.push_back({{"severity", message.severity},
                     {"text", message.text},
                     {"source", message.source},
+                    {"sourceFullPath", message.sourceFullPath},
                     {"line", message.line}});
   }
   return list;

@@ -74,12 +74,6 @@ bool LibraryResolver::Scan(const std::vector<SourceFile>& files, std::vector<Fil
 bool LibraryResolver::OfferLibraryFileModules(std::string& error) {
   const std::vector<SourceFile>& files = sources_.librarySearch.files;
   if (files.empty()) return true;
-  for (const SourceFile& file : files) {
-    if (!IsRegularFile(file.path)) {
-      error = "cannot read the library file " + file.givenPath;
-      return false;
-    }
-  }
   std::vector<FileInfo> found;
   if (!Scan(files, found, error)) return false;
   std::map<std::string, const SourceFile*> byPath;

@@ -301,8 +301,22 @@ bool ProjectLoader::TakeListContents(FileList::Contents contents, std::string& e
     return SourceFile{Canonical(entry.path, ""), entry.path, entry.library.empty() ? kDefaultLibrary : entry.library,
                       entry.plugin};
   };
-  for (const FileList::Entry& entry : contents.libraryDirs) search.directories.push_back(place(entry));
-  for (const FileList::Entry& entry : contents.libraryFiles) search.files.push_back(place(entry));
+  for (const FileList::Entry& entry : contents.libraryDirs) {
+    search.directories.push_back(place(entry));
+    if (!Port::File::isDirectory(search.directories.back().path.c_str())) {
+      error = entry.where + "no such library directory: " + entry.path;
+      return false;
+    }
+  }
+  for (const FileList::Entry& entry : contents.libraryFiles) {
+    search.files.push_back(place(entry));
+    if (!IsReadableRegularFile(search.files.back().path, Port::InputLimits::kMaxSourceBytes,
+                               Port::InputLimits::kSourceTooLarge, error)) {
+      if (error.empty()) error = "no such library file: " + entry.path;
+      error = entry.where + error;
+      return false;
+    }
+  }
   for (const FileList::Entry& source : contents.sources) {
     if (!AddGiven(source.path, source.library, source.plugin, error)) {
       error = source.where + error;

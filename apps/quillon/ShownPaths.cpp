@@ -41,4 +41,11 @@ void ShownPaths::Apply(std::vector<Diagnostic>& diagnostics) const {
   }
 }
 
+void ShownPaths::Apply(std::vector<MessageInfo>& messages) const {
+  for (MessageInfo& message : messages) {
+    message.sourceFullPath = message.source;
+    message.source = Of(message.sourceFullPath);
+  }
+}
+
 }  // namespace quillon

@@ -25,6 +25,7 @@ class ShownPaths {
   void Apply(std::vector<OrderEntry>& order) const;
   void Apply(TreeInfo& tree) const;
   void Apply(std::vector<Diagnostic>& diagnostics) const;
+  void Apply(std::vector<MessageInfo>& messages) const;
 
  private:
   std::map<std::string, std::string> given_;  // full path -> as given

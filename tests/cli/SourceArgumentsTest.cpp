@@ -35,6 +35,11 @@ const std::vector<std::string> kNeeded = {"rtl/top.v", "rtl/counter.v", "lib/alu
 TEST(SourceArguments, LibraryModulesAreReadWhenInstantiatedAndNotDefined) {
   EXPECT_EQ(OrderIn(kLibsearch, {"-F", "rtl/files.f"}), kNeeded);
   EXPECT_EQ(OrderIn(kLibsearch, {"rtl/top.v", "rtl/counter.v", "-y", "lib", "-v", "cells/cells.v"}), kNeeded);
+  ScopedTextFile list("rtl/top.v\n-y lib\n  -v cells/absent.v\n");
+  CliResult missing = RunIn(kLibsearch, {"units", "-f", list.path()});
+  EXPECT_EQ(missing.status, 2);
+  EXPECT_NE(missing.err.find(list.path() + ":3: no such library file: cells/absent.v"), std::string::npos)
+      << missing.err;
   // Without the library places the design misses its modules, and says so.
   CliResult alone = RunIn(kLibsearch, {"check", "--strict", "rtl/top.v", "rtl/counter.v"});
   EXPECT_EQ(alone.status, 1);
