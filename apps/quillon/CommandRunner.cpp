@@ -23,6 +23,7 @@
 #include "IHdlElement.h"
 #include "IName.h"
 #include "JsonOutput.h"
+#include "LibraryResolver.h"
 #include "ModuleLoader.h"
 #include "OutputFile.h"
 #include "Port/MsgManData.h"
@@ -150,6 +151,8 @@ int CommandRunner::RunOnProject() {
   }
   for (const std::string& warning : sources.warnings) log_->ReportWarning(warning);
   ProjectBuilder::SetInstallRootWhenUnset();
+  if (!AddLibraryModules(sources)) return kExitFailed;
+  shownPaths_ = ShownPaths(sources, options_.absolutePaths);
   ProjectBuilder builder;
   if (!builder.Build(sources, error)) {
     log_->ReportError(error);
@@ -168,6 +171,23 @@ int CommandRunner::RunOnProject() {
   return status;
 }
 
+std::vector<MessageInfo> CommandRunner::Messages() const {
+  std::vector<MessageInfo> messages = log_->messages();
+  shownPaths_.Apply(messages);
+  return messages;
+}
+
+bool CommandRunner::AddLibraryModules(ProjectSources& sources) {
+  const ProjectSources::LibrarySearch& search = sources.librarySearch;
+  if (search.directories.empty() && search.files.empty()) return true;
+  std::string error;
+  log_->disable();
+  bool resolved = LibraryResolver(sources).Resolve(error);
+  log_->enable();
+  if (!resolved) log_->ReportError(error);
+  return resolved;
+}
+
 int CommandRunner::RunCommand(Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out) {
   Progress progress(options_.quiet, fileCount);
   log_->SetProgress(&progress);
@@ -181,7 +201,7 @@ int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount,
   ProjectReader reader(project, progress);
   if (CitI::Result result = reader.Parse(); result != CitI::kOk) {
     int status = Failed("the sources could not be read", result);
-    if (options_.format == Format::kJson) JsonOutput::Messages(log_->messages(), out);
+    if (options_.format == Format::kJson) JsonOutput::Messages(Messages(), out);
     return status;
   }
   switch (options_.command) {
@@ -205,8 +225,9 @@ int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount,
 
 int CommandRunner::Units(ProjectReader& reader, std::ostream& out) {
   std::vector<FileInfo> files = reader.Files();
+  shownPaths_.Apply(files);
   if (options_.format == Format::kJson) {
-    JsonOutput::Units(files, log_->messages(), out);
+    JsonOutput::Units(files, Messages(), out);
   } else {
     TextOutput::Units(files, out);
   }
@@ -236,9 +257,11 @@ int CommandRunner::Tree(ProjectReader& reader, Vad::IHdlProject* project, std::o
   if (built && !view.ShowsAll()) tree = TreeView::Select(tree, view);
   // The order is not asked for: its cycle messages belong to the order command.
   std::vector<Diagnostic> diagnostics = DiagnosticReport::AsWarnings(Diagnose(reader, project, nullptr));
+  shownPaths_.Apply(tree);
+  shownPaths_.Apply(diagnostics);
   ShowDiagnostics(diagnostics);
   if (json) {
-    JsonOutput::Tree(built ? &tree : nullptr, log_->messages(), out, diagnostics);
+    JsonOutput::Tree(built ? &tree : nullptr, Messages(), out, diagnostics);
   } else if (built && options_.format == Format::kDot) {
     DotOutput::Tree(tree, out);
   } else if (built) {
@@ -277,12 +300,15 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
 
   std::vector<Diagnostic> diagnostics =
       DiagnosticReport::AsWarnings(Diagnose(reader, project, ordered ? &order : nullptr));
+  shownPaths_.Apply(order);
+  shownPaths_.Apply(diagnostics);
   ShowDiagnostics(diagnostics);
   if (options_.format == Format::kJson) {
-    JsonOutput::Order(ordered ? &order : nullptr, verilog_, log_->messages(), out, diagnostics);
+    JsonOutput::Order(ordered ? &order : nullptr, verilog_, Messages(), out, diagnostics);
   } else if (ordered && options_.format == Format::kDot) {
     TreeInfo tree;
     TreeReader::Read(project, tree, false);
+    shownPaths_.Apply(tree);
     DotOutput::Order(FileGraph::Build(tree, order), out);
   } else if (ordered) {
     TextOutput::Order(order, options_.withLibrary, out);
@@ -350,7 +376,7 @@ int CommandRunner::Ports(ProjectReader& reader, std::ostream& out) {
     status = kExitFailed;
   }
   if (options_.format == Format::kJson) {
-    JsonOutput::Ports(key, ports ? &*ports : nullptr, log_->messages(), out);
+    JsonOutput::Ports(key, ports ? &*ports : nullptr, Messages(), out);
   } else if (ports) {
     TextOutput::Ports(*ports, out);
   }
@@ -370,6 +396,7 @@ int CommandRunner::Check(ProjectReader& reader, Vad::IHdlProject* project, std::
     if (log_->OrderWasCut() && !HasCode(diagnostics, DiagnosticCode::kNoValidOrder))
       diagnostics.push_back({Diagnostic::Severity::kError, DiagnosticCode::kNoValidOrder, kCutOrder, "", 0});
   }
+  shownPaths_.Apply(diagnostics);
   ShowDiagnostics(diagnostics);
   std::size_t errors = DiagnosticReport::Count(diagnostics, Diagnostic::Severity::kError);
   std::size_t warnings = DiagnosticReport::Count(diagnostics, Diagnostic::Severity::kWarning);
@@ -377,7 +404,7 @@ int CommandRunner::Check(ProjectReader& reader, Vad::IHdlProject* project, std::
     status = kExitFailed;
   std::size_t units = reader.designUnits() ? reader.designUnits()->GetCount() : 0;
   if (options_.format == Format::kJson) {
-    JsonOutput::Check(fileCount, units, log_->messages(), diagnostics, out);
+    JsonOutput::Check(fileCount, units, Messages(), diagnostics, out);
   } else {
     TextOutput::CheckSummary(fileCount, units, log_->getErrCount() + static_cast<int>(errors),
                              log_->getWarnCount() + static_cast<int>(warnings), out);

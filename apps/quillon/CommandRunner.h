@@ -10,6 +10,7 @@
 #include "MessageLog.h"
 #include "Options.h"
 #include "ProjectReader.h"
+#include "ShownPaths.h"
 
 namespace quillon {
 
@@ -40,6 +41,10 @@ class CommandRunner {
                                    const std::vector<OrderEntry>* order) const;
   // Writes the diagnostics to standard error unless quiet.
   void ShowDiagnostics(const std::vector<Diagnostic>& diagnostics) const;
+  // The messages so far, with their source files as the output shows them.
+  std::vector<MessageInfo> Messages() const;
+  // Adds the -y and -v files that the sources need; false after reporting why not.
+  bool AddLibraryModules(ProjectSources& sources);
 
   // Reports the module's failure of `what` and returns kExitFailed.
   int Failed(const std::string& what, CitI::Result result);
@@ -53,6 +58,7 @@ class CommandRunner {
   // From the command line and the project file.
   std::vector<std::string> externalLibraries_;
   VerilogSettings verilog_;
+  ShownPaths shownPaths_;
 };
 
 }  // namespace quillon

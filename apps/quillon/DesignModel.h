@@ -21,8 +21,9 @@ inline std::string_view BaseNameOf(std::string_view path) {
 struct MessageInfo {
   std::string severity;  // "error", "warning" or "info"
   std::string text;
-  std::string source;
+  std::string source;  // a file's path, as shown once ShownPaths applied, or a program's name
   int line = 0;
+  std::string sourceFullPath = {};  // set by ShownPaths
 };
 
 // One record of a file's design-unit set. Fields that a record kind does not have stay unset.
@@ -46,10 +47,11 @@ struct UnitInfo {
 };
 
 struct FileInfo {
-  std::string path;
+  std::string path;  // full, or as shown once ShownPaths applied
   std::string plugin;
   std::string library;
   std::vector<UnitInfo> units;
+  std::string fullPath = {};  // set by ShownPaths
 };
 
 struct TreeNodeInfo {
@@ -66,6 +68,7 @@ struct TreeNodeInfo {
   std::optional<std::string> elementKey;  // design-unit key of the node's element
   std::optional<std::string> file;
   std::optional<std::string> library;  // the library of the element's file
+  std::optional<std::string> fileFullPath;  // set by ShownPaths
   // Indices of the children in TreeInfo::nodes, in child order.
   std::vector<std::size_t> children;
   // Set on a later occurrence of a shared subtree: the index of its first occurrence. Such an
@@ -87,9 +90,10 @@ struct TreeInfo {
 };
 
 struct OrderEntry {
-  std::string path;
+  std::string path;  // full, or as shown once ShownPaths applied
   std::string library;
   std::string plugin;
+  std::string fullPath = {};  // set by ShownPaths
 };
 
 // The project's Verilog include directories and macros (NAME or NAME=VALUE), in the order given.

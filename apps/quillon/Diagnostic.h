@@ -16,6 +16,7 @@ struct Diagnostic {
   std::string text;
   std::string file;        // the HDL file of the referring record; empty when no file is at fault
   std::uint32_t line = 0;  // 0 when the finding has no line
+  std::string fileFullPath = {};  // set by ShownPaths, which makes `file` the path shown
 
   bool IsError() const { return severity == Severity::kError; }
   std::string_view SeverityText() const { return IsError() ? "error" : "warning"; }

@@ -26,6 +26,7 @@ Json MessageList(const std::vector<MessageInfo>& messages) {
     list.push_back({{"severity", message.severity},
                     {"text", message.text},
                     {"source", message.source},
+                    {"sourceFullPath", message.sourceFullPath},
                     {"line", message.line}});
   }
   return list;
@@ -39,6 +40,7 @@ Json DiagnosticList(const std::vector<Diagnostic>& diagnostics) {
                     {"code", diagnostic.code},
                     {"text", diagnostic.text},
                     {"file", diagnostic.file},
+                    {"fileFullPath", diagnostic.fileFullPath},
                     {"line", diagnostic.line == 0 ? Json(nullptr) : Json(diagnostic.line)}});
   }
   return list;
@@ -68,7 +70,7 @@ Json FileObject(const FileInfo& file) {
   Json units = Json::array();
   for (const UnitInfo& unit : file.units) units.push_back(UnitObject(unit));
   return {
-      {"path", file.path}, {"plugin", file.plugin}, {"library", file.library}, {"units", std::move(units)}};
+      {"path", file.path}, {"fullPath", file.fullPath}, {"plugin", file.plugin}, {"library", file.library}, {"units", std::move(units)}};
 }
 
 std::string Scalar(const Json& value) { return value.dump(-1, ' ', false, Json::error_handler_t::replace); }
@@ -104,6 +106,7 @@ void WriteNodeFields(const TreeInfo& tree, const TreeNodeInfo& node, std::size_t
   field("partition", node.partition);
   field("elementType", OrNull(node.elementType));
   field("file", OrNull(node.file));
+  field("fileFullPath", OrNull(node.fileFullPath));
   if (node.sharedWith) {
     field("shared", true);
     field("firstOccurrence", PointerTo(tree, *node.sharedWith));
@@ -197,7 +200,7 @@ void JsonOutput::Order(const std::vector<OrderEntry>* order, const VerilogSettin
   if (order) {
     list = Json::array();
     for (const OrderEntry& entry : *order) {
-      list.push_back({{"path", entry.path}, {"library", entry.library}, {"plugin", entry.plugin}});
+      list.push_back({{"path", entry.path}, {"fullPath", entry.fullPath}, {"library", entry.library}, {"plugin", entry.plugin}});
     }
   }
   Write({{"order", std::move(list)},

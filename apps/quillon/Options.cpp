@@ -24,7 +24,11 @@ constexpr const char* kUsage =
     "sources:\n"
     "  SOURCE                a source file; the plug-in follows from its extension\n"
     "  -P, --project FILE    a project file (JSON); its paths are relative to it\n"
-    "  -f FILE               a list of sources, one a line, with +incdir+ and +define+\n"
+    "  DIR, 'GLOB'           the HDL files under a directory or matching a pattern, sorted\n"
+    "  -f FILE, -F FILE      a file list as simulators read it (-F: paths relative to the list)\n"
+    "  -y DIR, -v FILE       where instantiated modules that no source defines are looked for\n"
+    "  +incdir+DIR, +define+NAME=VALUE, +libext+.v  as in a file list\n"
+    "  --lib NAME=PATH       a file, directory or pattern whose files go into library NAME\n"
     "  -l, --library NAME    the library of the sources after it (default work)\n"
     "  --plugin NAME         the plug-in of the sources after it (e.g. PLUGIN_Verilog)\n"
     "\n"
@@ -52,7 +56,8 @@ constexpr const char* kUsage =
     "  --warnings-as-errors  check fails on warnings too\n"
     "\n"
     "output:\n"
-    "  --format text|json|dot, -o FILE, -q (no messages), -v (developer texts too)\n"
+    "  --format text|json|dot, -o FILE, -q (no messages), --verbose (developer texts too)\n"
+    "  --absolute            full paths, also for sources given relative\n"
     "\n"
     "A UNIT is a design-unit key (Entity|cpu, Architecture|cpu|rtl, Module|top) or a name.\n"
     "Exit status: 0 done, 1 the operation failed or an error was reported, 2 bad usage or input.\n";
@@ -113,12 +118,15 @@ class Parser {
   CLI::App app_{"quillon"};
   bool help_ = false;
   std::vector<std::string> positionals_, projects_, lists_, libraries_, plugins_, properties_;
+  std::vector<std::string> relativeLists_, libraryDirs_, libraryFiles_, libraryAssignments_;
   std::string top_, unit_, format_ = "text";
   CLI::Option* positionalOption_ = nullptr;
   CLI::Option* projectOption_ = nullptr;
   CLI::Option* listOption_ = nullptr;
   CLI::Option* libraryOption_ = nullptr;
   CLI::Option* pluginOption_ = nullptr;
+  std::map<const CLI::Option*, SourceArgument::Kind> sourceKinds_;
+  CLI::Option* libraryAssignmentOption_ = nullptr;
 };
 
 void Parser::Declare() {
@@ -129,6 +137,15 @@ void Parser::Declare() {
   listOption_ = AddRepeated(app_, "-f", lists_);
   libraryOption_ = AddRepeated(app_, "-l,--library", libraries_);
   pluginOption_ = AddRepeated(app_, "--plugin", plugins_);
+  using Kind = SourceArgument::Kind;
+  sourceKinds_ = {{positionalOption_, Kind::kFile},
+                  {projectOption_, Kind::kProjectFile},
+                  {listOption_, Kind::kFileList},
+                  {AddRepeated(app_, "-F", relativeLists_), Kind::kFileListRelative},
+                  {AddRepeated(app_, "-y", libraryDirs_), Kind::kLibraryDir},
+                  {AddRepeated(app_, "-v", libraryFiles_), Kind::kLibraryFile}};
+  libraryAssignmentOption_ = AddRepeated(app_, "--lib", libraryAssignments_);
+  app_.add_flag("--absolute", options_.absolutePaths);
   AddRepeated(app_, "-D", options_.defines);
   AddRepeated(app_, "-I", options_.includeDirs);
   app_.add_option("--target", options_.target);
@@ -145,7 +162,7 @@ void Parser::Declare() {
   app_.add_option("--format", format_)->check(CLI::IsMember({"text", "json", "dot"}));
   app_.add_option("-o", options_.outputPath);
   app_.add_flag("-q", options_.quiet);
-  app_.add_flag("-v", options_.verbose);
+  app_.add_flag("--verbose", options_.verbose);
   AddRepeated(app_, "--external-library", options_.externalLibraries);
   app_.add_flag("--strict", options_.strict);
   app_.add_flag("--warnings-as-errors", options_.warningsAsErrors);
@@ -165,14 +182,28 @@ Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& err
   }
 
   std::string library, plugin;
+  // The -l or --plugin given last while no source followed it yet.
+  std::string unapplied;
   ArgumentWalk(app_).ForEach([&](const CLI::Option* option, const std::string& value) {
-    using Kind = SourceArgument::Kind;
     if (option == libraryOption_) library = value;
     if (option == pluginOption_) plugin = value;
-    if (option == positionalOption_) options_.sources.push_back({Kind::kFile, value, library, plugin});
-    if (option == projectOption_) options_.sources.push_back({Kind::kProjectFile, value, library, plugin});
-    if (option == listOption_) options_.sources.push_back({Kind::kFileList, value, library, plugin});
+    if (option == libraryOption_ || option == pluginOption_) unapplied = option->get_name() + " " + value;
+    if (auto kind = sourceKinds_.find(option); kind != sourceKinds_.end()) {
+      options_.sources.push_back({kind->second, value, library, plugin});
+      unapplied.clear();
+    }
+    std::pair<std::string, std::string> assignment;
+    if (option == libraryAssignmentOption_ && SplitAssignment(value, assignment)) {
+      options_.sources.push_back({SourceArgument::Kind::kFile, assignment.second, assignment.first, plugin});
+    } else if (option == libraryAssignmentOption_ && error.empty()) {
+      error = "--lib needs NAME=PATH, not '" + value + "'";
+    }
   });
+  if (!error.empty()) return Options::Outcome::kUsageError;
+  if (!unapplied.empty()) {
+    error = unapplied + " applies to no source: give it before the sources it is for";
+    return Options::Outcome::kUsageError;
+  }
   if (!TakePositionals(positionals_, error)) return Options::Outcome::kUsageError;
 
   for (const std::string& property : properties_) {

@@ -15,7 +15,9 @@ enum class Format { kText, kJson, kDot };
 // One argument that names sources, in command-line order, with the library and plug-in that the
 // -l/--library and --plugin options before it put in effect (empty when none was given).
 struct SourceArgument {
-  enum class Kind { kFile, kProjectFile, kFileList };
+  // kFile also stands for a directory, a glob pattern or a +incdir+/+define+/+libext+ token;
+  // kFileListRelative is -F, kLibraryDir -y, kLibraryFile -v.
+  enum class Kind { kFile, kProjectFile, kFileList, kFileListRelative, kLibraryDir, kLibraryFile };
   Kind kind = Kind::kFile;
   std::string path;
   std::string library;
@@ -57,6 +59,7 @@ class Options {
   std::string outputPath;
   bool quiet = false;
   bool verbose = false;
+  bool absolutePaths = false;  // --absolute: full paths even where relative ones were given
 
   // Diagnostics: libraries whose units are black boxes, black boxes as errors, and (for check)
   // warnings as errors.

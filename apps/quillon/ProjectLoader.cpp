@@ -1,13 +1,18 @@
 #include "ProjectLoader.h"
 
+#include <glob.h>
 #include <sys/stat.h>
 
 #include <algorithm>
+#include <cctype>
 #include <cstdint>
+#include <cstdlib>
+#include <filesystem>
 #include <fstream>
+#include <iostream>
 #include <iterator>
 #include <nlohmann/json.hpp>
-#include <sstream>
+#include <optional>
 
 #include "PluginTable.h"
 #include "Port/File.h"
@@ -18,8 +23,6 @@ namespace quillon {
 
 namespace {
 
-constexpr std::string_view kIncdirPrefix = "+incdir+";
-constexpr std::string_view kDefinePrefix = "+define+";
 constexpr const char* kDefaultLibrary = "work";
 
 std::string Formatted(const char* format, const std::string& path, std::uint64_t limit) {
@@ -73,33 +76,43 @@ std::string ShortJsonReason(const nlohmann::json::exception& failure) {
   return lead == std::string::npos ? reason : reason.substr(lead + 2);
 }
 
-std::string Trimmed(std::string_view text) {
-  constexpr std::string_view kBlanks = " \t\r\n";
-  std::size_t first = text.find_first_not_of(kBlanks);
-  if (first == std::string_view::npos) return {};
-  std::size_t last = text.find_last_not_of(kBlanks);
-  return std::string(text.substr(first, last - first + 1));
+// The HDL sources that a directory on the command line stands for.
+bool IsHdlSource(const std::filesystem::path& path) {
+  std::string extension = path.extension().string();
+  std::transform(extension.begin(), extension.end(), extension.begin(),
+                 [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
+  return extension == ".vhd" || extension == ".vhdl" || extension == ".v" || extension == ".sv";
 }
 
-// A "//" starts a comment at the start of a line or after a blank; inside a path ("dir//a.vhd")
-// it is part of the path.
-std::size_t CommentStart(const std::string& line) {
-  for (std::size_t at = line.find("//"); at != std::string::npos; at = line.find("//", at + 1)) {
-    if (at == 0 || line[at - 1] == ' ' || line[at - 1] == '\t') return at;
+// The HDL files under `directory`, sorted so that runs are repeatable; the paths start with
+// `directory` as given.
+std::vector<std::string> HdlFilesUnder(const std::string& directory, std::string& error) {
+  namespace fs = std::filesystem;
+  std::vector<std::string> files;
+  std::error_code failure;
+  fs::recursive_directory_iterator walk(directory, fs::directory_options::skip_permission_denied, failure);
+  for (; !failure && walk != fs::recursive_directory_iterator(); walk.increment(failure)) {
+    if (walk->is_regular_file(failure) && IsHdlSource(walk->path())) files.push_back(walk->path().string());
   }
-  return line.size();
+  if (failure) error = "cannot read the directory " + directory + ": " + failure.message();
+  std::sort(files.begin(), files.end());
+  return files;
 }
 
-std::vector<std::string> PlusSeparated(std::string_view list) {
-  std::vector<std::string> pieces;
-  std::size_t start = 0;
-  while (start <= list.size()) {
-    std::size_t plus = list.find('+', start);
-    if (plus == std::string_view::npos) plus = list.size();
-    if (plus > start) pieces.emplace_back(list.substr(start, plus - start));
-    start = plus + 1;
-  }
-  return pieces;
+bool IsGlobPattern(const std::string& text) { return text.find_first_of("*?[") != std::string::npos; }
+
+// The matches of a pattern, sorted; false when glob(3) fails or nothing matches.
+bool GlobMatches(const std::string& pattern, std::vector<std::string>& matches) {
+  glob_t found{};
+  int status = ::glob(pattern.c_str(), 0, nullptr, &found);
+  if (status == 0) matches.assign(found.gl_pathv, found.gl_pathv + found.gl_pathc);
+  ::globfree(&found);
+  return status == 0 && !matches.empty();
+}
+
+std::optional<std::string> EnvironmentValue(const std::string& name) {
+  const char* value = std::getenv(name.c_str());
+  return value ? std::optional<std::string>(value) : std::nullopt;
 }
 
 // Reads an optional text member; false when it is there but is no string.
@@ -113,21 +126,12 @@ bool OptionalText(const nlohmann::json& object, const char* name, std::string& o
 
 }  // namespace
 
+ProjectLoader::ProjectLoader(ProjectSources& sources)
+    : sources_(sources), lists_(ReadWholeFile, EnvironmentValue, std::cin) {}
+
 bool ProjectLoader::Load(const Options& options, std::string& error) {
   for (const SourceArgument& argument : options.sources) {
-    bool added = false;
-    switch (argument.kind) {
-      case SourceArgument::Kind::kFile:
-        added = AddSource(argument.path, "", argument.library, argument.plugin, error);
-        break;
-      case SourceArgument::Kind::kProjectFile:
-        added = AddProjectFile(argument, error);
-        break;
-      case SourceArgument::Kind::kFileList:
-        added = AddFileList(argument, error);
-        break;
-    }
-    if (!added) return false;
+    if (!AddArgument(argument, error)) return false;
   }
   for (const std::string& define : options.defines) AddDefine(define);
   for (const std::string& directory : options.includeDirs) AddIncludeDir(directory);
@@ -141,9 +145,63 @@ bool ProjectLoader::Load(const Options& options, std::string& error) {
   return true;
 }
 
-bool ProjectLoader::AddSource(std::string path, const std::string& baseDir, std::string library,
-                              std::string plugin, std::string& error) {
-  std::string fullPath = Canonical(std::move(path), baseDir);
+bool ProjectLoader::AddArgument(const SourceArgument& argument, std::string& error) {
+  using Kind = SourceArgument::Kind;
+  switch (argument.kind) {
+    case Kind::kFile:
+      return AddGiven(argument.path, argument.library, argument.plugin, error);
+    case Kind::kProjectFile:
+      return AddProjectFile(argument, error);
+    case Kind::kFileList:
+    case Kind::kFileListRelative:
+      return AddFileList(argument, error);
+    case Kind::kLibraryDir:
+    case Kind::kLibraryFile: {
+      FileList::Contents contents;
+      auto& places = argument.kind == Kind::kLibraryDir ? contents.libraryDirs : contents.libraryFiles;
+      places.push_back({FileList::Resolved(argument.path, ""), argument.library, argument.plugin, ""});
+      return TakeListContents(std::move(contents), error);
+    }
+  }
+  return false;
+}
+
+bool ProjectLoader::AddGiven(const std::string& given, const std::string& library, const std::string& plugin,
+                             std::string& error) {
+  if (given.starts_with('+')) {
+    FileList::Contents contents;
+    return FileList::TakePlusOption(given, "", "", contents, error) &&
+           TakeListContents(std::move(contents), error);
+  }
+  if (!IsGlobPattern(given) || Port::File::exist(given.c_str())) {
+    return AddPathOrDirectory(given, library, plugin, error);
+  }
+  std::vector<std::string> matches;
+  if (!GlobMatches(given, matches)) {
+    error = "no file matches the pattern " + given;
+    return false;
+  }
+  for (const std::string& match : matches) {
+    if (!AddPathOrDirectory(match, library, plugin, error)) return false;
+  }
+  return true;
+}
+
+bool ProjectLoader::AddPathOrDirectory(const std::string& given, const std::string& library,
+                                       const std::string& plugin, std::string& error) {
+  if (!Port::File::isDirectory(given.c_str())) return AddSource(given, library, plugin, error);
+  std::vector<std::string> files = HdlFilesUnder(given, error);
+  if (!error.empty()) return false;
+  if (files.empty()) sources_.warnings.push_back("the directory " + given + " holds no HDL source");
+  for (const std::string& file : files) {
+    if (!AddSource(file, library, plugin, error)) return false;
+  }
+  return true;
+}
+
+bool ProjectLoader::AddSource(const std::string& given, std::string library, std::string plugin,
+                              std::string& error) {
+  std::string fullPath = Canonical(given, "");
   if (!Port::File::exist(fullPath.c_str())) {
     error = "no such source file: " + fullPath;
     return false;
@@ -165,7 +223,8 @@ bool ProjectLoader::AddSource(std::string path, const std::string& baseDir, std:
   }
   if (library.empty()) library = kDefaultLibrary;
   if (plugin.empty()) plugin = PluginTable::PluginForPath(fullPath);
-  sources_.files.push_back({std::move(fullPath), std::move(library), std::move(plugin)});
+  sources_.files.push_back(
+      {std::move(fullPath), FileList::Resolved(given, ""), std::move(library), std::move(plugin)});
   return true;
 }
 
@@ -209,7 +268,7 @@ bool ProjectLoader::AddProjectFile(const SourceArgument& argument, std::string& 
   auto files = project.find("files");
   if (files == project.end()) return true;
   if (!files->is_array()) return malformed("\"files\" must be an array");
-  std::string baseDir = DirectoryOf(projectPath);
+  std::string baseDir = DirectoryOf(argument.path);
   for (std::size_t index = 0; index < files->size(); ++index) {
     const nlohmann::json& entry = (*files)[index];
     std::string where = "files[" + std::to_string(index) + "]";
@@ -220,60 +279,49 @@ bool ProjectLoader::AddProjectFile(const SourceArgument& argument, std::string& 
     if (path.find('\0') != std::string::npos) return malformed(where + ": the path holds a NUL character");
     if (!OptionalText(entry, "library", library)) return malformed(where + ": \"library\" must be a text");
     if (!OptionalText(entry, "plugin", plugin)) return malformed(where + ": \"plugin\" must be a text");
-    if (!AddSource(path, baseDir, library, plugin, error)) return false;
+    if (!AddSource(FileList::Resolved(path, baseDir), library, plugin, error)) return false;
   }
   return true;
 }
 
 bool ProjectLoader::AddFileList(const SourceArgument& argument, std::string& error) {
-  std::string listPath = Canonical(argument.path, "");
-  std::string text;
-  if (!ReadWholeFile(listPath, text, error)) {
-    if (error.empty()) error = "cannot read file list " + listPath;
-    return false;
-  }
-  constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
-  if (text.starts_with(kByteOrderMark)) text.erase(0, kByteOrderMark.size());
-  std::istringstream lines(text);
-  std::string line;
-  for (int number = 1; std::getline(lines, line); ++number) {
-    if (!TakeFileListLine(line, argument, error)) {
-      error = listPath + ":" + std::to_string(number) + ": " + error;
+  FileList::Contents contents;
+  return lists_.Read(argument.path, argument.kind == SourceArgument::Kind::kFileListRelative, argument.library,
+                     argument.plugin, contents, error) &&
+         TakeListContents(std::move(contents), error);
+}
+
+bool ProjectLoader::TakeListContents(FileList::Contents contents, std::string& error) {
+  for (std::string& warning : contents.warnings) sources_.warnings.push_back(std::move(warning));
+  for (const std::string& define : contents.defines) AddDefine(define);
+  for (std::string& directory : contents.includeDirs) AddIncludeDir(std::move(directory));
+  ProjectSources::LibrarySearch& search = sources_.librarySearch;
+  for (std::string& extension : contents.libraryExtensions) search.extensions.push_back(std::move(extension));
+  auto place = [](const FileList::Entry& entry) {
+    return SourceFile{Canonical(entry.path, ""), entry.path, entry.library.empty() ? kDefaultLibrary : entry.library,
+                      entry.plugin};
+  };
+  for (const FileList::Entry& entry : contents.libraryDirs) {
+    search.directories.push_back(place(entry));
+    if (!Port::File::isDirectory(search.directories.back().path.c_str())) {
+      error = entry.where + "no such library directory: " + entry.path;
       return false;
     }
   }
-  return true;
-}
-
-bool ProjectLoader::TakeFileListLine(std::string line, const SourceArgument& argument, std::string& error) {
-  line.erase(CommentStart(line));
-  line = Trimmed(line);
-  if (line.empty() || line[0] == '#') return true;
-  if (line.starts_with(kIncdirPrefix) || line.starts_with(kDefinePrefix)) {
-    const bool isDefine = line.starts_with(kDefinePrefix);
-    std::vector<std::string> values =
-        PlusSeparated(std::string_view(line).substr((isDefine ? kDefinePrefix : kIncdirPrefix).size()));
-    for (std::string& value : values) {
-      if (!Options::FitsList(value)) {
-        error = "'" + value + "' holds a ';', which would separate it into more than one entry";
-        return false;
-      }
-      if (isDefine) {
-        AddDefine(value);
-      } else {
-        AddIncludeDir(std::move(value));
-      }
+  for (const FileList::Entry& entry : contents.libraryFiles) {
+    search.files.push_back(place(entry));
+    if (!IsReadableRegularFile(search.files.back().path, Port::InputLimits::kMaxSourceBytes,
+                               Port::InputLimits::kSourceTooLarge, error)) {
+      if (error.empty()) error = "no such library file: " + entry.path;
+      error = entry.where + error;
+      return false;
     }
-    return true;
   }
-  if (line[0] == '+') {
-    error = "unknown list option " + line;
-    return false;
-  }
-  std::string sourceError;
-  if (!AddSource(line, "", argument.library, argument.plugin, sourceError)) {
-    error = sourceError;
-    return false;
+  for (const FileList::Entry& source : contents.sources) {
+    if (!AddGiven(source.path, source.library, source.plugin, error)) {
+      error = source.where + error;
+      return false;
+    }
   }
   return true;
 }

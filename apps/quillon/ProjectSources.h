@@ -8,7 +8,8 @@
 namespace quillon {
 
 struct SourceFile {
-  std::string path;  // absolute
+  std::string path;       // absolute
+  std::string givenPath;  // as the user gave it, normalised; relative stays relative
   std::string library;
   std::string plugin;
 };
@@ -19,6 +20,13 @@ struct ProjectSources {
   // Libraries that the sources name but the project does not hold ("externalLibraries").
   std::vector<std::string> externalLibraries;
   std::vector<std::string> warnings;  // found while the sources were gathered
+  // Where the modules that the sources instantiate but do not define are looked for (-y, -v,
+  // +libext+); paths as given.
+  struct LibrarySearch {
+    std::vector<SourceFile> directories;
+    std::vector<SourceFile> files;
+    std::vector<std::string> extensions;
+  } librarySearch;
 };
 
 }  // namespace quillon

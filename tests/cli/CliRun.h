@@ -20,6 +20,7 @@ struct CliRun {
   std::vector<std::string> args;
   std::string workDir;                                           // empty: the test's own
   std::vector<std::pair<std::string, std::string>> environment;  // added to the test's own
+  std::string inputPath = {};                                     // standard input; empty: none
 };
 
 // Standard output and standard error go to files of a temporary directory, so that neither can

@@ -51,6 +51,9 @@ TEST(CommandLine, UsageMistakesAreRejectedWithStatusTwo) {
       {{"--depth", "-1", "tree", top}, "--depth"},
       {{"--property", "NOVALUE", "units", top}, "NOVALUE"},
       {{"-D", "=1", "units", top}, "-D"},
+      {{"units", top, "-l", "common"}, "--library common applies to no source"},
+      {{"units", top, "--plugin", "PLUGIN_Vhdl"}, "--plugin PLUGIN_Vhdl applies to no source"},
+      {{"units", "--lib", "common"}, "--lib needs NAME=PATH"},
   };
   for (const BadInput& bad : cases) {
     SCOPED_TRACE(bad.named);
@@ -61,7 +64,6 @@ TEST(CommandLine, UsageMistakesAreRejectedWithStatusTwo) {
 TEST(CommandLine, UnreadableSourcesAreRejectedWithStatusTwo) {
   const std::vector<BadInput> cases = {
       {{"units", DataPath("mixed/absent.vhd")}, "no such source file: " + DataPath("mixed/absent.vhd")},
-      {{"units", DataPath("mixed")}, DataPath("mixed") + " is a directory"},
       {{"units", "-P", DataPath("absent.json")}, "cannot read project file " + DataPath("absent.json")},
       {{"units", "-P", DataPath("mixed")}, "cannot read project file " + DataPath("mixed")},
       {{"units", "-P", DataPath("broken.json")}, DataPath("broken.json") + " is not a valid project file"},
@@ -83,9 +85,9 @@ TEST(CommandLine, FileListNamesTheLineOfAMissingSource) {
 }
 
 TEST(CommandLine, FileListRejectsAnUnknownPlusOption) {
-  ScopedTextFile list("+libext+.v\n");
+  ScopedTextFile list("+libext+.v\n+nosuch+1\n");
   ExpectOneLineNaming(RunQuillon({"units", "-f", list.path()}),
-                      list.path() + ":1: unknown list option +libext+.v");
+                      list.path() + ":2: unknown list option +nosuch+1");
 }
 
 TEST(CommandLine, UnknownUnitIsBadInput) {

@@ -73,6 +73,7 @@ TEST(Diagnostics, EntityInstanceMissingFromItsLibraryIsAnErrorWithFileAndLine) {
                                           {"code", "unresolved-instance"},
                                           {"text", "instance 'u1': entity 'sub' is not in library 'work'"},
                                           {"file", top},
+                                          {"fileFullPath", top},
                                           {"line", 4}}));
 
   Checked tree = RunJson("tree", broken);

@@ -41,7 +41,7 @@ std::string ExpectedText(const std::string& name) {
 
 const Json* FileNamed(const Json& units, const std::string& path) {
   for (const Json& file : units["files"]) {
-    if (file["path"] == path) return &file;
+    if (file["fullPath"] == path) return &file;
   }
   return nullptr;
 }
@@ -73,7 +73,7 @@ TEST(Units, FileListReadsTheSameFilesAsTheProjectFile) {
   Json fromProject = UnitsOf({"-P", DataPath("mixed/project.json")});
   ASSERT_EQ(fromList["files"].size(), fromProject["files"].size());
   for (std::size_t i = 0; i < fromList["files"].size(); ++i) {
-    EXPECT_EQ(fromList["files"][i]["path"], fromProject["files"][i]["path"]);
+    EXPECT_EQ(fromList["files"][i]["fullPath"], fromProject["files"][i]["path"]);
     EXPECT_EQ(KeysOf(fromList["files"][i]), KeysOf(fromProject["files"][i]));
   }
   // The list names no library: everything goes to work.
@@ -141,7 +141,7 @@ TEST(Units, OutputFileTakesTheAnswerInsteadOfStandardOutput) {
 TEST(Units, VerboseAddsTheDeveloperTexts) {
   const std::vector<std::pair<std::string, std::string>> noDebugVariable{{"QUILLON_DEBUG", ""}};
   const std::vector<std::string> args{"--plugin", "PLUGIN_Unheard", "units", DataPath("mixed/top.vhd")};
-  std::vector<std::string> verbose{"-v"};
+  std::vector<std::string> verbose{"--verbose"};
   verbose.insert(verbose.end(), args.begin(), args.end());
   const std::string text = "Parser PLUGIN_Unheard not found. Using PLUGIN_General";
 

@@ -1,0 +1,2 @@
+module counter(input clk);
+endmodule
