@@ -1,5 +1,7 @@
 #include "CommandRunner.h"
 
+#include <unistd.h>
+
 #include <algorithm>
 #include <cctype>
 #include <cinttypes>
@@ -23,6 +25,7 @@
 #include "ProjectBuilder.h"
 #include "ProjectLoader.h"
 #include "RavA/Factory.h"
+#include "TerminalColor.h"
 #include "TextOutput.h"
 #include "TreeReader.h"
 #include "UnitFinder.h"
@@ -103,16 +106,27 @@ class DeveloperTextCapture {
 
 int CommandRunner::Run() {
   if (options_.command == Command::kFactories) return ListFactories();
-  MessageLog log(options_.quiet, options_.verbose);
+  MessageLog log(options_.quiet, options_.verbose, ColorOnStandardError());
   log_ = &log;
   int status = RunOnProject();
   log_ = nullptr;
   return status;
 }
 
+bool CommandRunner::ColorOnStandardError() const {
+  return TerminalColor::Wanted(options_.color, STDERR_FILENO);
+}
+
 int CommandRunner::BadInput(const std::string& text) {
   std::fprintf(stderr, "quillon: %s\n", text.c_str());
   return kExitBadInput;
+}
+
+Vad::IHdlDesignUnit* CommandRunner::FindUnit(ProjectReader& reader, const std::string& name) {
+  UnitFinder finder(reader.designUnits());
+  Vad::IHdlDesignUnit* unit = finder.Find(name);
+  if (!unit) BadInput("unknown design unit '" + name + "'" + finder.DidYouMean(name));
+  return unit;
 }
 
 int CommandRunner::Failed(const std::string& what, CitI::Result result) {
@@ -247,8 +261,8 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
   if (options_.top.empty()) {
     result = reader.Order(order);
   } else {
-    Vad::IHdlDesignUnit* unit = UnitFinder(reader.designUnits()).Find(options_.top);
-    if (!unit) return BadInput("unknown design unit '" + options_.top + "'");
+    Vad::IHdlDesignUnit* unit = FindUnit(reader, options_.top);
+    if (!unit) return kExitBadInput;
     result = reader.OrderOf(unit, options_.byUnit, order);
   }
   bool ordered = result == CitI::kOk;
@@ -281,8 +295,8 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
 // The module explains a failed extraction in its own messages; a unit whose kind of source has
 // no port extraction gets no answer and no message, so quillon says so itself.
 int CommandRunner::Ports(ProjectReader& reader, std::ostream& out) {
-  Vad::IHdlDesignUnit* unit = UnitFinder(reader.designUnits()).Find(options_.unit);
-  if (!unit) return BadInput("unknown design unit '" + options_.unit + "'");
+  Vad::IHdlDesignUnit* unit = FindUnit(reader, options_.unit);
+  if (!unit) return kExitBadInput;
   std::string key = KeyOf(unit);
   std::optional<std::vector<PortInfo>> ports;
   std::string reason;
@@ -353,7 +367,7 @@ std::vector<Diagnostic> CommandRunner::Diagnose(ProjectReader& reader, Vad::IHdl
 }
 
 void CommandRunner::ShowDiagnostics(const std::vector<Diagnostic>& diagnostics) const {
-  if (!options_.quiet) DiagnosticReport::Write(diagnostics, std::cerr);
+  if (!options_.quiet) DiagnosticReport::Write(diagnostics, std::cerr, ColorOnStandardError());
 }
 
 }  // namespace quillon

@@ -2,7 +2,7 @@
 
 #include <dlfcn.h>
 
-#include <cstdlib>
+#include "InstallLayout.h"
 
 namespace quillon {
 
@@ -11,8 +11,7 @@ ModuleLoader::~ModuleLoader() {
 }
 
 bool ModuleLoader::Load(std::string& error) {
-  const char* fromEnvironment = std::getenv("QUILLON_MODULE");
-  path_ = fromEnvironment && *fromEnvironment ? fromEnvironment : QUILLON_DEFAULT_MODULE;
+  path_ = InstallLayout::ModulePath();
   handle_ = dlopen(path_.c_str(), RTLD_NOW | RTLD_LOCAL);
   if (!handle_) {
     const char* reason = dlerror();

@@ -12,8 +12,8 @@ class ModuleLoader {
   ModuleLoader(const ModuleLoader&) = delete;
   ModuleLoader& operator=(const ModuleLoader&) = delete;
 
-  // Opens the module named by QUILLON_MODULE, else the one built with this program, and calls
-  // its InstFactoryEntry. False with a one-line reason in `error`.
+  // Opens the module that InstallLayout::ModulePath names and calls its InstFactoryEntry. False with a
+  // one-line reason in `error`.
   bool Load(std::string& error);
   const std::string& path() const { return path_; }
 

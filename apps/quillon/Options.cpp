@@ -1,69 +1,48 @@
 #include "Options.h"
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
+#include <charconv>
 #include <cstdio>
-#include <map>
+#include <deque>
+#include <iostream>
+
+#include "ManPage.h"
+#include "OptionTable.h"
+#include "Suggestions.h"
 
 namespace quillon {
 
 namespace {
 
-constexpr const char* kUsage =
-    "usage: quillon [options] COMMAND [SOURCE...]\n"
-    "\n"
-    "commands:\n"
-    "  units        the design units of every source file\n"
-    "  tree         the design hierarchy\n"
-    "  order        the order in which the source files must be compiled\n"
-    "  ports UNIT   the ports of a design unit\n"
-    "  check        read everything and report problems only\n"
-    "  factories    the classes the module registers\n"
-    "\n"
-    "sources:\n"
-    "  SOURCE                a source file; the plug-in follows from its extension\n"
-    "  -P, --project FILE    a project file (JSON); its paths are relative to it\n"
-    "  -f FILE               a list of sources, one a line, with +incdir+ and +define+\n"
-    "  -l, --library NAME    the library of the sources after it (default work)\n"
-    "  --plugin NAME         the plug-in of the sources after it (e.g. PLUGIN_Verilog)\n"
-    "\n"
-    "project properties:\n"
-    "  -D NAME[=VALUE]       a Verilog macro\n"
-    "  -I DIR                a Verilog include directory\n"
-    "  --target NAME         the parse target\n"
-    "  --family NAME         the device family\n"
-    "  --property KEY=VALUE  any project property\n"
-    "  --converter-timeout SECONDS  the time a converter may take (default 300, 0 for none)\n"
-    "\n"
-    "order:\n"
-    "  --top UNIT            the order for UNIT and what it needs\n"
-    "  --unit UNIT           the order for UNIT alone\n"
-    "  --with-library        text output: the library before each path\n"
-    "\n"
-    "diagnostics:\n"
-    "  --external-library NAME  a library outside the project: its units are black boxes\n"
-    "  --strict              instances of units the project lacks are errors, not warnings\n"
-    "  --warnings-as-errors  check fails on warnings too\n"
-    "\n"
-    "output:\n"
-    "  --format text|json|dot, -o FILE, -q (no messages), -v (developer texts too)\n"
-    "\n"
-    "A UNIT is a design-unit key (Entity|cpu, Architecture|cpu|rtl, Module|top) or a name.\n"
-    "Exit status: 0 done, 1 the operation failed or an error was reported, 2 bad usage or input.\n";
+constexpr const char* kDescription =
+    "quillon reads HDL sources, finds their design units, builds the design hierarchy and computes the "
+    "order in which the files must be compiled.";
+constexpr const char* kCommandHelp = "Run 'quillon COMMAND --help' for the options of a command.";
 
-const std::map<std::string, Command>& CommandNames() {
-  static const std::map<std::string, Command> names = {
-      {"units", Command::kUnits}, {"tree", Command::kTree},   {"order", Command::kOrder},
-      {"ports", Command::kPorts}, {"check", Command::kCheck}, {"factories", Command::kFactories}};
-  return names;
+const CLI::Validator& WholeNumber() {
+  static const CLI::Validator validator(
+      [](std::string& text) -> std::string {
+        unsigned number = 0;
+        auto [end, failure] = std::from_chars(text.data(), text.data() + text.size(), number);
+        if (text.empty() || failure != std::errc() || end != text.data() + text.size())
+          return "'" + text + "' is not a whole number of seconds that quillon can count";
+        return {};
+      },
+      "");
+  return validator;
 }
 
-// Each occurrence of an option takes exactly one value, so that "-l lib a.vhd" leaves a.vhd a
-// source.
-CLI::Option* AddRepeated(CLI::App& app, const std::string& names, std::vector<std::string>& values) {
-  return app.add_option(names, values)
-      ->allow_extra_args(false)
-      ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
-}
+// CLI11 would show the command as an optional subcommand and the hidden catch of misspelt
+// commands as "[...]".
+class HelpFormatter : public CLI::Formatter {
+ public:
+  HelpFormatter() { label("Subcommands", "Commands"); }
+  std::string make_usage(const CLI::App* app, std::string name) const override {
+    if (app->get_parent()) return CLI::Formatter::make_usage(app, std::move(name));
+    return get_label("Usage") + ": " + name + " [OPTIONS] COMMAND [OPTIONS] [SOURCE...]\n";
+  }
+};
 
 bool SplitAssignment(const std::string& text, std::pair<std::string, std::string>& out) {
   std::size_t equals = text.find('=');
@@ -72,165 +51,274 @@ bool SplitAssignment(const std::string& text, std::pair<std::string, std::string
   return true;
 }
 
-// The raw values that CLI11 collected, walked again in command-line order.
-class ArgumentWalk {
- public:
-  explicit ArgumentWalk(const CLI::App& app) : app_(app) {}
-  template <class Visit>
-  void ForEach(Visit visit) {
-    std::map<const CLI::Option*, std::size_t> taken;
-    for (const CLI::Option* option : app_.parse_order()) {
-      std::size_t index = taken[option]++;
-      const std::vector<std::string>& results = option->results();
-      visit(option, index < results.size() ? results[index] : std::string());
-    }
-  }
+bool AppliesTo(const OptionSpec& option, Command command) { return (option.commands & SetOf(command)) != 0; }
 
- private:
-  const CLI::App& app_;
-};
-
+// Options that take a value are recorded as they are parsed, with the number of sources before
+// them, so that -l and --plugin apply to the sources after them whether they stand before or after
+// the command. CLI11 runs the callbacks of parent and command in one pass over the arguments.
 class Parser {
  public:
-  explicit Parser(Options& options) : options_(options) {}
+  explicit Parser(Options& options) : values_(options) {}
 
   Options::Outcome Run(int argc, const char* const* argv, std::string& error);
 
  private:
+  struct Occurrence {
+    const OptionSpec* option;
+    std::string value;
+    std::size_t sourcesBefore;
+  };
+  struct CommandApp {
+    const CommandSpec* spec;
+    CLI::App* app;
+    std::string unit;
+    std::vector<std::string> sources;
+    CLI::Option* sourcesOption;
+  };
+
   void Declare();
-  bool TakePositionals(const std::vector<std::string>& positionals, std::string& error);
+  void DeclareOption(CLI::App& app, const OptionSpec& option, bool shown);
+  void DeclareCommand(const CommandSpec& command);
+  std::size_t SourcesSoFar() const;
+  const CommandApp* SelectedCommand() const;
+
+  bool ShowHelpTopic() const;
+  void ShowCompletionWords(const std::string& of) const;
+  bool TakeWords(std::string& error);
+  void TakeOccurrences(const CommandApp& command);
+  bool CheckValues(std::string& error);
   bool CheckCombination(std::string& error) const;
 
-  Options& options_;
-  CLI::App app_{"quillon"};
-  bool help_ = false;
-  std::vector<std::string> positionals_, projects_, lists_, libraries_, plugins_, properties_;
-  std::string top_, unit_, format_ = "text";
-  CLI::Option* positionalOption_ = nullptr;
-  CLI::Option* projectOption_ = nullptr;
-  CLI::Option* listOption_ = nullptr;
-  CLI::Option* libraryOption_ = nullptr;
-  CLI::Option* pluginOption_ = nullptr;
+  CLI::App app_{kDescription, "quillon"};
+  OptionValues values_;
+  std::vector<Occurrence> occurrences_;
+  std::deque<CommandApp> commands_;  // stable addresses for the callbacks
+  std::vector<std::string> strayWords_;
+  CLI::App* help_ = nullptr;
+  std::vector<std::string> helpTopic_;
 };
 
+void Parser::DeclareOption(CLI::App& app, const OptionSpec& option, bool shown) {
+  auto record = [this, &option](const std::string& value) {
+    occurrences_.push_back({&option, value, SourcesSoFar()});
+  };
+  CLI::Option* declared;
+  if (option.value) {
+    declared = app.add_option_function<std::string>(option.names, record, option.help)
+                   ->type_name(option.value)
+                   ->allow_extra_args(false);
+    if (!option.choices.empty()) declared->check(CLI::IsMember(option.choices));
+    if (option.number) declared->check(WholeNumber());
+  } else {
+    declared = app.add_flag_callback(
+        option.names, [record] { record(""); }, option.help);
+  }
+  declared->trigger_on_parse()->group(shown ? option.group : "");
+}
+
+void Parser::DeclareCommand(const CommandSpec& spec) {
+  CLI::App* app = app_.add_subcommand(spec.name, spec.summary);
+  CommandApp& command = commands_.emplace_back(CommandApp{&spec, app, {}, {}, nullptr});
+  if (*spec.operands) app->add_option(spec.operands, command.unit, "the design unit")->type_name("");
+  command.sourcesOption =
+      app->add_option("SOURCE", command.sources, "a source file; the plug-in follows from its extension")
+          ->type_name("");
+  std::string footer = spec.command == Command::kFactories ? "" : OptionTable::UnitText();
+  app->footer(footer + (footer.empty() ? "" : "\n") + OptionTable::ExitText());
+  for (const OptionSpec& option : OptionTable::All()) {
+    if (AppliesTo(option, spec.command)) DeclareOption(*app, option, true);
+  }
+}
+
+// Every option is also declared, hidden, on quillon itself, so that it may stand before the
+// command as well; an option that does not apply to the command is refused after parsing.
 void Parser::Declare() {
-  app_.set_help_flag();
-  app_.add_flag("-h,--help", help_);
-  positionalOption_ = app_.add_option("args", positionals_);
-  projectOption_ = AddRepeated(app_, "-P,--project", projects_);
-  listOption_ = AddRepeated(app_, "-f", lists_);
-  libraryOption_ = AddRepeated(app_, "-l,--library", libraries_);
-  pluginOption_ = AddRepeated(app_, "--plugin", plugins_);
-  AddRepeated(app_, "-D", options_.defines);
-  AddRepeated(app_, "-I", options_.includeDirs);
-  app_.add_option("--target", options_.target);
-  app_.add_option("--family", options_.family);
-  AddRepeated(app_, "--property", properties_);
-  app_.add_option("--converter-timeout", options_.converterTimeout)->check(CLI::NonNegativeNumber);
-  app_.add_option("--top", top_);
-  app_.add_option("--unit", unit_);
-  app_.add_flag("--with-library", options_.withLibrary);
-  app_.add_option("--format", format_)->check(CLI::IsMember({"text", "json", "dot"}));
-  app_.add_option("-o", options_.outputPath);
-  app_.add_flag("-q", options_.quiet);
-  app_.add_flag("-v", options_.verbose);
-  AddRepeated(app_, "--external-library", options_.externalLibraries);
-  app_.add_flag("--strict", options_.strict);
-  app_.add_flag("--warnings-as-errors", options_.warningsAsErrors);
+  app_.formatter(std::make_shared<HelpFormatter>());
+  app_.require_subcommand(0, 1);
+  app_.fallthrough();
+  app_.allow_extras();
+  app_.footer(std::string(kCommandHelp) + "\n" + OptionTable::ExitText());
+  app_.add_option("COMMAND", strayWords_)->group("");
+  for (const OptionSpec& option : OptionTable::All()) DeclareOption(app_, option, option.commands == 0);
+  for (const CommandSpec& command : OptionTable::Commands()) DeclareCommand(command);
+  help_ = app_.add_subcommand("help", "this help, or with a COMMAND the help of that command");
+  help_->add_option("COMMAND", helpTopic_);
+}
+
+std::size_t Parser::SourcesSoFar() const {
+  std::size_t count = 0;
+  for (const CommandApp& command : commands_) count += command.sourcesOption->results().size();
+  return count;
+}
+
+const Parser::CommandApp* Parser::SelectedCommand() const {
+  for (const CommandApp& command : commands_) {
+    if (command.app->parsed()) return &command;
+  }
+  return nullptr;
 }
 
 Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& error) {
   Declare();
   try {
     app_.parse(argc, argv);
+  } catch (const CLI::CallForHelp&) {
+    std::cout << app_.help();
+    return Options::Outcome::kHelpShown;
   } catch (const CLI::ParseError& failure) {
     error = failure.what();
     return Options::Outcome::kUsageError;
   }
-  if (help_) {
-    std::fputs(kUsage, stdout);
+  for (const Occurrence& occurrence : occurrences_) {
+    if (occurrence.option->commands == 0) occurrence.option->take(values_, occurrence.value);
+  }
+  if (values_.manPageAsked) {
+    ManPage::Write(std::cout);
     return Options::Outcome::kHelpShown;
   }
-
-  std::string library, plugin;
-  ArgumentWalk(app_).ForEach([&](const CLI::Option* option, const std::string& value) {
-    using Kind = SourceArgument::Kind;
-    if (option == libraryOption_) library = value;
-    if (option == pluginOption_) plugin = value;
-    if (option == positionalOption_) options_.sources.push_back({Kind::kFile, value, library, plugin});
-    if (option == projectOption_) options_.sources.push_back({Kind::kProjectFile, value, library, plugin});
-    if (option == listOption_) options_.sources.push_back({Kind::kFileList, value, library, plugin});
-  });
-  if (!TakePositionals(positionals_, error)) return Options::Outcome::kUsageError;
-
-  for (const std::string& property : properties_) {
-    std::pair<std::string, std::string> assignment;
-    if (!SplitAssignment(property, assignment)) {
-      error = "--property needs KEY=VALUE, not '" + property + "'";
-      return Options::Outcome::kUsageError;
-    }
-    options_.properties.push_back(assignment);
+  if (values_.completionWordsOf) {
+    ShowCompletionWords(*values_.completionWordsOf);
+    return Options::Outcome::kHelpShown;
   }
-  for (const std::string& define : options_.defines) {
-    if (define.empty() || define[0] == '=') {
-      error = "-D needs NAME[=VALUE], not '" + define + "'";
-      return Options::Outcome::kUsageError;
-    }
-    if (!Options::FitsList(define)) {
-      error = "-D '" + define + "' holds a ';', which would separate it into more than one macro";
-      return Options::Outcome::kUsageError;
-    }
+  if (values_.versionAsked) return Options::Outcome::kVersionAsked;
+  if (!TakeWords(error)) return Options::Outcome::kUsageError;
+  if (help_->parsed()) {
+    if (ShowHelpTopic()) return Options::Outcome::kHelpShown;
+    error = "unknown command '" + helpTopic_[0] + "'";
+    return Options::Outcome::kUsageError;
   }
-  for (const std::string& directory : options_.includeDirs) {
-    if (!Options::FitsList(directory)) {
-      error = "-I '" + directory + "' holds a ';', which would separate it into more than one directory";
-      return Options::Outcome::kUsageError;
-    }
+  const CommandApp* command = SelectedCommand();
+  if (!command) {
+    error = "no command given";
+    return Options::Outcome::kUsageError;
   }
-  options_.format = format_ == "json" ? Format::kJson : format_ == "dot" ? Format::kDot : Format::kText;
-  options_.top = unit_.empty() ? top_ : unit_;
-  options_.byUnit = !unit_.empty();
+  values_.options.command = command->spec->command;
+  if (command->spec->command == Command::kPorts && command->unit.empty()) {
+    error = "ports needs a UNIT";
+    return Options::Outcome::kUsageError;
+  }
+  values_.options.unit = command->unit;
+  TakeOccurrences(*command);
+  if (!CheckValues(error)) return Options::Outcome::kUsageError;
   return CheckCombination(error) ? Options::Outcome::kRun : Options::Outcome::kUsageError;
 }
 
-// The walk above took every positional as a source; the first one (and the UNIT of `ports`) are
-// not.
-bool Parser::TakePositionals(const std::vector<std::string>& positionals, std::string& error) {
-  if (positionals.empty()) {
-    error = "no command given";
+bool Parser::ShowHelpTopic() const {
+  if (helpTopic_.empty()) {
+    std::cout << app_.help();
+    return true;
+  }
+  for (const CommandApp& command : commands_) {
+    if (command.spec->name != helpTopic_[0]) continue;
+    std::cout << command.app->help();
+    return true;
+  }
+  return false;
+}
+
+// `of` is "commands", "options" (those of quillon itself), a command, or an option whose values
+// are wanted.
+void Parser::ShowCompletionWords(const std::string& of) const {
+  std::vector<std::string> words;
+  const CommandApp* command = nullptr;
+  for (const CommandApp& each : commands_) {
+    if (of == "commands") words.push_back(each.spec->name);
+    if (each.spec->name == of) command = &each;
+  }
+  if (of == "commands") words.push_back("help");
+  if (command || of == "options") words.insert(words.end(), {"-h", "--help"});
+  for (const OptionSpec& option : OptionTable::All()) {
+    std::vector<std::string> spellings = OptionTable::Spellings(option);
+    if (std::find(spellings.begin(), spellings.end(), of) != spellings.end())
+      words.insert(words.end(), option.choices.begin(), option.choices.end());
+    bool offered = option.commands == 0 ? command || of == "options"
+                                        : command && AppliesTo(option, command->spec->command);
+    if (offered && *option.group) words.insert(words.end(), spellings.begin(), spellings.end());
+  }
+  for (const std::string& word : words) std::cout << word << '\n';
+}
+
+// Words that no command or option took: a misspelt command or option, or an argument too many.
+bool Parser::TakeWords(std::string& error) {
+  std::vector<std::string> commandNames{"help"};
+  for (const CommandSpec& command : OptionTable::Commands()) commandNames.push_back(command.name);
+  if (!strayWords_.empty()) {
+    error =
+        "unknown command '" + strayWords_[0] + "'" + Suggestions::DidYouMean(strayWords_[0], commandNames);
     return false;
   }
-  auto command = CommandNames().find(positionals[0]);
-  if (command == CommandNames().end()) {
-    error = "unknown command '" + positionals[0] + "'";
+  std::vector<std::string> remaining = app_.remaining(true);
+  if (remaining.empty()) return true;
+  const std::string& word = remaining[0];
+  if (word.size() < 2 || word[0] != '-') {
+    error = "unexpected argument '" + word + "'";
     return false;
   }
-  options_.command = command->second;
-  std::size_t notSources = 1;
-  if (options_.command == Command::kPorts) {
-    if (positionals.size() < 2) {
-      error = "ports needs a UNIT";
+  std::vector<std::string> optionNames{"--help"};
+  for (const OptionSpec& option : OptionTable::All()) {
+    if (!*option.group) continue;
+    for (const std::string& spelling : OptionTable::Spellings(option))
+      if (spelling.size() > 2) optionNames.push_back(spelling);
+  }
+  std::string name = word.substr(0, word.find('='));
+  error = "unknown option '" + name + "'" + Suggestions::DidYouMean(name, optionNames);
+  return false;
+}
+
+// The sources of the command interleaved with the options, in command-line order.
+void Parser::TakeOccurrences(const CommandApp& command) {
+  std::size_t taken = 0;
+  auto takeSourcesUpTo = [&](std::size_t end) {
+    for (; taken < end && taken < command.sources.size(); ++taken)
+      values_.options.sources.push_back(
+          {SourceArgument::Kind::kFile, command.sources[taken], values_.library, values_.plugin});
+  };
+  for (const Occurrence& occurrence : occurrences_) {
+    takeSourcesUpTo(occurrence.sourcesBefore);
+    if (occurrence.option->commands != 0) occurrence.option->take(values_, occurrence.value);
+  }
+  takeSourcesUpTo(command.sources.size());
+}
+
+bool Parser::CheckValues(std::string& error) {
+  Options& options = values_.options;
+  for (const std::string& property : values_.properties) {
+    std::pair<std::string, std::string> assignment;
+    if (!SplitAssignment(property, assignment)) {
+      error = "--property needs KEY=VALUE, not '" + property + "'";
       return false;
     }
-    options_.unit = positionals[1];
-    notSources = 2;
+    options.properties.push_back(assignment);
   }
-  std::vector<SourceArgument>& sources = options_.sources;
-  std::size_t skipped = 0;
-  for (auto it = sources.begin(); it != sources.end() && skipped < notSources;) {
-    if (it->kind == SourceArgument::Kind::kFile) {
-      it = sources.erase(it);
-      ++skipped;
-    } else {
-      ++it;
+  for (const std::string& define : options.defines) {
+    if (define.empty() || define[0] == '=') {
+      error = "-D needs NAME[=VALUE], not '" + define + "'";
+      return false;
+    }
+    if (!Options::FitsList(define)) {
+      error = "-D '" + define + "' holds a ';', which would separate it into more than one macro";
+      return false;
     }
   }
+  for (const std::string& directory : options.includeDirs) {
+    if (!Options::FitsList(directory)) {
+      error = "-I '" + directory + "' holds a ';', which would separate it into more than one directory";
+      return false;
+    }
+  }
+  const std::string& format = values_.format;
+  options.format = format == "json" ? Format::kJson : format == "dot" ? Format::kDot : Format::kText;
+  options.color = values_.color == "always"  ? ColorMode::kAlways
+                  : values_.color == "never" ? ColorMode::kNever
+                                             : ColorMode::kAuto;
+  options.top = values_.unit.empty() ? values_.top : values_.unit;
+  options.byUnit = !values_.unit.empty();
   return true;
 }
 
 bool Parser::CheckCombination(std::string& error) const {
-  const Options& o = options_;
-  if (!top_.empty() && !unit_.empty()) {
+  const Options& o = values_.options;
+  if (!values_.top.empty() && !values_.unit.empty()) {
     error = "--top and --unit exclude each other";
     return false;
   }
