@@ -27,6 +27,7 @@ std::string Escaped(const std::string& text) {
 }
 
 std::string CommandsOf(const OptionSpec& option) {
+  if (option.commands == 0) return {};
   std::vector<std::string> names;
   std::size_t all = 0;
   for (const CommandSpec& command : OptionTable::Commands()) {
@@ -66,16 +67,20 @@ void ManPage::Write(std::ostream& out) {
     out << "\n" << Escaped(command.summary) << "\n";
   }
   out << ".TP\n\\fBhelp\\fR [\\fICOMMAND\\fR]\nthe list of commands, or the options of COMMAND\n";
+  // quillon's own options first, then those of the commands under their headings.
+  out << ".SH OPTIONS\n.TP\n\\fB\\-h\\fR, \\fB\\-\\-help\\fR\nthe help of quillon or of the command\n";
   std::vector<std::string> groups;
   for (const OptionSpec& option : OptionTable::All()) {
-    if (*option.group && std::find(groups.begin(), groups.end(), option.group) == groups.end())
+    if (!*option.group) continue;
+    if (option.commands == 0)
+      WriteOption(option, out);
+    else if (std::find(groups.begin(), groups.end(), option.group) == groups.end())
       groups.push_back(option.group);
   }
-  out << ".SH OPTIONS\n.TP\n\\fB\\-h\\fR, \\fB\\-\\-help\\fR\nthe help of quillon or of the command\n";
   for (const std::string& group : groups) {
     out << ".SS " << group << "\n";
     for (const OptionSpec& option : OptionTable::All()) {
-      if (option.group == group) WriteOption(option, out);
+      if (option.commands != 0 && option.group == group) WriteOption(option, out);
     }
   }
   out << ".SH ENVIRONMENT\n"

@@ -20,24 +20,31 @@ constexpr const char* kDescription =
     "order in which the files must be compiled.";
 constexpr const char* kCommandHelp = "Run 'quillon COMMAND --help' for the options of a command.";
 
-const CLI::Validator& WholeNumber() {
-  static const CLI::Validator validator(
-      [](std::string& text) -> std::string {
-        unsigned number = 0;
-        auto [end, failure] = std::from_chars(text.data(), text.data() + text.size(), number);
-        if (text.empty() || failure != std::errc() || end != text.data() + text.size())
-          return "'" + text + "' is not a whole number of seconds that quillon can count";
-        return {};
-      },
-      "");
-  return validator;
+bool IsWholeNumber(const std::string& text) {
+  unsigned number = 0;
+  auto [end, failure] = std::from_chars(text.data(), text.data() + text.size(), number);
+  return !text.empty() && failure == std::errc() && end == text.data() + text.size();
+}
+
+// The values of options with choices or numbers are checked here rather than by CLI11, which does
+// not name an option declared hidden in its message.
+bool CheckValue(const OptionSpec& option, const std::string& value, std::string& error) {
+  const std::string name = OptionTable::Spellings(option).back();
+  if (option.number && !IsWholeNumber(value)) {
+    error = name + ": '" + value + "' is not a whole number that quillon can count";
+    return false;
+  }
+  const std::vector<std::string>& choices = option.choices;
+  if (choices.empty() || std::find(choices.begin(), choices.end(), value) != choices.end()) return true;
+  error = name + ": '" + value + "' is not one of";
+  for (const std::string& choice : choices) error += " " + choice;
+  return false;
 }
 
 // CLI11 would show the command as an optional subcommand and the hidden catch of misspelt
 // commands as "[...]".
 class HelpFormatter : public CLI::Formatter {
  public:
-  HelpFormatter() { label("Subcommands", "Commands"); }
   std::string make_usage(const CLI::App* app, std::string name) const override {
     if (app->get_parent()) return CLI::Formatter::make_usage(app, std::move(name));
     return get_label("Usage") + ": " + name + " [OPTIONS] COMMAND [OPTIONS] [SOURCE...]\n";
@@ -51,11 +58,17 @@ bool SplitAssignment(const std::string& text, std::pair<std::string, std::string
   return true;
 }
 
+std::string UnknownCommand(const std::string& word) {
+  std::vector<std::string> names{"help"};
+  for (const CommandSpec& command : OptionTable::Commands()) names.push_back(command.name);
+  return "unknown command '" + word + "'" + Suggestions::DidYouMean(word, names);
+}
+
 bool AppliesTo(const OptionSpec& option, Command command) { return (option.commands & SetOf(command)) != 0; }
 
-// Options that take a value are recorded as they are parsed, with the number of sources before
-// them, so that -l and --plugin apply to the sources after them whether they stand before or after
-// the command. CLI11 runs the callbacks of parent and command in one pass over the arguments.
+// Options are recorded as they are parsed, with the number of sources before them, so that -l and --plugin
+// apply to the sources after them whether they stand before or after the command. CLI11 runs the callbacks of
+// parent and command in one pass over the arguments.
 class Parser {
  public:
   explicit Parser(Options& options) : values_(options) {}
@@ -85,7 +98,8 @@ class Parser {
   bool ShowHelpTopic() const;
   void ShowCompletionWords(const std::string& of) const;
   bool TakeWords(std::string& error);
-  void TakeOccurrences(const CommandApp& command);
+  bool Take(const Occurrence& occurrence, std::string& error);
+  bool TakeOccurrences(const CommandApp& command, std::string& error);
   bool CheckValues(std::string& error);
   bool CheckCombination(std::string& error) const;
 
@@ -107,8 +121,6 @@ void Parser::DeclareOption(CLI::App& app, const OptionSpec& option, bool shown) 
     declared = app.add_option_function<std::string>(option.names, record, option.help)
                    ->type_name(option.value)
                    ->allow_extra_args(false);
-    if (!option.choices.empty()) declared->check(CLI::IsMember(option.choices));
-    if (option.number) declared->check(WholeNumber());
   } else {
     declared = app.add_flag_callback(
         option.names, [record] { record(""); }, option.help);
@@ -117,21 +129,25 @@ void Parser::DeclareOption(CLI::App& app, const OptionSpec& option, bool shown) 
 }
 
 void Parser::DeclareCommand(const CommandSpec& spec) {
-  CLI::App* app = app_.add_subcommand(spec.name, spec.summary);
+  CLI::App* app = app_.add_subcommand(spec.name, spec.summary)->group("Commands");
   CommandApp& command = commands_.emplace_back(CommandApp{&spec, app, {}, {}, nullptr});
   if (*spec.operands) app->add_option(spec.operands, command.unit, "the design unit")->type_name("");
   command.sourcesOption =
       app->add_option("SOURCE", command.sources, "a source file; the plug-in follows from its extension")
           ->type_name("");
-  std::string footer = spec.command == Command::kFactories ? "" : OptionTable::UnitText();
-  app->footer(footer + (footer.empty() ? "" : "\n") + OptionTable::ExitText());
+  bool namesUnits = std::string_view(spec.operands) == "UNIT";
   for (const OptionSpec& option : OptionTable::All()) {
-    if (AppliesTo(option, spec.command)) DeclareOption(*app, option, true);
+    if (!AppliesTo(option, spec.command)) continue;
+    DeclareOption(*app, option, true);
+    namesUnits = namesUnits || (option.value && std::string_view(option.value) == "UNIT");
   }
+  app->footer(namesUnits ? std::string(OptionTable::UnitText()) + "\n" + OptionTable::ExitText()
+                         : OptionTable::ExitText());
 }
 
 // Every option is also declared, hidden, on quillon itself, so that it may stand before the
-// command as well; an option that does not apply to the command is refused after parsing.
+// command as well (or follow a command it does not apply to, as before: CheckCombination refuses
+// those that make no sense there, the others are ignored).
 void Parser::Declare() {
   app_.formatter(std::make_shared<HelpFormatter>());
   app_.require_subcommand(0, 1);
@@ -141,7 +157,8 @@ void Parser::Declare() {
   app_.add_option("COMMAND", strayWords_)->group("");
   for (const OptionSpec& option : OptionTable::All()) DeclareOption(app_, option, option.commands == 0);
   for (const CommandSpec& command : OptionTable::Commands()) DeclareCommand(command);
-  help_ = app_.add_subcommand("help", "this help, or with a COMMAND the help of that command");
+  help_ =
+      app_.add_subcommand("help", "this help, or with a COMMAND the help of that command")->group("Commands");
   help_->add_option("COMMAND", helpTopic_);
 }
 
@@ -170,7 +187,7 @@ Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& err
     return Options::Outcome::kUsageError;
   }
   for (const Occurrence& occurrence : occurrences_) {
-    if (occurrence.option->commands == 0) occurrence.option->take(values_, occurrence.value);
+    if (occurrence.option->commands == 0 && !Take(occurrence, error)) return Options::Outcome::kUsageError;
   }
   if (values_.manPageAsked) {
     ManPage::Write(std::cout);
@@ -184,7 +201,7 @@ Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& err
   if (!TakeWords(error)) return Options::Outcome::kUsageError;
   if (help_->parsed()) {
     if (ShowHelpTopic()) return Options::Outcome::kHelpShown;
-    error = "unknown command '" + helpTopic_[0] + "'";
+    error = UnknownCommand(helpTopic_[0]);
     return Options::Outcome::kUsageError;
   }
   const CommandApp* command = SelectedCommand();
@@ -198,19 +215,20 @@ Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& err
     return Options::Outcome::kUsageError;
   }
   values_.options.unit = command->unit;
-  TakeOccurrences(*command);
+  if (!TakeOccurrences(*command, error)) return Options::Outcome::kUsageError;
   if (!CheckValues(error)) return Options::Outcome::kUsageError;
   return CheckCombination(error) ? Options::Outcome::kRun : Options::Outcome::kUsageError;
 }
 
+// CLI11 would give the help of the selected command, which is `help` itself.
 bool Parser::ShowHelpTopic() const {
   if (helpTopic_.empty()) {
-    std::cout << app_.help();
+    std::cout << app_.get_formatter()->make_help(&app_, app_.get_name(), CLI::AppFormatMode::Normal);
     return true;
   }
   for (const CommandApp& command : commands_) {
     if (command.spec->name != helpTopic_[0]) continue;
-    std::cout << command.app->help();
+    std::cout << command.app->help(app_.get_name());
     return true;
   }
   return false;
@@ -240,11 +258,8 @@ void Parser::ShowCompletionWords(const std::string& of) const {
 
 // Words that no command or option took: a misspelt command or option, or an argument too many.
 bool Parser::TakeWords(std::string& error) {
-  std::vector<std::string> commandNames{"help"};
-  for (const CommandSpec& command : OptionTable::Commands()) commandNames.push_back(command.name);
   if (!strayWords_.empty()) {
-    error =
-        "unknown command '" + strayWords_[0] + "'" + Suggestions::DidYouMean(strayWords_[0], commandNames);
+    error = UnknownCommand(strayWords_[0]);
     return false;
   }
   std::vector<std::string> remaining = app_.remaining(true);
@@ -266,7 +281,13 @@ bool Parser::TakeWords(std::string& error) {
 }
 
 // The sources of the command interleaved with the options, in command-line order.
-void Parser::TakeOccurrences(const CommandApp& command) {
+bool Parser::Take(const Occurrence& occurrence, std::string& error) {
+  if (!CheckValue(*occurrence.option, occurrence.value, error)) return false;
+  occurrence.option->take(values_, occurrence.value);
+  return true;
+}
+
+bool Parser::TakeOccurrences(const CommandApp& command, std::string& error) {
   std::size_t taken = 0;
   auto takeSourcesUpTo = [&](std::size_t end) {
     for (; taken < end && taken < command.sources.size(); ++taken)
@@ -275,9 +296,10 @@ void Parser::TakeOccurrences(const CommandApp& command) {
   };
   for (const Occurrence& occurrence : occurrences_) {
     takeSourcesUpTo(occurrence.sourcesBefore);
-    if (occurrence.option->commands != 0) occurrence.option->take(values_, occurrence.value);
+    if (occurrence.option->commands != 0 && !Take(occurrence, error)) return false;
   }
   takeSourcesUpTo(command.sources.size());
+  return true;
 }
 
 bool Parser::CheckValues(std::string& error) {

@@ -2,7 +2,7 @@
 # they follow its commands and options.
 _quillon() {
   local cur=${COMP_WORDS[COMP_CWORD]} prev=${COMP_WORDS[COMP_CWORD-1]}
-  local program=${COMP_WORDS[0]} commands command="" word values
+  local program=${COMP_WORDS[0]} commands command="" word values=""
   commands=$("$program" --help-words commands 2>/dev/null)
   for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
     if [[ $'\n'$commands$'\n' == *$'\n'$word$'\n'* ]]; then
@@ -10,7 +10,7 @@ _quillon() {
       break
     fi
   done
-  values=$("$program" --help-words "$prev" 2>/dev/null)
+  [[ $prev == -* ]] && values=$("$program" --help-words "$prev" 2>/dev/null)
   if [[ -n $values ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$values" -- "$cur")
   elif [[ $cur == -* ]]; then
