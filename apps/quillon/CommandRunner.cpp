@@ -1,5 +1,7 @@
 #include "CommandRunner.h"
 
+#include <unistd.h>
+
 #include <algorithm>
 #include <cctype>
 #include <cinttypes>
@@ -30,6 +32,7 @@
 #include "ProjectBuilder.h"
 #include "ProjectLoader.h"
 #include "RavA/Factory.h"
+#include "TerminalColor.h"
 #include "TextOutput.h"
 #include "TreeReader.h"
 #include "TreeView.h"
@@ -89,16 +92,27 @@ std::vector<std::string> InputPaths(const ProjectSources& sources, const Options
 
 int CommandRunner::Run() {
   if (options_.command == Command::kFactories) return ListFactories();
-  MessageLog log(options_.quiet, options_.verbose);
+  MessageLog log(options_.quiet, options_.verbose, ColorOnStandardError());
   log_ = &log;
   int status = RunOnProject();
   log_ = nullptr;
   return status;
 }
 
+bool CommandRunner::ColorOnStandardError() const {
+  return TerminalColor::Wanted(options_.color, STDERR_FILENO);
+}
+
 int CommandRunner::BadInput(const std::string& text) {
   std::fprintf(stderr, "quillon: %s\n", text.c_str());
   return kExitBadInput;
+}
+
+Vad::IHdlDesignUnit* CommandRunner::FindUnit(ProjectReader& reader, const std::string& name) {
+  UnitFinder finder(reader.designUnits());
+  Vad::IHdlDesignUnit* unit = finder.Find(name);
+  if (!unit) BadInput("unknown design unit '" + name + "'" + finder.DidYouMean(name));
+  return unit;
 }
 
 int CommandRunner::Failed(const std::string& what, CitI::Result result) {
@@ -276,8 +290,8 @@ int CommandRunner::ComputeOrder(ProjectReader& reader, std::vector<OrderEntry>& 
   if (options_.top.empty()) {
     result = reader.Order(order);
   } else {
-    Vad::IHdlDesignUnit* unit = UnitFinder(reader.designUnits()).Find(options_.top);
-    if (!unit) return BadInput("unknown design unit '" + options_.top + "'");
+    Vad::IHdlDesignUnit* unit = FindUnit(reader, options_.top);
+    if (!unit) return kExitBadInput;
     result = reader.OrderOf(unit, options_.byUnit, order);
   }
   ordered = result == CitI::kOk;
@@ -354,8 +368,8 @@ int CommandRunner::Export(ProjectReader& reader, Vad::IHdlProject* project, std:
 // The module explains a failed extraction in its own messages; a unit whose kind of source has
 // no port extraction gets no answer and no message, so quillon says so itself.
 int CommandRunner::Ports(ProjectReader& reader, std::ostream& out) {
-  Vad::IHdlDesignUnit* unit = UnitFinder(reader.designUnits()).Find(options_.unit);
-  if (!unit) return BadInput("unknown design unit '" + options_.unit + "'");
+  Vad::IHdlDesignUnit* unit = FindUnit(reader, options_.unit);
+  if (!unit) return kExitBadInput;
   std::string key = KeyOf(unit);
   std::optional<std::vector<PortInfo>> ports;
   std::string reason;
@@ -427,7 +441,7 @@ std::vector<Diagnostic> CommandRunner::Diagnose(ProjectReader& reader, Vad::IHdl
 }
 
 void CommandRunner::ShowDiagnostics(const std::vector<Diagnostic>& diagnostics) const {
-  if (!options_.quiet) DiagnosticReport::Write(diagnostics, std::cerr);
+  if (!options_.quiet) DiagnosticReport::Write(diagnostics, std::cerr, ColorOnStandardError());
 }
 
 }  // namespace quillon

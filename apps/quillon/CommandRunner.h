@@ -39,6 +39,7 @@ class CommandRunner {
   // quillon's own findings about the design; `order` may be null.
   std::vector<Diagnostic> Diagnose(ProjectReader& reader, Vad::IHdlProject* project,
                                    const std::vector<OrderEntry>* order) const;
+  bool ColorOnStandardError() const;
   // Writes the diagnostics to standard error unless quiet.
   void ShowDiagnostics(const std::vector<Diagnostic>& diagnostics) const;
   // The messages so far, with their source files as the output shows them.
@@ -50,6 +51,8 @@ class CommandRunner {
   int Failed(const std::string& what, CitI::Result result);
   // The exit status of an operation that succeeded: kExitFailed when errors were reported.
   int Finished() const;
+  // The unit that `name` names, or null after saying it is unknown (and which units come close).
+  static Vad::IHdlDesignUnit* FindUnit(ProjectReader& reader, const std::string& name);
   // Writes "quillon: text" to standard error and returns kExitBadInput.
   static int BadInput(const std::string& text);
 

@@ -2,16 +2,20 @@
 
 #include <algorithm>
 
+#include "TerminalColor.h"
+
 namespace quillon {
 
-void DiagnosticReport::Write(const std::vector<Diagnostic>& diagnostics, std::ostream& out) {
+void DiagnosticReport::Write(const std::vector<Diagnostic>& diagnostics, std::ostream& out, bool color) {
   for (const Diagnostic& diagnostic : diagnostics) {
     if (!diagnostic.file.empty()) {
       out << diagnostic.file;
       if (diagnostic.line != 0) out << ':' << diagnostic.line;
       out << ": ";
     }
-    out << diagnostic.SeverityText() << ": " << diagnostic.text << " [" << diagnostic.code << "]\n";
+    std::string_view severity = diagnostic.SeverityText();
+    out << (color ? TerminalColor::Painted(severity, severity) : std::string(severity)) << ": "
+        << diagnostic.text << " [" << diagnostic.code << "]\n";
   }
 }
 

@@ -11,7 +11,8 @@ namespace quillon {
 
 class DiagnosticReport {
  public:
-  static void Write(const std::vector<Diagnostic>& diagnostics, std::ostream& out);
+  // `color` paints the severity words.
+  static void Write(const std::vector<Diagnostic>& diagnostics, std::ostream& out, bool color);
   // The same findings, every one a warning: the commands that still deliver their answer.
   static std::vector<Diagnostic> AsWarnings(std::vector<Diagnostic> diagnostics);
   static std::size_t Count(const std::vector<Diagnostic>& diagnostics, Diagnostic::Severity severity);

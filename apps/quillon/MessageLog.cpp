@@ -8,6 +8,7 @@
 #include <string>
 
 #include "Port/MsgDispatcher.h"
+#include "TerminalColor.h"
 
 namespace quillon {
 
@@ -44,7 +45,8 @@ void WriteDeveloperText(std::string_view text) { std::fwrite(text.data(), 1, tex
 
 }  // namespace
 
-MessageLog::MessageLog(bool quiet, bool verbose) : Port_MsgManDefault("quillon"), quiet_(quiet) {
+MessageLog::MessageLog(bool quiet, bool verbose, bool color)
+    : Port_MsgManDefault("quillon"), quiet_(quiet), color_(color) {
   Port_MsgMan* standard = Port_MsgDispatcher::getDefaultMsgMan();
   defaultWasRegistered_ = Port_MsgDispatcher::removeMsgMan(standard);
   Port_MsgDispatcher::addMsgMan(this);
@@ -94,7 +96,11 @@ void MessageLog::writeMsgLines(MsgType type, const wchar_t* const* lines, int co
   });
   if (blank) return;
   if (progress_) progress_->Clear();
-  Port_MsgManDefault::writeMsgLines(type, lines, count);
+  if (!color_) return Port_MsgManDefault::writeMsgLines(type, lines, count);
+  const std::string prefix = typePrefix(type);
+  std::string text =
+      FormatLines(TerminalColor::Painted(prefix, SeverityOf(type)), prefix.size(), lines, count);
+  std::fwrite(text.data(), 1, text.size(), stderr);
 }
 
 void MessageLog::writeMsgEnd(MsgType type) {

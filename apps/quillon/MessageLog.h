@@ -17,8 +17,9 @@ namespace quillon {
 class MessageLog : public Port_MsgManDefault {
  public:
   // Registers itself with the dispatcher in place of the default manager; `verbose` also sends
-  // the developer texts to standard error. Both are undone on destruction.
-  MessageLog(bool quiet, bool verbose);
+  // the developer texts to standard error. Both are undone on destruction. `color` paints the
+  // severity prefixes.
+  MessageLog(bool quiet, bool verbose, bool color);
   ~MessageLog() override;
 
   // An error message of quillon itself, through the message system like any other.
@@ -44,6 +45,7 @@ class MessageLog : public Port_MsgManDefault {
 
  private:
   bool quiet_;
+  bool color_;
   Progress* progress_ = nullptr;
   bool defaultWasRegistered_ = false;
   bool sinkInstalled_ = false;

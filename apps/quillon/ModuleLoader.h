@@ -12,8 +12,8 @@ class ModuleLoader {
   ModuleLoader(const ModuleLoader&) = delete;
   ModuleLoader& operator=(const ModuleLoader&) = delete;
 
-  // Opens the module named by QUILLON_MODULE, else the one built with this program, and calls
-  // its InstFactoryEntry. False with a one-line reason in `error`.
+  // Opens the module that InstallLayout::ModulePath names and calls its InstFactoryEntry. False with a
+  // one-line reason in `error`.
   bool Load(std::string& error);
   // The same with another module than the one built with this program, for hosts installed
   // elsewhere; QUILLON_MODULE still comes first.
@@ -21,6 +21,8 @@ class ModuleLoader {
   const std::string& path() const { return path_; }
 
  private:
+  bool Open(const std::string& path, std::string& error);
+
   void* handle_ = nullptr;
   std::string path_;
 };

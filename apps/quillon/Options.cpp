@@ -1,82 +1,55 @@
 #include "Options.h"
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
+#include <charconv>
 #include <cstdio>
-#include <map>
+#include <deque>
+#include <iostream>
+
+#include "ManPage.h"
+#include "OptionTable.h"
+#include "Suggestions.h"
 
 namespace quillon {
 
 namespace {
 
-constexpr const char* kUsage =
-    "usage: quillon [options] COMMAND [SOURCE...]\n"
-    "\n"
-    "commands:\n"
-    "  units        the design units of every source file\n"
-    "  tree         the design hierarchy\n"
-    "  order        the order in which the source files must be compiled\n"
-    "  ports UNIT   the ports of a design unit\n"
-    "  check        read everything and report problems only\n"
-    "  factories    the classes the module registers\n"
-    "  export --to make|ninja|depfile|ghdl|iverilog|edam|tcl\n"
-    "               the compile order as a build file or tool script (--top UNIT: its files)\n"
-    "\n"
-    "sources:\n"
-    "  SOURCE                a source file; the plug-in follows from its extension\n"
-    "  -P, --project FILE    a project file (JSON); its paths are relative to it\n"
-    "  DIR, 'GLOB'           the HDL files under a directory or matching a pattern, sorted\n"
-    "  -f FILE, -F FILE      a file list as simulators read it (-F: paths relative to the list)\n"
-    "  -y DIR, -v FILE       where instantiated modules that no source defines are looked for\n"
-    "  +incdir+DIR, +define+NAME=VALUE, +libext+.v  as in a file list\n"
-    "  --lib NAME=PATH       a file, directory or pattern whose files go into library NAME\n"
-    "  -l, --library NAME    the library of the sources after it (default work)\n"
-    "  --plugin NAME         the plug-in of the sources after it (e.g. PLUGIN_Verilog)\n"
-    "\n"
-    "project properties:\n"
-    "  -D NAME[=VALUE]       a Verilog macro\n"
-    "  -I DIR                a Verilog include directory\n"
-    "  --target NAME         the parse target\n"
-    "  --family NAME         the device family\n"
-    "  --property KEY=VALUE  any project property\n"
-    "  --converter-timeout SECONDS  the time a converter may take (default 300, 0 for none)\n"
-    "\n"
-    "tree:\n"
-    "  --top UNIT            the subtree below UNIT\n"
-    "  --depth N             N levels below the first; deeper nodes are counted\n"
-    "  --instances           instances only, no entity or package nodes\n"
-    "\n"
-    "order:\n"
-    "  --top UNIT            the order for UNIT and what it needs\n"
-    "  --unit UNIT           the order for UNIT alone\n"
-    "  --with-library        text output: the library before each path\n"
-    "\n"
-    "diagnostics:\n"
-    "  --external-library NAME  a library outside the project: its units are black boxes\n"
-    "  --strict              instances of units the project lacks are errors, not warnings\n"
-    "  --warnings-as-errors  check fails on warnings too\n"
-    "\n"
-    "output:\n"
-    "  --format text|json|dot, -o FILE, -q (no messages), --verbose (developer texts too)\n"
-    "  --absolute            full paths, also for sources given relative\n"
-    "\n"
-    "A UNIT is a design-unit key (Entity|cpu, Architecture|cpu|rtl, Module|top) or a name.\n"
-    "Exit status: 0 done, 1 the operation failed or an error was reported, 2 bad usage or input.\n";
+constexpr const char* kDescription =
+    "quillon reads HDL sources, finds their design units, builds the design hierarchy and computes the "
+    "order in which the files must be compiled.";
+constexpr const char* kCommandHelp = "Run 'quillon COMMAND --help' for the options of a command.";
 
-const std::map<std::string, Command>& CommandNames() {
-  static const std::map<std::string, Command> names = {
-      {"units", Command::kUnits},  {"tree", Command::kTree},   {"order", Command::kOrder},
-      {"ports", Command::kPorts},  {"check", Command::kCheck}, {"factories", Command::kFactories},
-      {"export", Command::kExport}};
-  return names;
+bool IsWholeNumber(const std::string& text) {
+  unsigned number = 0;
+  auto [end, failure] = std::from_chars(text.data(), text.data() + text.size(), number);
+  return !text.empty() && failure == std::errc() && end == text.data() + text.size();
 }
 
-// Each occurrence of an option takes exactly one value, so that "-l lib a.vhd" leaves a.vhd a
-// source.
-CLI::Option* AddRepeated(CLI::App& app, const std::string& names, std::vector<std::string>& values) {
-  return app.add_option(names, values)
-      ->allow_extra_args(false)
-      ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
+// The values of options with choices or numbers are checked here rather than by CLI11, which does
+// not name an option declared hidden in its message.
+bool CheckValue(const OptionSpec& option, const std::string& value, std::string& error) {
+  const std::string name = OptionTable::Spellings(option).back();
+  if (option.number && !IsWholeNumber(value)) {
+    error = name + ": '" + value + "' is not a whole number that quillon can count";
+    return false;
+  }
+  const std::vector<std::string>& choices = option.choices;
+  if (choices.empty() || std::find(choices.begin(), choices.end(), value) != choices.end()) return true;
+  error = name + ": '" + value + "' is not one of";
+  for (const std::string& choice : choices) error += " " + choice;
+  return false;
 }
+
+// CLI11 would show the command as an optional subcommand and the hidden catch of misspelt
+// commands as "[...]".
+class HelpFormatter : public CLI::Formatter {
+ public:
+  std::string make_usage(const CLI::App* app, std::string name) const override {
+    if (app->get_parent()) return CLI::Formatter::make_usage(app, std::move(name));
+    return get_label("Usage") + ": " + name + " [OPTIONS] COMMAND [OPTIONS] [SOURCE...]\n";
+  }
+};
 
 bool SplitAssignment(const std::string& text, std::pair<std::string, std::string>& out) {
   std::size_t equals = text.find('=');
@@ -85,195 +58,299 @@ bool SplitAssignment(const std::string& text, std::pair<std::string, std::string
   return true;
 }
 
-// The raw values that CLI11 collected, walked again in command-line order.
-class ArgumentWalk {
- public:
-  explicit ArgumentWalk(const CLI::App& app) : app_(app) {}
-  template <class Visit>
-  void ForEach(Visit visit) {
-    std::map<const CLI::Option*, std::size_t> taken;
-    for (const CLI::Option* option : app_.parse_order()) {
-      std::size_t index = taken[option]++;
-      const std::vector<std::string>& results = option->results();
-      visit(option, index < results.size() ? results[index] : std::string());
-    }
-  }
+std::string UnknownCommand(const std::string& word) {
+  std::vector<std::string> names{"help"};
+  for (const CommandSpec& command : OptionTable::Commands()) names.push_back(command.name);
+  return "unknown command '" + word + "'" + Suggestions::DidYouMean(word, names);
+}
 
- private:
-  const CLI::App& app_;
-};
+bool AppliesTo(const OptionSpec& option, Command command) { return (option.commands & SetOf(command)) != 0; }
 
+// Options are recorded as they are parsed, with the number of sources before them, so that -l and --plugin
+// apply to the sources after them whether they stand before or after the command. CLI11 runs the callbacks of
+// parent and command in one pass over the arguments.
 class Parser {
  public:
-  explicit Parser(Options& options) : options_(options) {}
+  explicit Parser(Options& options) : values_(options) {}
 
   Options::Outcome Run(int argc, const char* const* argv, std::string& error);
 
  private:
+  struct Occurrence {
+    const OptionSpec* option;
+    std::string value;
+    std::size_t sourcesBefore;
+  };
+  struct CommandApp {
+    const CommandSpec* spec;
+    CLI::App* app;
+    std::string unit;
+    std::vector<std::string> sources;
+    CLI::Option* sourcesOption;
+  };
+
   void Declare();
-  bool TakePositionals(const std::vector<std::string>& positionals, std::string& error);
+  void DeclareOption(CLI::App& app, const OptionSpec& option, bool shown);
+  void DeclareCommand(const CommandSpec& command);
+  std::size_t SourcesSoFar() const;
+  const CommandApp* SelectedCommand() const;
+
+  bool ShowHelpTopic() const;
+  void ShowCompletionWords(const std::string& of) const;
+  bool TakeWords(std::string& error);
+  bool Take(const Occurrence& occurrence, std::string& error);
+  bool TakeOccurrences(const CommandApp& command, std::string& error);
+  bool CheckValues(std::string& error);
   bool CheckCombination(std::string& error) const;
 
-  Options& options_;
-  CLI::App app_{"quillon"};
-  bool help_ = false;
-  std::vector<std::string> positionals_, projects_, lists_, libraries_, plugins_, properties_;
-  std::vector<std::string> relativeLists_, libraryDirs_, libraryFiles_, libraryAssignments_;
-  std::string top_, unit_, format_ = "text";
-  CLI::Option* positionalOption_ = nullptr;
-  CLI::Option* projectOption_ = nullptr;
-  CLI::Option* listOption_ = nullptr;
-  CLI::Option* libraryOption_ = nullptr;
-  CLI::Option* pluginOption_ = nullptr;
-  std::map<const CLI::Option*, SourceArgument::Kind> sourceKinds_;
-  CLI::Option* libraryAssignmentOption_ = nullptr;
+  CLI::App app_{kDescription, "quillon"};
+  OptionValues values_;
+  std::vector<Occurrence> occurrences_;
+  std::deque<CommandApp> commands_;  // stable addresses for the callbacks
+  std::vector<std::string> strayWords_;
+  CLI::App* help_ = nullptr;
+  std::vector<std::string> helpTopic_;
 };
 
+void Parser::DeclareOption(CLI::App& app, const OptionSpec& option, bool shown) {
+  auto record = [this, &option](const std::string& value) {
+    occurrences_.push_back({&option, value, SourcesSoFar()});
+  };
+  CLI::Option* declared;
+  if (option.value) {
+    declared = app.add_option_function<std::string>(option.names, record, option.help)
+                   ->type_name(option.value)
+                   ->allow_extra_args(false);
+  } else {
+    declared = app.add_flag_callback(
+        option.names, [record] { record(""); }, option.help);
+  }
+  declared->trigger_on_parse()->group(shown ? option.group : "");
+}
+
+void Parser::DeclareCommand(const CommandSpec& spec) {
+  CLI::App* app = app_.add_subcommand(spec.name, spec.summary)->group("Commands");
+  CommandApp& command = commands_.emplace_back(CommandApp{&spec, app, {}, {}, nullptr});
+  if (*spec.operands) app->add_option(spec.operands, command.unit, "the design unit")->type_name("");
+  command.sourcesOption =
+      app->add_option("SOURCE", command.sources, "a source file; the plug-in follows from its extension")
+          ->type_name("");
+  bool namesUnits = std::string_view(spec.operands) == "UNIT";
+  for (const OptionSpec& option : OptionTable::All()) {
+    if (!AppliesTo(option, spec.command)) continue;
+    DeclareOption(*app, option, true);
+    namesUnits = namesUnits || (option.value && std::string_view(option.value) == "UNIT");
+  }
+  app->footer(namesUnits ? std::string(OptionTable::UnitText()) + "\n" + OptionTable::ExitText()
+                         : OptionTable::ExitText());
+}
+
+// Every option is also declared, hidden, on quillon itself, so that it may stand before the
+// command as well (or follow a command it does not apply to, as before: CheckCombination refuses
+// those that make no sense there, the others are ignored).
 void Parser::Declare() {
-  app_.set_help_flag();
-  app_.add_flag("-h,--help", help_);
-  positionalOption_ = app_.add_option("args", positionals_);
-  projectOption_ = AddRepeated(app_, "-P,--project", projects_);
-  listOption_ = AddRepeated(app_, "-f", lists_);
-  libraryOption_ = AddRepeated(app_, "-l,--library", libraries_);
-  pluginOption_ = AddRepeated(app_, "--plugin", plugins_);
-  using Kind = SourceArgument::Kind;
-  sourceKinds_ = {{positionalOption_, Kind::kFile},
-                  {projectOption_, Kind::kProjectFile},
-                  {listOption_, Kind::kFileList},
-                  {AddRepeated(app_, "-F", relativeLists_), Kind::kFileListRelative},
-                  {AddRepeated(app_, "-y", libraryDirs_), Kind::kLibraryDir},
-                  {AddRepeated(app_, "-v", libraryFiles_), Kind::kLibraryFile}};
-  libraryAssignmentOption_ = AddRepeated(app_, "--lib", libraryAssignments_);
-  app_.add_flag("--absolute", options_.absolutePaths);
-  AddRepeated(app_, "-D", options_.defines);
-  AddRepeated(app_, "-I", options_.includeDirs);
-  app_.add_option("--target", options_.target);
-  app_.add_option("--family", options_.family);
-  AddRepeated(app_, "--property", properties_);
-  app_.add_option("--converter-timeout", options_.converterTimeout)->check(CLI::NonNegativeNumber);
-  app_.add_option("--top", top_);
-  app_.add_option("--unit", unit_);
-  app_.add_flag("--with-library", options_.withLibrary);
-  app_.add_option("--depth", options_.depth)->check(CLI::NonNegativeNumber);
-  app_.add_flag("--instances", options_.instancesOnly);
-  app_.add_option("--to", options_.exportTo)
-      ->check(CLI::IsMember({"make", "ninja", "depfile", "ghdl", "iverilog", "edam", "tcl"}));
-  app_.add_option("--format", format_)->check(CLI::IsMember({"text", "json", "dot"}));
-  app_.add_option("-o", options_.outputPath);
-  app_.add_flag("-q", options_.quiet);
-  app_.add_flag("--verbose", options_.verbose);
-  AddRepeated(app_, "--external-library", options_.externalLibraries);
-  app_.add_flag("--strict", options_.strict);
-  app_.add_flag("--warnings-as-errors", options_.warningsAsErrors);
+  app_.formatter(std::make_shared<HelpFormatter>());
+  app_.require_subcommand(0, 1);
+  app_.fallthrough();
+  app_.allow_extras();
+  app_.footer(std::string(kCommandHelp) + "\n" + OptionTable::ExitText());
+  app_.add_option("COMMAND", strayWords_)->group("");
+  for (const OptionSpec& option : OptionTable::All()) DeclareOption(app_, option, option.commands == 0);
+  for (const CommandSpec& command : OptionTable::Commands()) DeclareCommand(command);
+  help_ =
+      app_.add_subcommand("help", "this help, or with a COMMAND the help of that command")->group("Commands");
+  help_->add_option("COMMAND", helpTopic_);
+}
+
+std::size_t Parser::SourcesSoFar() const {
+  std::size_t count = 0;
+  for (const CommandApp& command : commands_) count += command.sourcesOption->results().size();
+  return count;
+}
+
+const Parser::CommandApp* Parser::SelectedCommand() const {
+  for (const CommandApp& command : commands_) {
+    if (command.app->parsed()) return &command;
+  }
+  return nullptr;
 }
 
 Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& error) {
   Declare();
   try {
     app_.parse(argc, argv);
+  } catch (const CLI::CallForHelp&) {
+    std::cout << app_.help();
+    return Options::Outcome::kHelpShown;
   } catch (const CLI::ParseError& failure) {
     error = failure.what();
     return Options::Outcome::kUsageError;
   }
-  if (help_) {
-    std::fputs(kUsage, stdout);
+  for (const Occurrence& occurrence : occurrences_) {
+    if (occurrence.option->commands == 0 && !Take(occurrence, error)) return Options::Outcome::kUsageError;
+  }
+  if (values_.manPageAsked) {
+    ManPage::Write(std::cout);
     return Options::Outcome::kHelpShown;
   }
-
-  std::string library, plugin;
-  // The -l or --plugin given last while no source followed it yet.
-  std::string unapplied;
-  ArgumentWalk(app_).ForEach([&](const CLI::Option* option, const std::string& value) {
-    if (option == libraryOption_) library = value;
-    if (option == pluginOption_) plugin = value;
-    if (option == libraryOption_ || option == pluginOption_) unapplied = option->get_name() + " " + value;
-    if (auto kind = sourceKinds_.find(option); kind != sourceKinds_.end()) {
-      options_.sources.push_back({kind->second, value, library, plugin});
-      unapplied.clear();
-    }
-    std::pair<std::string, std::string> assignment;
-    if (option == libraryAssignmentOption_ && SplitAssignment(value, assignment)) {
-      options_.sources.push_back({SourceArgument::Kind::kFile, assignment.second, assignment.first, plugin});
-    } else if (option == libraryAssignmentOption_ && error.empty()) {
-      error = "--lib needs NAME=PATH, not '" + value + "'";
-    }
-  });
-  if (!error.empty()) return Options::Outcome::kUsageError;
-  if (!unapplied.empty()) {
-    error = unapplied + " applies to no source: give it before the sources it is for";
+  if (values_.completionWordsOf) {
+    ShowCompletionWords(*values_.completionWordsOf);
+    return Options::Outcome::kHelpShown;
+  }
+  if (values_.versionAsked) return Options::Outcome::kVersionAsked;
+  if (!TakeWords(error)) return Options::Outcome::kUsageError;
+  if (help_->parsed()) {
+    if (ShowHelpTopic()) return Options::Outcome::kHelpShown;
+    error = UnknownCommand(helpTopic_[0]);
     return Options::Outcome::kUsageError;
   }
-  if (!TakePositionals(positionals_, error)) return Options::Outcome::kUsageError;
-
-  for (const std::string& property : properties_) {
-    std::pair<std::string, std::string> assignment;
-    if (!SplitAssignment(property, assignment)) {
-      error = "--property needs KEY=VALUE, not '" + property + "'";
-      return Options::Outcome::kUsageError;
-    }
-    options_.properties.push_back(assignment);
+  const CommandApp* command = SelectedCommand();
+  if (!command) {
+    error = "no command given";
+    return Options::Outcome::kUsageError;
   }
-  for (const std::string& define : options_.defines) {
-    if (define.empty() || define[0] == '=') {
-      error = "-D needs NAME[=VALUE], not '" + define + "'";
-      return Options::Outcome::kUsageError;
-    }
-    if (!Options::FitsList(define)) {
-      error = "-D '" + define + "' holds a ';', which would separate it into more than one macro";
-      return Options::Outcome::kUsageError;
-    }
+  values_.options.command = command->spec->command;
+  if (command->spec->command == Command::kPorts && command->unit.empty()) {
+    error = "ports needs a UNIT";
+    return Options::Outcome::kUsageError;
   }
-  for (const std::string& directory : options_.includeDirs) {
-    if (!Options::FitsList(directory)) {
-      error = "-I '" + directory + "' holds a ';', which would separate it into more than one directory";
-      return Options::Outcome::kUsageError;
-    }
-  }
-  options_.format = format_ == "json" ? Format::kJson : format_ == "dot" ? Format::kDot : Format::kText;
-  options_.top = unit_.empty() ? top_ : unit_;
-  options_.byUnit = !unit_.empty();
+  values_.options.unit = command->unit;
+  if (!TakeOccurrences(*command, error)) return Options::Outcome::kUsageError;
+  if (!CheckValues(error)) return Options::Outcome::kUsageError;
   return CheckCombination(error) ? Options::Outcome::kRun : Options::Outcome::kUsageError;
 }
 
-// The walk above took every positional as a source; the first one (and the UNIT of `ports`) are
-// not.
-bool Parser::TakePositionals(const std::vector<std::string>& positionals, std::string& error) {
-  if (positionals.empty()) {
-    error = "no command given";
+// CLI11 would give the help of the selected command, which is `help` itself.
+bool Parser::ShowHelpTopic() const {
+  if (helpTopic_.empty()) {
+    std::cout << app_.get_formatter()->make_help(&app_, app_.get_name(), CLI::AppFormatMode::Normal);
+    return true;
+  }
+  for (const CommandApp& command : commands_) {
+    if (command.spec->name != helpTopic_[0]) continue;
+    std::cout << command.app->help(app_.get_name());
+    return true;
+  }
+  return false;
+}
+
+// `of` is "commands", "options" (those of quillon itself), a command, or an option whose values
+// are wanted.
+void Parser::ShowCompletionWords(const std::string& of) const {
+  std::vector<std::string> words;
+  const CommandApp* command = nullptr;
+  for (const CommandApp& each : commands_) {
+    if (of == "commands") words.push_back(each.spec->name);
+    if (each.spec->name == of) command = &each;
+  }
+  if (of == "commands") words.push_back("help");
+  if (command || of == "options") words.insert(words.end(), {"-h", "--help"});
+  for (const OptionSpec& option : OptionTable::All()) {
+    std::vector<std::string> spellings = OptionTable::Spellings(option);
+    if (std::find(spellings.begin(), spellings.end(), of) != spellings.end())
+      words.insert(words.end(), option.choices.begin(), option.choices.end());
+    bool offered = option.commands == 0 ? command || of == "options"
+                                        : command && AppliesTo(option, command->spec->command);
+    if (offered && *option.group) words.insert(words.end(), spellings.begin(), spellings.end());
+  }
+  for (const std::string& word : words) std::cout << word << '\n';
+}
+
+// Words that no command or option took: a misspelt command or option, or an argument too many.
+bool Parser::TakeWords(std::string& error) {
+  if (!strayWords_.empty()) {
+    error = UnknownCommand(strayWords_[0]);
     return false;
   }
-  auto command = CommandNames().find(positionals[0]);
-  if (command == CommandNames().end()) {
-    error = "unknown command '" + positionals[0] + "'";
+  std::vector<std::string> remaining = app_.remaining(true);
+  if (remaining.empty()) return true;
+  const std::string& word = remaining[0];
+  if (word.size() < 2 || word[0] != '-') {
+    error = "unexpected argument '" + word + "'";
     return false;
   }
-  options_.command = command->second;
-  std::size_t notSources = 1;
-  if (options_.command == Command::kPorts) {
-    if (positionals.size() < 2) {
-      error = "ports needs a UNIT";
-      return false;
-    }
-    options_.unit = positionals[1];
-    notSources = 2;
+  std::vector<std::string> optionNames{"--help"};
+  for (const OptionSpec& option : OptionTable::All()) {
+    if (!*option.group) continue;
+    for (const std::string& spelling : OptionTable::Spellings(option))
+      if (spelling.size() > 2) optionNames.push_back(spelling);
   }
-  std::vector<SourceArgument>& sources = options_.sources;
-  std::size_t skipped = 0;
-  for (auto it = sources.begin(); it != sources.end() && skipped < notSources;) {
-    if (it->kind == SourceArgument::Kind::kFile) {
-      it = sources.erase(it);
-      ++skipped;
-    } else {
-      ++it;
+  std::string name = word.substr(0, word.find('='));
+  error = "unknown option '" + name + "'" + Suggestions::DidYouMean(name, optionNames);
+  return false;
+}
+
+// The sources of the command interleaved with the options, in command-line order.
+bool Parser::Take(const Occurrence& occurrence, std::string& error) {
+  if (!CheckValue(*occurrence.option, occurrence.value, error)) return false;
+  occurrence.option->take(values_, occurrence.value);
+  return true;
+}
+
+bool Parser::TakeOccurrences(const CommandApp& command, std::string& error) {
+  std::size_t taken = 0;
+  auto takeSourcesUpTo = [&](std::size_t end) {
+    for (; taken < end && taken < command.sources.size(); ++taken) {
+      values_.options.sources.push_back(
+          {SourceArgument::Kind::kFile, command.sources[taken], values_.library, values_.plugin});
+      values_.unapplied.clear();
     }
+  };
+  for (const Occurrence& occurrence : occurrences_) {
+    takeSourcesUpTo(occurrence.sourcesBefore);
+    if (occurrence.option->commands != 0 && !Take(occurrence, error)) return false;
+  }
+  takeSourcesUpTo(command.sources.size());
+  if (!values_.error.empty()) {
+    error = values_.error;
+    return false;
+  }
+  if (!values_.unapplied.empty()) {
+    error = values_.unapplied + " applies to no source: give it before the sources it is for";
+    return false;
   }
   return true;
 }
 
+bool Parser::CheckValues(std::string& error) {
+  Options& options = values_.options;
+  for (const std::string& property : values_.properties) {
+    std::pair<std::string, std::string> assignment;
+    if (!SplitAssignment(property, assignment)) {
+      error = "--property needs KEY=VALUE, not '" + property + "'";
+      return false;
+    }
+    options.properties.push_back(assignment);
+  }
+  for (const std::string& define : options.defines) {
+    if (define.empty() || define[0] == '=') {
+      error = "-D needs NAME[=VALUE], not '" + define + "'";
+      return false;
+    }
+    if (!Options::FitsList(define)) {
+      error = "-D '" + define + "' holds a ';', which would separate it into more than one macro";
+      return false;
+    }
+  }
+  for (const std::string& directory : options.includeDirs) {
+    if (!Options::FitsList(directory)) {
+      error = "-I '" + directory + "' holds a ';', which would separate it into more than one directory";
+      return false;
+    }
+  }
+  const std::string& format = values_.format;
+  options.format = format == "json" ? Format::kJson : format == "dot" ? Format::kDot : Format::kText;
+  options.color = values_.color == "always"  ? ColorMode::kAlways
+                  : values_.color == "never" ? ColorMode::kNever
+                                             : ColorMode::kAuto;
+  options.top = values_.unit.empty() ? values_.top : values_.unit;
+  options.byUnit = !values_.unit.empty();
+  return true;
+}
+
 bool Parser::CheckCombination(std::string& error) const {
-  const Options& o = options_;
-  if (!top_.empty() && !unit_.empty()) {
+  const Options& o = values_.options;
+  if (!values_.top.empty() && !values_.unit.empty()) {
     error = "--top and --unit exclude each other";
     return false;
   }

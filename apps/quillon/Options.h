@@ -11,12 +11,13 @@ namespace quillon {
 
 enum class Command { kUnits, kTree, kOrder, kPorts, kCheck, kFactories, kExport };
 enum class Format { kText, kJson, kDot };
+enum class ColorMode { kAuto, kAlways, kNever };
 
 // One argument that names sources, in command-line order, with the library and plug-in that the
 // -l/--library and --plugin options before it put in effect (empty when none was given).
 struct SourceArgument {
   // kFile also stands for a directory, a glob pattern or a +incdir+/+define+/+libext+ token;
-  // kFileListRelative is -F, kLibraryDir -y, kLibraryFile -v.
+  // kFileListRelative is -F, kLibraryDir -y, kLibraryFile --library-file (-v in a file list).
   enum class Kind { kFile, kProjectFile, kFileList, kFileListRelative, kLibraryDir, kLibraryFile };
   Kind kind = Kind::kFile;
   std::string path;
@@ -26,10 +27,11 @@ struct SourceArgument {
 
 class Options {
  public:
-  enum class Outcome { kRun, kHelpShown, kUsageError };
+  enum class Outcome { kRun, kHelpShown, kVersionAsked, kUsageError };
 
   // Fills `options` from the arguments. kUsageError comes with a one-line reason in `error`;
-  // kHelpShown means the usage text was written to standard output.
+  // kHelpShown means a help text (the usage, a command's help, the manual page or the words for
+  // shell completion) was written to standard output.
   static Outcome Parse(int argc, const char* const* argv, Options& options, std::string& error);
 
   // False when `value` holds the ';' that separates the entries of the module's macro and include
@@ -60,6 +62,7 @@ class Options {
   bool quiet = false;
   bool verbose = false;
   bool absolutePaths = false;  // --absolute: full paths even where relative ones were given
+  ColorMode color = ColorMode::kAuto;
 
   // Diagnostics: libraries whose units are black boxes, black boxes as errors, and (for check)
   // warnings as errors.

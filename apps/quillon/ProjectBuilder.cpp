@@ -1,5 +1,6 @@
 #include "ProjectBuilder.h"
 
+#include <optional>
 #include <vector>
 
 #include "HdlSets.h"
@@ -11,14 +12,23 @@
 #include "IFileCompReference.h"
 #include "ISourceLibraryMember.h"
 #include "Identifiers.h"
+#include "InstallLayout.h"
 #include "PluginTable.h"
 #include "Port/Env.h"
 
 namespace quillon {
 
+// An installed quillon brings its data along; the host library knows only the build tree's.
 void ProjectBuilder::SetInstallRootWhenUnset() {
-  const char* installRoot = Port_Env::GetEnv("CORVANE");
-  if (!installRoot || !*installRoot) Port_Env::SetEnv("CORVANE", Port_Env::GetInstallRoot().c_str());
+  std::optional<std::string> installed = InstallLayout::InstalledDataDir();
+  std::string root = installed ? *installed : Port_Env::GetInstallRoot().str();
+  SetWhenUnset("CORVANE", root);
+  if (installed) SetWhenUnset("QUILLON_DATA_DIR", root + "/share");
+}
+
+void ProjectBuilder::SetWhenUnset(const char* name, const std::string& value) {
+  const char* current = Port_Env::GetEnv(name);
+  if (!current || !*current) Port_Env::SetEnv(name, value.c_str());
 }
 
 bool ProjectBuilder::Build(const ProjectSources& sources, std::string& error) {

@@ -15,8 +15,8 @@ namespace quillon {
 
 class ProjectBuilder {
  public:
-  // Points CORVANE at the host's installation root, where the cell libraries lie, unless the
-  // environment names one already.
+  // Points CORVANE at the installation root, where the cell libraries lie (and QUILLON_DATA_DIR at
+  // its data when quillon is installed), unless the environment names them already.
   static void SetInstallRootWhenUnset();
 
   // Creates the project with the properties and files of `sources`. The first file gets the largest
@@ -27,6 +27,7 @@ class ProjectBuilder {
   Vad::IHdlProject* project() const { return project_.Get(); }
 
  private:
+  static void SetWhenUnset(const char* name, const std::string& value);
   bool SetProperties(const ProjectSources& sources, std::string& error);
   bool AddFile(const SourceFile& source, std::uint64_t orderKey, std::string& error);
   Vad::IFileType* FileTypeOf(const std::string& plugin);

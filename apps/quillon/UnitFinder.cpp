@@ -4,6 +4,7 @@
 #include "IName.h"
 #include "Port/StringBase.h"
 #include "Prjrep/AutoPtr.h"
+#include "Suggestions.h"
 
 namespace quillon {
 
@@ -43,6 +44,14 @@ Vad::IHdlDesignUnit* UnitFinder::Find(std::string_view unit) const {
     if (found) return found;
   }
   return nullptr;
+}
+
+std::string UnitFinder::DidYouMean(std::string_view unit) const {
+  bool isKey = unit.find('|') != std::string_view::npos;
+  std::vector<std::string> known;
+  for (const Candidate& candidate : candidates_)
+    known.emplace_back(isKey ? std::string_view(candidate.key) : NameInKey(candidate.key));
+  return Suggestions::DidYouMean(unit, known);
 }
 
 Vad::IHdlDesignUnit* UnitFinder::FindKey(std::string_view key, int compareType) const {

@@ -20,6 +20,8 @@ class UnitFinder {
   // Null when nothing matches. An exact match wins over one that ignores letter case. The answer
   // carries no reference: the set keeps it alive.
   Vad::IHdlDesignUnit* Find(std::string_view unit) const;
+  // "; did you mean ...?" with the closest keys (for a key) or names (for a name), or "".
+  std::string DidYouMean(std::string_view unit) const;
 
  private:
   struct Candidate {

@@ -5,7 +5,17 @@
 
 #include "CommandRunner.h"
 #include "ExitStatus.h"
+#include "InstallLayout.h"
 #include "Options.h"
+
+namespace {
+
+int ShowVersion() {
+  std::printf("quillon %s\nmodule %s\n", QUILLON_VERSION, quillon::InstallLayout::ModulePath().c_str());
+  return quillon::kExitDone;
+}
+
+}  // namespace
 
 int main(int argc, char** argv) {
   quillon::Options options;
@@ -14,6 +24,8 @@ int main(int argc, char** argv) {
     switch (quillon::Options::Parse(argc, argv, options, error)) {
       case quillon::Options::Outcome::kHelpShown:
         return quillon::kExitDone;
+      case quillon::Options::Outcome::kVersionAsked:
+        return ShowVersion();
       case quillon::Options::Outcome::kUsageError:
         std::fprintf(stderr, "quillon: %s (see quillon --help)\n", error.c_str());
         return quillon::kExitBadInput;

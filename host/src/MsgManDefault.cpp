@@ -44,14 +44,19 @@ bool Port_MsgManDefault::getAbortFlag() const { return abort_; }
 void Port_MsgManDefault::writeMsgLines(MsgType type, const wchar_t* const* lines, int count) {
   if (!lines || count < 1) return;
   const std::string prefix = typePrefix(type);
-  const std::string indent(prefix.size(), ' ');
+  WriteToStandardError(FormatLines(prefix, prefix.size(), lines, count));
+}
+
+std::string Port_MsgManDefault::FormatLines(const std::string& prefix, std::size_t indentWidth,
+                                            const wchar_t* const* lines, int count) {
+  const std::string indent(indentWidth, ' ');
   std::string text;
   for (int i = 0; i < count; ++i) {
     text += i == 0 ? prefix : indent;
     if (lines[i]) text += Port::MsgText::Narrow(lines[i]);
     text += '\n';
   }
-  WriteToStandardError(text);
+  return text;
 }
 
 void Port_MsgManDefault::writeMsgEnd(MsgType) { std::fflush(stderr); }

@@ -40,12 +40,32 @@ std::vector<char*> PointersTo(std::vector<std::string>& texts) {
   return pointers;
 }
 
+// The terminal side of a pseudo-terminal whose other side `master` holds; -1 when none opens.
+int OpenTerminal(int& master) {
+  master = posix_openpt(O_RDWR | O_NOCTTY);
+  if (master < 0 || grantpt(master) != 0 || unlockpt(master) != 0) return -1;
+  const char* name = ptsname(master);
+  return name ? open(name, O_RDWR | O_NOCTTY) : -1;
+}
+
+// What a child wrote to the terminal, read once it has ended: enough for the few lines of a test, as
+// the terminal holds some kilobytes. The read fails once the buffer is drained.
+std::string ReadTerminal(int master) {
+  std::string text;
+  char buffer[4096];
+  for (ssize_t got; (got = read(master, buffer, sizeof buffer)) > 0;)
+    text.append(buffer, static_cast<std::size_t>(got));
+  return text;
+}
+
 }  // namespace
 
-CliResult RunQuillon(const CliRun& run) {
+CliResult RunQuillon(const CliRun& run) { return RunProgram(QUILLON_CLI_PATH, run); }
+
+CliResult RunProgram(const std::string& program, const CliRun& run) {
   ScopedTempDir capture;
   std::string outPath = capture.Path("stdout"), errPath = capture.Path("stderr");
-  std::vector<std::string> argv{QUILLON_CLI_PATH};
+  std::vector<std::string> argv{program};
   argv.insert(argv.end(), run.args.begin(), run.args.end());
   std::vector<std::string> environment = EnvironmentWith(run.environment);
   std::vector<char*> argPointers = PointersTo(argv), envPointers = PointersTo(environment);
@@ -56,17 +76,24 @@ CliResult RunQuillon(const CliRun& run) {
                                    run.inputPath.empty() ? "/dev/null" : run.inputPath.c_str(), O_RDONLY, 0);
   posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, outPath.c_str(), O_WRONLY | O_CREAT | O_TRUNC,
                                    0600);
-  posix_spawn_file_actions_addopen(&actions, STDERR_FILENO, errPath.c_str(), O_WRONLY | O_CREAT | O_TRUNC,
-                                   0600);
+  int master = -1, terminal = run.errorToTerminal ? OpenTerminal(master) : -1;
+  if (terminal >= 0) {
+    posix_spawn_file_actions_adddup2(&actions, terminal, STDERR_FILENO);
+  } else {
+    posix_spawn_file_actions_addopen(&actions, STDERR_FILENO, errPath.c_str(), O_WRONLY | O_CREAT | O_TRUNC,
+                                     0600);
+  }
   if (!run.workDir.empty()) posix_spawn_file_actions_addchdir_np(&actions, run.workDir.c_str());
   pid_t child = 0;
   int spawned =
       posix_spawn(&child, argv[0].c_str(), &actions, nullptr, argPointers.data(), envPointers.data());
   posix_spawn_file_actions_destroy(&actions);
+  if (terminal >= 0) close(terminal);
 
   CliResult result;
   if (spawned != 0) {
-    result.err = std::string("cannot start quillon: ") + std::strerror(spawned);
+    result.err = std::string("cannot start ") + argv[0] + ": " + std::strerror(spawned);
+    if (master >= 0) close(master);
     return result;
   }
   int waitStatus = 0;
@@ -74,7 +101,8 @@ CliResult RunQuillon(const CliRun& run) {
   }
   result.status = WIFEXITED(waitStatus) ? WEXITSTATUS(waitStatus) : 128 + WTERMSIG(waitStatus);
   result.out = ReadFile(outPath);
-  result.err = ReadFile(errPath);
+  result.err = terminal >= 0 ? ReadTerminal(master) : ReadFile(errPath);
+  if (master >= 0) close(master);
   return result;
 }
 

@@ -21,11 +21,14 @@ struct CliRun {
   std::string workDir;                                           // empty: the test's own
   std::vector<std::pair<std::string, std::string>> environment;  // added to the test's own
   std::string inputPath = {};                                     // standard input; empty: none
+  bool errorToTerminal = false;  // standard error on a pseudo-terminal instead of a file
 };
 
-// Standard output and standard error go to files of a temporary directory, so that neither can
-// fill a pipe and block the child.
+// Standard output and standard error go to files (or standard error to a terminal) of a temporary directory,
+// so that neither can fill a pipe and block the child.
 CliResult RunQuillon(const CliRun& run);
+// The same for another program.
+CliResult RunProgram(const std::string& program, const CliRun& run);
 inline CliResult RunQuillon(std::vector<std::string> args) {
   return RunQuillon(CliRun{std::move(args), {}, {}});
 }

@@ -24,15 +24,6 @@ void ExpectOneLineNaming(const CliResult& result, const std::string& named) {
   EXPECT_NE(lines[0].find(named), std::string::npos) << lines[0];
 }
 
-TEST(CommandLine, HelpListsEveryCommandAndExitsZero) {
-  CliResult result = RunQuillon({"--help"});
-  EXPECT_EQ(result.status, 0);
-  for (const char* command : {"units", "tree", "order", "ports UNIT", "check", "--top", "--depth",
-                              "--instances", "--with-library"}) {
-    EXPECT_NE(result.out.find(command), std::string::npos) << command;
-  }
-}
-
 TEST(CommandLine, UsageMistakesAreRejectedWithStatusTwo) {
   const std::string top = DataPath("mixed/top.vhd");
   const std::vector<BadInput> cases = {

@@ -34,7 +34,7 @@ const std::vector<std::string> kNeeded = {"rtl/top.v", "rtl/counter.v", "lib/alu
 
 TEST(SourceArguments, LibraryModulesAreReadWhenInstantiatedAndNotDefined) {
   EXPECT_EQ(OrderIn(kLibsearch, {"-F", "rtl/files.f"}), kNeeded);
-  EXPECT_EQ(OrderIn(kLibsearch, {"rtl/top.v", "rtl/counter.v", "-y", "lib", "-v", "cells/cells.v"}), kNeeded);
+  EXPECT_EQ(OrderIn(kLibsearch, {"rtl/top.v", "rtl/counter.v", "-y", "lib", "--library-file", "cells/cells.v"}), kNeeded);
   ScopedTextFile list("rtl/top.v\n-y lib\n  -v cells/absent.v\n");
   CliResult missing = RunIn(kLibsearch, {"units", "-f", list.path()});
   EXPECT_EQ(missing.status, 2);

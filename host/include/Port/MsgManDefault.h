@@ -92,6 +92,12 @@ class Port_MsgManDefault : public Port_MsgMan {
   // onMessage, counts it, updates the clean and abort flags and formats it (msgFormat).
   void deliverMsg(const Port_MsgRecord& record) override;
 
+ protected:
+  // The lines of one message as written: `prefix` before the first, blanks of `indentWidth` before
+  // the others, each ended by '\n'. A subclass that decorates the prefix keeps the layout.
+  static std::string FormatLines(const std::string& prefix, std::size_t indentWidth,
+                                 const wchar_t* const* lines, int count);
+
  private:
   void deliverFormatted(MsgType type, int msgNum, const char* format, std::va_list args);
   void deliverText(MsgType type, int msgNum, std::string text);
