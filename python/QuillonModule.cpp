@@ -157,6 +157,10 @@ py::list Order(ScriptProject& project, const std::string& top, bool byUnit) {
   return files;
 }
 
+py::str Export(ScriptProject& project, const std::string& format, const std::string& top, bool byUnit) {
+  return py::str(Unlocked([&] { return project.Export(format, top, byUnit); }));
+}
+
 py::list Ports(ScriptProject& project, const std::string& unit) {
   std::vector<PortInfo> ports = Unlocked([&] { return project.Ports(unit); });
   py::list list;
@@ -242,6 +246,7 @@ PYBIND11_MODULE(_core, module) {
       .def("units", &Units)
       .def("tree", &Tree, "top"_a)
       .def("order", &Order, "top"_a, "by_unit"_a)
+      .def("export", &Export, "format"_a, "top"_a, "by_unit"_a)
       .def("ports", &Ports, "unit"_a)
       .def("diagnostics", &Diagnostics)
       .def("messages", &Messages);

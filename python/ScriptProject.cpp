@@ -3,11 +3,14 @@
 #include <algorithm>
 #include <cctype>
 #include <map>
+#include <sstream>
 #include <utility>
 
 #include "ArchitectureCheck.h"
 #include "DeveloperTextCapture.h"
 #include "DiagnosticFinder.h"
+#include "ExportPlanner.h"
+#include "ExportWriter.h"
 #include "Host/HostComponents.h"
 #include "IName.h"
 #include "ModuleLoader.h"
@@ -60,7 +63,7 @@ std::string Lowered(std::string text) {
 // that carries them.
 class ScriptProject::Request {
  public:
-  explicit Request(ScriptProject& project) : project_(project), log_(true, false) {}
+  explicit Request(ScriptProject& project) : project_(project), log_(true, false, false) {}
   ~Request() {
     project_.messages_.insert(project_.messages_.end(), log_.messages().begin(), log_.messages().end());
   }
@@ -101,6 +104,7 @@ ScriptProject::ScriptProject(const Options& options, const std::string& modulePa
   externalLibraries_ = sources.externalLibraries;
   externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
                             options_.externalLibraries.end());
+  verilog_ = ExportPlanner::VerilogSettingsOf(sources.properties);
   LoadModule(modulePath);
 
   Request request(*this);
@@ -171,6 +175,23 @@ std::vector<OrderEntry> ScriptProject::Order(const std::string& top, bool byUnit
   if (result == kNotInHierarchy) request.Fail("'" + top + "' has no place in the design hierarchy");
   if (result != CitI::kOk) request.Fail("the compile order is not available");
   return order;
+}
+
+std::string ScriptProject::Export(const std::string& format, const std::string& top, bool byUnit) {
+  std::vector<OrderEntry> order = Order(top, byUnit);
+  Request request(*this);
+  TreeInfo tree;
+  TreeReader::Read(project(), tree, false);
+  ExportPlan plan;
+  std::vector<std::string> warnings;
+  std::string error;
+  if (!ExportPlanner::PlanProject(order, tree, reader_->Files(), verilog_, top.empty() ? "" : KeyOf(FindUnit(top)),
+                                  plan, warnings, error))
+    request.Fail(error);
+  for (const std::string& warning : warnings) request.log().ReportWarning(warning);
+  std::ostringstream text;
+  if (!ExportWriter::Write(format, plan, text, error)) request.Fail(error);
+  return text.str();
 }
 
 std::vector<PortInfo> ScriptProject::Ports(const std::string& unitName) {

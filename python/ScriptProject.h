@@ -46,6 +46,8 @@ class ScriptProject {
   Hierarchy Tree(const std::string& top);
   // The whole project's compile order, or that of `top` and what it needs (byUnit: `top` alone).
   std::vector<OrderEntry> Order(const std::string& top, bool byUnit);
+  // The order as `quillon export --to FORMAT` writes it for a compiling tool.
+  std::string Export(const std::string& format, const std::string& top, bool byUnit);
   std::vector<PortInfo> Ports(const std::string& unit);
   // What `check` finds: broken and incomplete parts of the design.
   std::vector<Diagnostic> Diagnostics();
@@ -65,6 +67,7 @@ class ScriptProject {
 
   Options options_;
   std::vector<std::string> externalLibraries_;
+  VerilogSettings verilog_;
   Progress progress_{true, 0};
   std::unique_ptr<ProjectBuilder> builder_ = std::make_unique<ProjectBuilder>();
   std::unique_ptr<ProjectReader> reader_;

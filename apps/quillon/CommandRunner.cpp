@@ -143,10 +143,7 @@ int CommandRunner::RunOnProject() {
   externalLibraries_ = sources.externalLibraries;
   externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
                             options_.externalLibraries.end());
-  verilog_.includeDirs =
-      ExportPlanner::ListEntries(sources.properties[std::string(ProjectLoader::kIncludeDirsProperty)]);
-  verilog_.defines =
-      ExportPlanner::ListEntries(sources.properties[std::string(ProjectLoader::kMacrosProperty)]);
+  verilog_ = ExportPlanner::VerilogSettingsOf(sources.properties);
 
   OutputFile file;
   const bool toFile = !options_.outputPath.empty();
@@ -340,21 +337,15 @@ int CommandRunner::Export(ProjectReader& reader, Vad::IHdlProject* project, std:
 
   TreeInfo tree;
   TreeReader::Read(project, tree, false);
-  ExportPlan plan{{}, verilog_.includeDirs, verilog_.defines, std::nullopt};
-  std::vector<std::string> leftOut;
+  std::string topKey = options_.top.empty() ? "" : KeyOf(UnitFinder(reader.designUnits()).Find(options_.top));
+  ExportPlan plan;
+  std::vector<std::string> warnings;
   std::string error;
-  if (!ExportPlanner::Plan(order, FileGraph::Build(tree, order), plan, leftOut, error)) {
+  if (!ExportPlanner::PlanProject(order, tree, reader.Files(), verilog_, topKey, plan, warnings, error)) {
     log_->ReportError(error);
     return kExitFailed;
   }
-  for (const std::string& path : leftOut)
-    log_->ReportWarning(path + " is left out of the export: only VHDL and Verilog sources are compiled");
-  if (!options_.top.empty()) {
-    std::string key = KeyOf(UnitFinder(reader.designUnits()).Find(options_.top));
-    plan.top = ExportPlanner::TopOf(key, reader.Files());
-    if (!plan.top)
-      log_->ReportWarning(key + " is no entity, architecture or module: the export names no top");
-  }
+  for (const std::string& warning : warnings) log_->ReportWarning(warning);
   // A format that cannot carry some path is found out midway: nothing is written then.
   std::ostringstream text;
   if (!ExportWriter::Write(options_.exportTo, plan, text, error)) {

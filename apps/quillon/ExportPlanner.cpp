@@ -4,6 +4,9 @@
 #include <cctype>
 #include <map>
 
+#include "FileGraph.h"
+#include "ProjectLoader.h"
+
 namespace quillon {
 
 namespace {
@@ -75,14 +78,38 @@ bool ExportPlanner::Plan(const std::vector<OrderEntry>& order, const FileGraphIn
   }
   // An edge to a later source is one that the order cut to break a cycle.
   for (const FileEdge& edge : graph.edges) {
-    auto from = planIndex.find(graph.files[edge.from]);
-    auto to = planIndex.find(graph.files[edge.to]);
+    auto from = planIndex.find(graph.files[edge.from].path);
+    auto to = planIndex.find(graph.files[edge.to].path);
     if (from == planIndex.end() || to == planIndex.end() || to->second >= from->second) continue;
     plan.sources[from->second].needs.push_back(to->second);
   }
   for (ExportSource& source : plan.sources) {
     std::sort(source.needs.begin(), source.needs.end());
     source.needs.erase(std::unique(source.needs.begin(), source.needs.end()), source.needs.end());
+  }
+  return true;
+}
+
+VerilogSettings ExportPlanner::VerilogSettingsOf(const std::map<std::string, std::string>& properties) {
+  auto entries = [&properties](std::string_view name) {
+    auto found = properties.find(std::string(name));
+    return found == properties.end() ? std::vector<std::string>() : ListEntries(found->second);
+  };
+  return {entries(ProjectLoader::kIncludeDirsProperty), entries(ProjectLoader::kMacrosProperty)};
+}
+
+bool ExportPlanner::PlanProject(const std::vector<OrderEntry>& order, const TreeInfo& tree,
+                                const std::vector<FileInfo>& files, const VerilogSettings& verilog,
+                                const std::string& topKey, ExportPlan& plan, std::vector<std::string>& leftOut,
+                                std::string& error) {
+  plan = ExportPlan{{}, verilog.includeDirs, verilog.defines, std::nullopt};
+  std::vector<std::string> paths;
+  if (!Plan(order, FileGraph::Build(tree, order), plan, paths, error)) return false;
+  for (const std::string& path : paths)
+    leftOut.push_back(path + " is left out of the export: only VHDL and Verilog sources are compiled");
+  if (!topKey.empty()) {
+    plan.top = TopOf(topKey, files);
+    if (!plan.top) leftOut.push_back(topKey + " is no entity, architecture or module: the export names no top");
   }
   return true;
 }

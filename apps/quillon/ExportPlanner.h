@@ -2,6 +2,7 @@
 // writes.
 #pragma once
 
+#include <map>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -17,6 +18,17 @@ class ExportPlanner {
   // The entries of one of the module's list properties (macros, include directories), which it
   // separates with ';' or '|'; empty entries dropped.
   static std::vector<std::string> ListEntries(std::string_view list);
+  // The Verilog include directories and macros among a project's properties.
+  static VerilogSettings VerilogSettingsOf(const std::map<std::string, std::string>& properties);
+
+  // The plan of a project's `order`: the file dependencies of its hierarchy `tree`, its Verilog
+  // settings and, when `topKey` is not empty, the top that the key names (unset when the unit is
+  // no entity, architecture or module). Returns false as Plan does. `leftOut` receives one warning
+  // text per source that no compiling tool takes.
+  static bool PlanProject(const std::vector<OrderEntry>& order, const TreeInfo& tree,
+                          const std::vector<FileInfo>& files, const VerilogSettings& verilog,
+                          const std::string& topKey, ExportPlan& plan, std::vector<std::string>& leftOut,
+                          std::string& error);
 
   // The VHDL and Verilog sources of `order` in its order. A source needs the sources it uses
   // (edges of `graph`) that come before it, and a Verilog source also the Verilog source before

@@ -251,5 +251,9 @@ class Project:
         """Every message of the module and the host since the project was made, in order."""
         return [Message(**message) for message in self._project.messages()]
 
-    # The hook for exporters: once an exporter library is part of the build, `export(to=...)`
-    # hands this project's order and units to it the way `quillon export --to` does.
+    def export(self, to: str, top: Optional[str] = None, *, alone: bool = False) -> str:
+        """The compile order (of the whole project, or of `top` and what it needs) as `quillon export
+        --to` writes it: make, ninja, depfile, ghdl, iverilog, edam or tcl."""
+        if alone and not top:
+            raise ValueError("alone=True needs a top unit")
+        return self._project.export(to, top or "", alone)

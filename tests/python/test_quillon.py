@@ -76,6 +76,16 @@ class ExampleProjectTest(unittest.TestCase):
         self.assertLess(len(alone), len(controller) + 1)
         self.assertTrue(alone[-1].path.endswith("controller.vhd"))
 
+    def test_export_matches_the_order_and_refuses_unknown_formats(self):
+        tcl = self.project.export("tcl", "controller")
+        listed = [line.split()[1] for line in tcl.splitlines() if line.startswith("  {")]
+        self.assertEqual([os.path.basename(path) for path in listed],
+                         ["timing_pkg.vhd", "phase_timer.vhd", "light_pkg.vhd", "controller.vhd"])
+        self.assertIn("set quillon_top {work controller", tcl)
+        self.assertIn("crossing.vhd", self.project.export("make"))
+        with self.assertRaises(quillon.Error):
+            self.project.export("spreadsheet")
+
     def test_ports_of_vhdl_and_verilog_units(self):
         ports = self.project.ports("crossing")
         self.assertEqual([(port.position, port.name, port.direction) for port in ports][:2],
