@@ -1,5 +1,7 @@
 #include "CommandRunner.h"
 
+#include <sys/stat.h>
+
 #include <algorithm>
 #include <cctype>
 #include <cinttypes>
@@ -19,6 +21,10 @@
 #include "JsonOutput.h"
 #include "ModuleLoader.h"
 #include "OutputFile.h"
+#include "ParseCache.h"
+#include "Port/Env.h"
+#include "Port/File.h"
+#include "Port/FileName.h"
 #include "Port/MsgManData.h"
 #include "ProjectBuilder.h"
 #include "ProjectLoader.h"
@@ -160,6 +166,7 @@ int CommandRunner::RunOnProject() {
     return kExitFailed;
   }
   for (const std::string& warning : sources.warnings) log_->ReportWarning(warning);
+  cacheInputs_ = CacheInputs(sources, module.path());
   ProjectBuilder::SetInstallRootWhenUnset();
   ProjectBuilder builder;
   if (!builder.Build(sources, error)) {
@@ -190,7 +197,15 @@ int CommandRunner::RunCommand(Vad::IHdlProject* project, std::size_t fileCount, 
 int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount, Progress& progress,
                                std::ostream& out) {
   ProjectReader reader(project, progress);
-  if (CitI::Result result = reader.Parse(); result != CitI::kOk) {
+  std::optional<ParseCache> cache;
+  if (std::string directory = CacheDirectory(); !directory.empty())
+    cache.emplace(directory, cacheInputs_, *log_);
+  CitI::Result parsed = reader.Parse(cache ? &*cache : nullptr);
+  if (cache) {
+    Port_MsgManData::debugStub("parse cache %s: %zu files loaded, %zu parsed\n", CacheDirectory().c_str(),
+                               cache->hits(), cache->misses());
+  }
+  if (CitI::Result result = parsed; result != CitI::kOk) {
     int status = Failed("the sources could not be read", result);
     if (options_.format == Format::kJson) JsonOutput::Messages(log_->messages(), out);
     return status;
@@ -336,6 +351,33 @@ int CommandRunner::Check(ProjectReader& reader, Vad::IHdlProject* project, std::
                              log_->getWarnCount() + static_cast<int>(warnings), out);
   }
   return status;
+}
+
+std::string CommandRunner::CacheDirectory() const {
+  if (options_.noCache) return {};
+  if (!options_.cacheDir.empty()) return options_.cacheDir;
+  for (const SourceArgument& argument : options_.sources) {
+    if (argument.kind != SourceArgument::Kind::kProjectFile) continue;
+    std::string head = Port::FileName::GetHead(argument.path).str();
+    return (head.empty() ? std::string(".") : head) + "/.quillon";
+  }
+  return {};
+}
+
+std::string CommandRunner::CacheInputs(const ProjectSources& sources, const std::string& modulePath) {
+  std::string inputs;
+  for (const auto& [name, value] : sources.properties) inputs += name + '=' + value + '\n';
+  const char* cells = Port_Env::GetEnv("CORVANE");
+  inputs += std::string("CORVANE=") + (cells ? cells : "") + '\n';
+  Port::StringBase directory;
+  Port::File::getcwd(&directory);
+  inputs += "cwd=" + directory.str() + '\n';
+  struct stat module {};
+  if (::stat(modulePath.c_str(), &module) == 0) {
+    inputs += "module=" + modulePath + ' ' + std::to_string(module.st_size) + ' ' +
+              std::to_string(module.st_mtim.tv_sec) + '.' + std::to_string(module.st_mtim.tv_nsec) + '\n';
+  }
+  return inputs;
 }
 
 std::vector<Diagnostic> CommandRunner::Diagnose(ProjectReader& reader, Vad::IHdlProject* project,

@@ -10,6 +10,7 @@
 #include "MessageLog.h"
 #include "Options.h"
 #include "ProjectReader.h"
+#include "ProjectSources.h"
 
 namespace quillon {
 
@@ -44,7 +45,13 @@ class CommandRunner {
   // Writes "quillon: text" to standard error and returns kExitBadInput.
   static int BadInput(const std::string& text);
 
+  // The parse cache's directory for this run; empty for none.
+  std::string CacheDirectory() const;
+  // What every file's parse depends on besides the file: properties, cell libraries, module.
+  static std::string CacheInputs(const ProjectSources& sources, const std::string& modulePath);
+
   const Options& options_;
+  std::string cacheInputs_;
   MessageLog* log_ = nullptr;
   // From the command line and the project file.
   std::vector<std::string> externalLibraries_;

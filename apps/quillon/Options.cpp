@@ -44,6 +44,10 @@ constexpr const char* kUsage =
     "  --strict              instances of units the project lacks are errors, not warnings\n"
     "  --warnings-as-errors  check fails on warnings too\n"
     "\n"
+    "cache:\n"
+    "  --cache DIR           keep parse results in DIR (default with -P: .quillon beside the project)\n"
+    "  --no-cache            parse every file\n"
+    "\n"
     "output:\n"
     "  --format text|json|dot, -o FILE, -q (no messages), -v (developer texts too)\n"
     "\n"
@@ -137,6 +141,8 @@ void Parser::Declare() {
   AddRepeated(app_, "--external-library", options_.externalLibraries);
   app_.add_flag("--strict", options_.strict);
   app_.add_flag("--warnings-as-errors", options_.warningsAsErrors);
+  app_.add_option("--cache", options_.cacheDir);
+  app_.add_flag("--no-cache", options_.noCache);
 }
 
 Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& error) {

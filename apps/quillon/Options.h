@@ -59,6 +59,10 @@ class Options {
   std::vector<std::string> externalLibraries;
   bool strict = false;
   bool warningsAsErrors = false;
+
+  // --cache DIR; empty: .quillon beside the first project file, or no cache without one.
+  std::string cacheDir;
+  bool noCache = false;
 };
 
 }  // namespace quillon
