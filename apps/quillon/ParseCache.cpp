@@ -13,7 +13,6 @@
 
 #include "FileFacts.h"
 #include "IHdlParseResults.h"
-#include "Port/ArchiveCodec.h"
 #include "Port/FileArchive.h"
 #include "Port/MsgDispatcher.h"
 #include "Prjrep/Casts.h"
@@ -21,18 +20,6 @@
 namespace quillon {
 
 namespace {
-
-constexpr std::string_view kEntryMagic{"\x89QLNPCE\n", 8};
-constexpr std::size_t kEntryHeaderSize = kEntryMagic.size() + 4 + 8 + 8;  // magic, version, length, sum
-constexpr std::uint32_t kMaxMessages = 1u << 20;
-
-std::uint64_t Fnv1a(std::string_view bytes, std::uint64_t hash = 14695981039346656037ull) {
-  for (unsigned char c : bytes) {
-    hash ^= c;
-    hash *= 1099511628211ull;
-  }
-  return hash;
-}
 
 bool IsPlugin(const std::string& plugin, std::string_view name) {
   return plugin.size() == name.size() &&
@@ -44,85 +31,9 @@ bool IsVerilog(const std::string& plugin) { return IsPlugin(plugin, "PLUGIN_Veri
 // The parsers whose inputs the key covers: the source alone and the project's settings.
 bool IsKept(const std::string& plugin) { return IsVerilog(plugin) || IsPlugin(plugin, "PLUGIN_Vhdl"); }
 
-void PutString(Port::ArchiveEncoder& out, std::string_view text) {
-  out.PutUInt32(static_cast<std::uint32_t>(text.size()));
-  out.PutBytes(text);
-}
-
-bool TakeString(Port::ArchiveDecoder& in, std::string& text) {
-  std::uint32_t size = 0;
-  std::string_view bytes;
-  if (!in.TakeUInt32(&size) || !in.TakeBytes(size, &bytes)) return false;
-  text.assign(bytes);
-  return true;
-}
-
-bool TakeInt(Port::ArchiveDecoder& in, int& value) {
-  std::uint32_t raw = 0;
-  if (!in.TakeUInt32(&raw)) return false;
-  value = static_cast<int>(static_cast<std::int32_t>(raw));
-  return true;
-}
-
 std::string Number(std::uint64_t value) { return std::to_string(value); }
 
 }  // namespace
-
-// ---- entry bytes -------------------------------------------------------------------------------
-
-std::string ParseCache::Encode(const Entry& entry) {
-  Port::ArchiveEncoder payload;
-  PutString(payload, entry.key);
-  payload.PutUInt32(static_cast<std::uint32_t>(entry.messages.size()));
-  for (const Port_MsgRecord& message : entry.messages) {
-    payload.PutUInt32(static_cast<std::uint32_t>(message.type));
-    PutString(payload, message.text);
-    PutString(payload, message.category);
-    PutString(payload, message.sourceFile);
-    payload.PutUInt32(static_cast<std::uint32_t>(message.line));
-    PutString(payload, message.revision);
-    payload.PutUInt32(static_cast<std::uint32_t>(message.number));
-  }
-  PutString(payload, entry.records);
-
-  Port::ArchiveEncoder whole;
-  whole.PutBytes(kEntryMagic);
-  whole.PutUInt32(kFormatVersion);
-  whole.PutUInt64(payload.Bytes().size());
-  whole.PutUInt64(Fnv1a(payload.Bytes()));
-  whole.PutBytes(payload.Bytes());
-  return whole.Bytes();
-}
-
-bool ParseCache::Decode(std::string_view bytes, Entry& entry) {
-  Port::ArchiveDecoder header(bytes);
-  std::string_view magic;
-  std::uint32_t version = 0;
-  std::uint64_t length = 0, sum = 0;
-  if (!header.TakeBytes(kEntryMagic.size(), &magic) || magic != kEntryMagic || !header.TakeUInt32(&version) ||
-      version != kFormatVersion || !header.TakeUInt64(&length) || !header.TakeUInt64(&sum) ||
-      length != header.Remaining())
-    return false;
-  std::string_view payloadBytes = bytes.substr(kEntryHeaderSize);
-  if (Fnv1a(payloadBytes) != sum) return false;
-
-  Port::ArchiveDecoder in(payloadBytes);
-  std::uint32_t count = 0;
-  if (!TakeString(in, entry.key) || !in.TakeUInt32(&count) || count > kMaxMessages) return false;
-  entry.messages.clear();
-  for (std::uint32_t i = 0; i < count; ++i) {
-    Port_MsgRecord message;
-    int type = 0;
-    if (!TakeInt(in, type) || type < Port_MsgMan::kError || type > Port_MsgMan::kUserFatal ||
-        !TakeString(in, message.text) || !TakeString(in, message.category) ||
-        !TakeString(in, message.sourceFile) || !TakeInt(in, message.line) ||
-        !TakeString(in, message.revision) || !TakeInt(in, message.number))
-      return false;
-    message.type = static_cast<Port_MsgMan::MsgType>(type);
-    entry.messages.push_back(std::move(message));
-  }
-  return TakeString(in, entry.records) && in.Remaining() == 0;
-}
 
 // ---- keys --------------------------------------------------------------------------------------
 
@@ -136,7 +47,7 @@ std::optional<ParseCache::Facts> ParseCache::FactsOf(const std::string& path) {
   Facts facts;
   facts.size = static_cast<std::uint64_t>(status.st_size);
   facts.modified = static_cast<std::int64_t>(status.st_mtim.tv_sec) * 1000000000 + status.st_mtim.tv_nsec;
-  facts.hash = Fnv1a(text);
+  facts.hash = CacheEntry::Hash(text);
   facts.includes = text.find("`include") != std::string::npos;
   // The text read must be the text stat described; a file being written is not kept.
   if (text.size() != facts.size) return std::nullopt;
@@ -174,20 +85,20 @@ std::optional<std::string> ParseCache::VerilogChain(const std::vector<Vad::IHdlF
 
 std::string ParseCache::EntryPath(const std::string& sourcePath) const {
   char name[32];
-  std::snprintf(name, sizeof name, "%016" PRIx64 ".qpc", Fnv1a(sourcePath));
+  std::snprintf(name, sizeof name, "%016" PRIx64 ".qpc", CacheEntry::Hash(sourcePath));
   return directory_ + '/' + name;
 }
 
 // ---- reading -----------------------------------------------------------------------------------
 
-bool ParseCache::ReadEntry(Vad::IHdlFile* file, const std::string& key, Entry& entry) {
+bool ParseCache::ReadEntry(Vad::IHdlFile* file, const std::string& key, CacheEntry& entry) {
   std::ifstream in(EntryPath(FileFacts::PathOf(file)), std::ios::binary);
   if (!in) return false;
   std::string bytes((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
-  return !in.bad() && Decode(bytes, entry) && entry.key == key;
+  return !in.bad() && entry.Decode(bytes) && entry.key == key;
 }
 
-bool ParseCache::Load(Vad::IHdlFile* file, const Entry& entry) {
+bool ParseCache::Load(Vad::IHdlFile* file, const CacheEntry& entry) {
   auto* results = Prjrep::QueryAs<Vad::IHdlParseResults>(file);
   if (!results) return false;
   Port::StringBase error;
@@ -201,13 +112,13 @@ bool ParseCache::Load(Vad::IHdlFile* file, const Entry& entry) {
   return loaded;
 }
 
-void ParseCache::Replay(const Entry& entry) {
+void ParseCache::Replay(const CacheEntry& entry) {
   for (const Port_MsgRecord& message : entry.messages) Port_MsgDispatcher::dispatch(message);
 }
 
 void ParseCache::ParseOrRestore(Vad::IHdlFile* file) {
   std::optional<std::string> key = KeyOf(file);
-  Entry entry;
+  CacheEntry entry;
   if (key && ReadEntry(file, *key, entry) && Load(file, entry)) {
     ++hits_;
     Replay(entry);
@@ -221,7 +132,7 @@ void ParseCache::ParseOrRestore(Vad::IHdlFile* file) {
 
 void ParseCache::RestoreVerilog(const std::vector<Vad::IHdlFile*>& files) {
   verilogChain_ = VerilogChain(files);
-  std::vector<Entry> entries(files.size());
+  std::vector<CacheEntry> entries(files.size());
   for (std::size_t i = 0; i < files.size(); ++i) {
     std::optional<std::string> key = KeyOf(files[i]);
     if (!key || !ReadEntry(files[i], *key, entries[i])) return;
@@ -232,7 +143,7 @@ void ParseCache::RestoreVerilog(const std::vector<Vad::IHdlFile*>& files) {
     for (Vad::IHdlFile* file : files) file->setNeedsParse(true);
     return;
   }
-  for (const Entry& entry : entries) Replay(entry);
+  for (const CacheEntry& entry : entries) Replay(entry);
   hits_ += files.size();
   restoredVerilog_ = files;
 }
@@ -267,8 +178,8 @@ void ParseCache::Store(Vad::IHdlFile* file, const std::string& key, std::vector<
   auto* writer = Prjrep::ObjectCast<Port::FileArchive>(archive.Get());
   if (!results || !writer || results->saveParseResults(archive.Get()) != CitI::kOk) return;
   if (writer->Close() != CitI::kOk) return;
-  Entry entry{key, std::move(messages), std::string(writer->Bytes())};
-  WriteEntry(EntryPath(FileFacts::PathOf(file)), Encode(entry));
+  CacheEntry entry{key, std::move(messages), std::string(writer->Bytes())};
+  WriteEntry(EntryPath(FileFacts::PathOf(file)), entry.Encode());
 }
 
 // A cache that cannot be written costs time, not correctness: failures are silent.

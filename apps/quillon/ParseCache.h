@@ -13,6 +13,7 @@
 #include <string>
 #include <vector>
 
+#include "CacheEntry.h"
 #include "IHdlFile.h"
 #include "MessageLog.h"
 #include "Port/MsgMan.h"
@@ -21,8 +22,6 @@ namespace quillon {
 
 class ParseCache {
  public:
-  static constexpr std::uint32_t kFormatVersion = 1;
-
   // `inputs` stands for what every parse depends on besides the file itself.
   ParseCache(std::string directory, std::string inputs, MessageLog& log)
       : directory_(std::move(directory)), inputs_(std::move(inputs)), log_(log) {}
@@ -40,15 +39,6 @@ class ParseCache {
   std::size_t hits() const { return hits_; }
   std::size_t misses() const { return misses_; }
 
-  // The entry bytes, and their reading: false for anything damaged, foreign or not matching `key`.
-  struct Entry {
-    std::string key;
-    std::vector<Port_MsgRecord> messages;
-    std::string records;  // the module's archive
-  };
-  static std::string Encode(const Entry& entry);
-  static bool Decode(std::string_view bytes, Entry& entry);
-
  private:
   struct Facts {
     std::uint64_t size = 0;
@@ -61,9 +51,9 @@ class ParseCache {
   std::optional<Facts> FactsOf(const std::string& path);
   std::optional<std::string> VerilogChain(const std::vector<Vad::IHdlFile*>& files);
   std::string EntryPath(const std::string& sourcePath) const;
-  bool ReadEntry(Vad::IHdlFile* file, const std::string& key, Entry& entry);
-  static bool Load(Vad::IHdlFile* file, const Entry& entry);
-  void Replay(const Entry& entry);
+  bool ReadEntry(Vad::IHdlFile* file, const std::string& key, CacheEntry& entry);
+  static bool Load(Vad::IHdlFile* file, const CacheEntry& entry);
+  void Replay(const CacheEntry& entry);
   void Store(Vad::IHdlFile* file, const std::string& key, std::vector<Port_MsgRecord> messages);
   bool WriteEntry(const std::string& path, const std::string& bytes);
   std::vector<Port_MsgRecord> ReceivedSince(std::size_t mark) const;
