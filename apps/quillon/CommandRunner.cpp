@@ -32,6 +32,7 @@
 #include "TextOutput.h"
 #include "TreeReader.h"
 #include "UnitFinder.h"
+#include "Watcher.h"
 
 namespace quillon {
 
@@ -109,6 +110,7 @@ class DeveloperTextCapture {
 
 int CommandRunner::Run() {
   if (options_.command == Command::kFactories) return ListFactories();
+  if (options_.command == Command::kWatch) return Watcher(options_).Run();
   MessageLog log(options_.quiet, options_.verbose);
   log_ = &log;
   int status = RunOnProject();
@@ -142,13 +144,26 @@ int CommandRunner::ListFactories() {
   return kExitDone;
 }
 
+void CommandRunner::TakeExternalLibraries(const ProjectSources& sources) {
+  externalLibraries_ = sources.externalLibraries;
+  externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
+                            options_.externalLibraries.end());
+}
+
+int CommandRunner::RunOn(Vad::IHdlProject* project, const ProjectSources& sources, std::ostream& out) {
+  MessageLog log(options_.quiet, options_.verbose);
+  log_ = &log;
+  TakeExternalLibraries(sources);
+  int status = RunCommand(project, sources.files.size(), out);
+  log_ = nullptr;
+  return status;
+}
+
 int CommandRunner::RunOnProject() {
   ProjectSources sources;
   std::string error;
   if (!ProjectLoader(sources).Load(options_, error)) return BadInput(error);
-  externalLibraries_ = sources.externalLibraries;
-  externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
-                            options_.externalLibraries.end());
+  TakeExternalLibraries(sources);
 
   OutputFile file;
   const bool toFile = !options_.outputPath.empty();
@@ -222,6 +237,7 @@ int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount,
     case Command::kCheck:
       return Check(reader, project, fileCount, out);
     case Command::kFactories:
+    case Command::kWatch:
       break;
   }
   return kExitFailed;

@@ -20,9 +20,12 @@ class CommandRunner {
 
   // The exit status (ExitStatus.h).
   int Run();
+  // The command on a project built already from `sources`, with messages of its own; for watch.
+  int RunOn(Vad::IHdlProject* project, const ProjectSources& sources, std::ostream& out);
 
  private:
   int ListFactories();
+  void TakeExternalLibraries(const ProjectSources& sources);
   int RunOnProject();
   int RunCommand(Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out);
   int ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount, Progress& progress, std::ostream& out);

@@ -18,6 +18,7 @@ constexpr const char* kUsage =
     "  ports UNIT   the ports of a design unit\n"
     "  check        read everything and report problems only\n"
     "  factories    the classes the module registers\n"
+    "  watch        keep reading the sources and print the view (--show order|tree|check) when it changes\n"
     "\n"
     "sources:\n"
     "  SOURCE                a source file; the plug-in follows from its extension\n"
@@ -57,7 +58,8 @@ constexpr const char* kUsage =
 const std::map<std::string, Command>& CommandNames() {
   static const std::map<std::string, Command> names = {
       {"units", Command::kUnits}, {"tree", Command::kTree},   {"order", Command::kOrder},
-      {"ports", Command::kPorts}, {"check", Command::kCheck}, {"factories", Command::kFactories}};
+      {"ports", Command::kPorts}, {"check", Command::kCheck}, {"factories", Command::kFactories},
+      {"watch", Command::kWatch}};
   return names;
 }
 
@@ -109,7 +111,7 @@ class Parser {
   CLI::App app_{"quillon"};
   bool help_ = false;
   std::vector<std::string> positionals_, projects_, lists_, libraries_, plugins_, properties_;
-  std::string top_, unit_, format_ = "text";
+  std::string top_, unit_, format_ = "text", show_ = "order";
   CLI::Option* positionalOption_ = nullptr;
   CLI::Option* projectOption_ = nullptr;
   CLI::Option* listOption_ = nullptr;
@@ -143,6 +145,7 @@ void Parser::Declare() {
   app_.add_flag("--warnings-as-errors", options_.warningsAsErrors);
   app_.add_option("--cache", options_.cacheDir);
   app_.add_flag("--no-cache", options_.noCache);
+  app_.add_option("--show", show_)->check(CLI::IsMember({"order", "tree", "check"}));
 }
 
 Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& error) {
@@ -196,6 +199,9 @@ Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& err
   options_.format = format_ == "json" ? Format::kJson : format_ == "dot" ? Format::kDot : Format::kText;
   options_.top = unit_.empty() ? top_ : unit_;
   options_.byUnit = !unit_.empty();
+  options_.watchView = show_ == "tree"    ? Command::kTree
+                       : show_ == "check" ? Command::kCheck
+                                          : Command::kOrder;
   return CheckCombination(error) ? Options::Outcome::kRun : Options::Outcome::kUsageError;
 }
 

@@ -9,7 +9,7 @@
 
 namespace quillon {
 
-enum class Command { kUnits, kTree, kOrder, kPorts, kCheck, kFactories };
+enum class Command { kUnits, kTree, kOrder, kPorts, kCheck, kFactories, kWatch };
 enum class Format { kText, kJson, kDot };
 
 // One argument that names sources, in command-line order, with the library and plug-in that the
@@ -63,6 +63,8 @@ class Options {
   // --cache DIR; empty: .quillon beside the first project file, or no cache without one.
   std::string cacheDir;
   bool noCache = false;
+  // The command whose answer watch prints again whenever it changes: order, tree or check.
+  Command watchView = Command::kOrder;
 };
 
 }  // namespace quillon
