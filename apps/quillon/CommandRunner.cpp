@@ -1,6 +1,7 @@
 #include "CommandRunner.h"
 
 #include <unistd.h>
+#include <sys/stat.h>
 
 #include <algorithm>
 #include <cctype>
@@ -28,6 +29,10 @@
 #include "LibraryResolver.h"
 #include "ModuleLoader.h"
 #include "OutputFile.h"
+#include "ParseCache.h"
+#include "Port/Env.h"
+#include "Port/File.h"
+#include "Port/FileName.h"
 #include "Port/MsgManData.h"
 #include "ProjectBuilder.h"
 #include "ProjectLoader.h"
@@ -37,6 +42,7 @@
 #include "TreeReader.h"
 #include "TreeView.h"
 #include "UnitFinder.h"
+#include "Watcher.h"
 
 namespace quillon {
 
@@ -92,6 +98,7 @@ std::vector<std::string> InputPaths(const ProjectSources& sources, const Options
 
 int CommandRunner::Run() {
   if (options_.command == Command::kFactories) return ListFactories();
+  if (options_.command == Command::kWatch) return Watcher(options_).Run();
   MessageLog log(options_.quiet, options_.verbose, ColorOnStandardError());
   log_ = &log;
   int status = RunOnProject();
@@ -136,13 +143,26 @@ int CommandRunner::ListFactories() {
   return kExitDone;
 }
 
+void CommandRunner::TakeExternalLibraries(const ProjectSources& sources) {
+  externalLibraries_ = sources.externalLibraries;
+  externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
+                            options_.externalLibraries.end());
+}
+
+int CommandRunner::RunOn(Vad::IHdlProject* project, const ProjectSources& sources, std::ostream& out) {
+  MessageLog log(options_.quiet, options_.verbose);
+  log_ = &log;
+  TakeExternalLibraries(sources);
+  int status = RunCommand(project, sources.files.size(), out);
+  log_ = nullptr;
+  return status;
+}
+
 int CommandRunner::RunOnProject() {
   ProjectSources sources;
   std::string error;
   if (!ProjectLoader(sources).Load(options_, error)) return BadInput(error);
-  externalLibraries_ = sources.externalLibraries;
-  externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
-                            options_.externalLibraries.end());
+  TakeExternalLibraries(sources);
   verilog_ = ExportPlanner::VerilogSettingsOf(sources.properties);
 
   OutputFile file;
@@ -161,6 +181,7 @@ int CommandRunner::RunOnProject() {
     return kExitFailed;
   }
   for (const std::string& warning : sources.warnings) log_->ReportWarning(warning);
+  cacheInputs_ = CacheInputs(sources, module.path());
   ProjectBuilder::SetInstallRootWhenUnset();
   if (!AddLibraryModules(sources)) return kExitFailed;
   shownPaths_ = ShownPaths(sources, options_.absolutePaths);
@@ -210,7 +231,15 @@ int CommandRunner::RunCommand(Vad::IHdlProject* project, std::size_t fileCount, 
 int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount, Progress& progress,
                                std::ostream& out) {
   ProjectReader reader(project, progress);
-  if (CitI::Result result = reader.Parse(); result != CitI::kOk) {
+  std::optional<ParseCache> cache;
+  if (std::string directory = CacheDirectory(); !directory.empty())
+    cache.emplace(directory, cacheInputs_, *log_);
+  CitI::Result parsed = reader.Parse(cache ? &*cache : nullptr);
+  if (cache) {
+    Port_MsgManData::debugStub("parse cache %s: %zu files loaded, %zu parsed\n", CacheDirectory().c_str(),
+                               cache->hits(), cache->misses());
+  }
+  if (CitI::Result result = parsed; result != CitI::kOk) {
     int status = Failed("the sources could not be read", result);
     if (options_.format == Format::kJson) JsonOutput::Messages(Messages(), out);
     return status;
@@ -229,6 +258,7 @@ int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount,
     case Command::kExport:
       return Export(reader, project, out);
     case Command::kFactories:
+    case Command::kWatch:
       break;
   }
   return kExitFailed;
@@ -415,6 +445,33 @@ int CommandRunner::Check(ProjectReader& reader, Vad::IHdlProject* project, std::
                              log_->getWarnCount() + static_cast<int>(warnings), out);
   }
   return status;
+}
+
+std::string CommandRunner::CacheDirectory() const {
+  if (options_.noCache) return {};
+  if (!options_.cacheDir.empty()) return options_.cacheDir;
+  for (const SourceArgument& argument : options_.sources) {
+    if (argument.kind != SourceArgument::Kind::kProjectFile) continue;
+    std::string head = Port::FileName::GetHead(argument.path).str();
+    return (head.empty() ? std::string(".") : head) + "/.quillon";
+  }
+  return {};
+}
+
+std::string CommandRunner::CacheInputs(const ProjectSources& sources, const std::string& modulePath) {
+  std::string inputs;
+  for (const auto& [name, value] : sources.properties) inputs += name + '=' + value + '\n';
+  const char* cells = Port_Env::GetEnv("CORVANE");
+  inputs += std::string("CORVANE=") + (cells ? cells : "") + '\n';
+  Port::StringBase directory;
+  Port::File::getcwd(&directory);
+  inputs += "cwd=" + directory.str() + '\n';
+  struct stat module {};
+  if (::stat(modulePath.c_str(), &module) == 0) {
+    inputs += "module=" + modulePath + ' ' + std::to_string(module.st_size) + ' ' +
+              std::to_string(module.st_mtim.tv_sec) + '.' + std::to_string(module.st_mtim.tv_nsec) + '\n';
+  }
+  return inputs;
 }
 
 std::vector<Diagnostic> CommandRunner::Diagnose(ProjectReader& reader, Vad::IHdlProject* project,

@@ -11,6 +11,7 @@
 #include "Options.h"
 #include "ProjectReader.h"
 #include "ShownPaths.h"
+#include "ProjectSources.h"
 
 namespace quillon {
 
@@ -20,9 +21,12 @@ class CommandRunner {
 
   // The exit status (ExitStatus.h).
   int Run();
+  // The command on a project built already from `sources`, with messages of its own; for watch.
+  int RunOn(Vad::IHdlProject* project, const ProjectSources& sources, std::ostream& out);
 
  private:
   int ListFactories();
+  void TakeExternalLibraries(const ProjectSources& sources);
   int RunOnProject();
   int RunCommand(Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out);
   int ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount, Progress& progress, std::ostream& out);
@@ -56,7 +60,13 @@ class CommandRunner {
   // Writes "quillon: text" to standard error and returns kExitBadInput.
   static int BadInput(const std::string& text);
 
+  // The parse cache's directory for this run; empty for none.
+  std::string CacheDirectory() const;
+  // What every file's parse depends on besides the file: properties, cell libraries, module.
+  static std::string CacheInputs(const ProjectSources& sources, const std::string& modulePath);
+
   const Options& options_;
+  std::string cacheInputs_;
   MessageLog* log_ = nullptr;
   // From the command line and the project file.
   std::vector<std::string> externalLibraries_;

@@ -77,6 +77,7 @@ bool MessageLog::HasErrors() const {
 }
 
 void MessageLog::deliverMsg(const Port_MsgRecord& record) {
+  received_.push_back(record);
   std::vector<Port_MsgRecord> ready;
   cycles_.Take(record, ready);
   for (const Port_MsgRecord& each : ready) Port_MsgManDefault::deliverMsg(each);

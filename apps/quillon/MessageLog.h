@@ -30,6 +30,8 @@ class MessageLog : public Port_MsgManDefault {
   void SetProgress(Progress* progress) { progress_ = progress; }
 
   const std::vector<MessageInfo>& messages() const { return messages_; }
+  // Every message as it arrived, for the parse cache to keep with the file that issued it.
+  const std::vector<Port_MsgRecord>& received() const { return received_; }
   // True once an error (or worse) arrived.
   bool HasErrors() const;
 
@@ -51,6 +53,7 @@ class MessageLog : public Port_MsgManDefault {
   bool sinkInstalled_ = false;
   Port_MsgManData::DebugSink previousSink_;
   std::vector<MessageInfo> messages_;
+  std::vector<Port_MsgRecord> received_;
   CycleListings cycles_;
 };
 

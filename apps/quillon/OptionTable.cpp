@@ -6,9 +6,10 @@ namespace {
 
 constexpr CommandSet kProjectCommands = SetOf(Command::kUnits) | SetOf(Command::kTree) |
                                         SetOf(Command::kOrder) | SetOf(Command::kPorts) |
-                                        SetOf(Command::kCheck) | SetOf(Command::kExport);
+                                        SetOf(Command::kCheck) | SetOf(Command::kExport) |
+                                        SetOf(Command::kWatch);
 constexpr CommandSet kDiagnosingCommands =
-    SetOf(Command::kTree) | SetOf(Command::kOrder) | SetOf(Command::kCheck);
+    SetOf(Command::kTree) | SetOf(Command::kOrder) | SetOf(Command::kCheck) | SetOf(Command::kWatch);
 
 void AddSource(OptionValues& values, SourceArgument::Kind kind, const std::string& path) {
   values.options.sources.push_back({kind, path, values.library, values.plugin});
@@ -37,6 +38,7 @@ const std::vector<CommandSpec>& OptionTable::Commands() {
       {Command::kCheck, "check", "", "read everything and report problems only"},
       {Command::kFactories, "factories", "", "the classes the module registers"},
       {Command::kExport, "export", "", "the compile order for the tool that compiles it (--to FORMAT)"},
+      {Command::kWatch, "watch", "", "keep reading the sources and print the view (--show) whenever it changes"},
   };
   return commands;
 }
@@ -139,6 +141,15 @@ const std::vector<OptionSpec>& OptionTable::All() {
        [](OptionValues& v, const std::string&) { v.options.strict = true; }},
       {"--warnings-as-errors", nullptr, "Diagnostics", SetOf(Command::kCheck), "check fails on warnings too",
        [](OptionValues& v, const std::string&) { v.options.warningsAsErrors = true; }},
+
+      {"--cache", "DIR", "Cache", kProjectCommands,
+       "keep parse results in DIR (default with -P: .quillon beside the project file)",
+       [](OptionValues& v, const std::string& value) { v.options.cacheDir = value; }},
+      {"--no-cache", nullptr, "Cache", kProjectCommands, "parse every file",
+       [](OptionValues& v, const std::string&) { v.options.noCache = true; }},
+      {"--show", "VIEW", "Watch", SetOf(Command::kWatch), "the view that watch prints: order, tree or check",
+       [](OptionValues& v, const std::string& value) { v.show = value; },
+       {"order", "tree", "check"}},
 
       {"--format",
        "FORMAT",

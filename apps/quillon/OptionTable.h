@@ -19,7 +19,7 @@ struct OptionValues {
   std::string unapplied;        // the -l or --plugin given last while no source followed it yet
   std::string error;            // the first value that an option cannot take
   std::vector<std::string> properties;
-  std::string top, unit, format = "text", color = "auto";
+  std::string top, unit, format = "text", color = "auto", show = "order";
   bool versionAsked = false;
   bool manPageAsked = false;
   std::optional<std::string> completionWordsOf;

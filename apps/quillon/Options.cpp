@@ -343,6 +343,9 @@ bool Parser::CheckValues(std::string& error) {
   options.color = values_.color == "always"  ? ColorMode::kAlways
                   : values_.color == "never" ? ColorMode::kNever
                                              : ColorMode::kAuto;
+  options.watchView = values_.show == "tree"    ? Command::kTree
+                      : values_.show == "check" ? Command::kCheck
+                                                : Command::kOrder;
   options.top = values_.unit.empty() ? values_.top : values_.unit;
   options.byUnit = !values_.unit.empty();
   return true;

@@ -9,7 +9,7 @@
 
 namespace quillon {
 
-enum class Command { kUnits, kTree, kOrder, kPorts, kCheck, kFactories, kExport };
+enum class Command { kUnits, kTree, kOrder, kPorts, kCheck, kFactories, kExport, kWatch };
 enum class Format { kText, kJson, kDot };
 enum class ColorMode { kAuto, kAlways, kNever };
 
@@ -69,6 +69,12 @@ class Options {
   std::vector<std::string> externalLibraries;
   bool strict = false;
   bool warningsAsErrors = false;
+
+  // --cache DIR; empty: .quillon beside the first project file, or no cache without one.
+  std::string cacheDir;
+  bool noCache = false;
+  // The command whose answer watch prints again whenever it changes: order, tree or check.
+  Command watchView = Command::kOrder;
 };
 
 }  // namespace quillon

@@ -1,9 +1,12 @@
 #include "ProjectReader.h"
 
+#include <algorithm>
+
 #include "FileFacts.h"
 #include "IHdlDesignUnit.h"
 #include "IHdlElaborationData.h"
 #include "IHdlPort.h"
+#include "ParseCache.h"
 #include "PluginTable.h"
 #include "UnitRecordReader.h"
 
@@ -46,6 +49,22 @@ std::vector<UnitInfo> UnitsOf(Vad::IHdlFile* file) {
   return units;
 }
 
+// The project's Verilog files in the order it compiles them: largest order key first.
+std::vector<Vad::IHdlFile*> VerilogFilesOf(Vad::IHdlProject* project) {
+  std::vector<std::pair<std::uint64_t, Vad::IHdlFile*>> keyed;
+  auto files = FilesOf(project);
+  ForEachIn(files.Get(), [&](Vad::IHdlFile* file) {
+    std::uint64_t key = 0;
+    file->getOrderKey(&key);
+    if (!ParsesAlone(file)) keyed.emplace_back(key, file);
+  });
+  std::stable_sort(keyed.begin(), keyed.end(),
+                   [](const auto& a, const auto& b) { return a.first > b.first; });
+  std::vector<Vad::IHdlFile*> verilog;
+  for (const auto& entry : keyed) verilog.push_back(entry.second);
+  return verilog;
+}
+
 Vad::IHdlElaborationData* ElaborationOf(Vad::IHdlProject* project) {
   return Prjrep::QueryAs<Vad::IHdlElaborationData>(project);
 }
@@ -82,20 +101,29 @@ std::size_t ProjectReader::FileCount() const {
   return set ? set->GetCount() : 0;
 }
 
-void ProjectReader::ParseFilesOneByOne() {
-  if (!progress_.enabled()) return;
+// Also without progress, so that the files' messages come in the same order whether or not a
+// cache answers for some of them.
+void ProjectReader::ParseFilesOneByOne(ParseCache* cache) {
   auto files = FilesOf(project_);
   std::size_t total = FileCount(), done = 0;
   ForEachIn(files.Get(), [&](Vad::IHdlFile* file) {
     progress_.Step("parsing", ++done, total);
-    if (ParsesAlone(file)) file->parseIfNeeded();
+    if (!ParsesAlone(file)) return;
+    if (cache) {
+      cache->ParseOrRestore(file);
+    } else {
+      file->parseIfNeeded();
+    }
   });
+  if (cache) cache->RestoreVerilog(VerilogFilesOf(project_));
 }
 
-CitI::Result ProjectReader::Parse() {
-  ParseFilesOneByOne();
+CitI::Result ProjectReader::Parse(ParseCache* cache) {
+  ParseFilesOneByOne(cache);
   progress_.Phase("collecting the design units");
+  if (cache) cache->BeginVerilogParse();
   CitI::Result result = project_->getAllDesignUnits(designUnits_.Out());
+  if (cache && result == CitI::kOk) cache->StoreVerilog(VerilogFilesOf(project_));
   progress_.Clear();
   return result;
 }

@@ -17,12 +17,15 @@ class IHdlDesignUnit;
 
 namespace quillon {
 
+class ParseCache;
+
 class ProjectReader {
  public:
   ProjectReader(Vad::IHdlProject* project, Progress& progress) : project_(project), progress_(progress) {}
 
-  // Brings every file up to date and keeps the project's design units.
-  CitI::Result Parse();
+  // Brings every file up to date, through `cache` when given, and keeps the project's design
+  // units.
+  CitI::Result Parse(ParseCache* cache = nullptr);
   // Entities, architectures, packages, package bodies, modules and generics of the last Parse.
   Vad::IHdlDesignUnitSet* designUnits() const { return designUnits_.Get(); }
   // Every file of the project's file set, with every record of its unit set. Does not parse.
@@ -40,7 +43,7 @@ class ProjectReader {
   std::size_t FileCount() const;
 
  private:
-  void ParseFilesOneByOne();
+  void ParseFilesOneByOne(ParseCache* cache);
   static std::vector<OrderEntry> Describe(Vad::IHdlFileIterator* files);
 
   Vad::IHdlProject* project_;

@@ -5,6 +5,7 @@
 #include "CParserConfigBase.h"
 #include "CParserConfigHolder.h"
 #include "Identifiers.h"
+#include "ParseResultsArchive.h"
 #include "Port/File.h"
 #include "Port/InitObjects.h"
 #include "Port/MsgManData.h"
@@ -45,6 +46,7 @@ CitI::IInterface* CHdlFile::QueryInterface(const Port::XUID& id) {
   if (id == ICompAdmin::Iid()) return &compAdminFace_;
   if (id == Prjrep::IFileNameHelper::Iid()) return &fileNameHelperFace_;
   if (id == ISourceLibraryMember::Iid()) return &sourceLibraryMemberFace_;
+  if (id == IHdlParseResults::Iid()) return &parseResultsFace_;
   return nullptr;
 }
 
@@ -68,6 +70,25 @@ CitI::Result CHdlFile::bringUpToDate(IHdlFileIterator* projectFiles) {
   if (!holder) return CitI::kFail;
   result = holder->Parse(projectFiles);
   if (result != CitI::kOk) return result;
+  needsParse_ = false;
+  return CitI::kOk;
+}
+
+CitI::Result CHdlFile::saveParseResults(Prjrep::IArchive* archive) {
+  CParserConfigHolder* holder = GetHolder();
+  if (needsParse_ || !holder) return CitI::kFail;
+  return ParseResultsArchive::Save(holder->GetUnitSet(), archive);
+}
+
+CitI::Result CHdlFile::loadParseResults(Prjrep::IArchive* archive) {
+  CParserConfigHolder* holder = GetHolder();
+  if (!holder) return CitI::kFail;
+  ParseResultsArchive::Records records;
+  CitI::Result result = ParseResultsArchive::Load(archive, records);
+  if (result != CitI::kOk) return result;
+  Prjrep::AutoRelease<IHdlFileIterator> projectFiles;
+  if (project_) projectFiles = project_->CurrentFileList();
+  holder->AdoptUnits(records, projectFiles.Get());
   needsParse_ = false;
   return CitI::kOk;
 }

@@ -13,6 +13,7 @@
 #include "IFileNameHelper.h"
 #include "IFileType.h"
 #include "IHdlFile.h"
+#include "IHdlParseResults.h"
 #include "ISourceLibrary.h"
 #include "ISourceLibraryMember.h"
 #include "Port/StringBase.h"
@@ -29,8 +30,8 @@ class CParserConfigBase;
 class CParserConfigHolder;
 
 // QueryInterface answers, in this order, IInterface (the object itself), IHdlFile, IHdlFileV3,
-// IFileCompReference, Prjrep::IRefCount, ICompAdmin, Prjrep::IFileNameHelper and
-// ISourceLibraryMember.
+// IFileCompReference, Prjrep::IRefCount, ICompAdmin, Prjrep::IFileNameHelper,
+// ISourceLibraryMember and IHdlParseResults.
 class CHdlFile final : public CitI::IInterface, public SourceFileLink {
  public:
   // Needs a parse; makes its holder and, through the registry, its file-name helper.
@@ -87,6 +88,10 @@ class CHdlFile final : public CitI::IInterface, public SourceFileLink {
 
   // ---- ICompAdmin ----
   CitI::Result InitializeAfterCreate(CitI::IInterface* context);
+
+  // ---- IHdlParseResults ----
+  CitI::Result saveParseResults(Prjrep::IArchive* archive);
+  CitI::Result loadParseResults(Prjrep::IArchive* archive);
 
  private:
   class XIHdlFile final : public Prjrep::TFace<IHdlFile, CHdlFile> {
@@ -149,6 +154,17 @@ class CHdlFile final : public CitI::IInterface, public SourceFileLink {
     CitI::Result setSourceLibrary(CitI::IInterface* library) override;
   };
 
+  class XIHdlParseResults final : public Prjrep::TFace<IHdlParseResults, CHdlFile> {
+   public:
+    using TFace::TFace;
+    CitI::Result saveParseResults(Prjrep::IArchive* archive) override {
+      return owner()->saveParseResults(archive);
+    }
+    CitI::Result loadParseResults(Prjrep::IArchive* archive) override {
+      return owner()->loadParseResults(archive);
+    }
+  };
+
   // Directory (the full path minus the file name) and file name; false without a helper.
   bool SplitFullPath(Port::StringBase& directory, Port::StringBase& fileName) const;
 
@@ -169,6 +185,7 @@ class CHdlFile final : public CitI::IInterface, public SourceFileLink {
   Prjrep::TFileNameHelperFace<CHdlFile> fileNameHelperFace_{this, &fileNameHelper_};
   Prjrep::AutoPtr<ISourceLibrary> sourceLibrary_;
   XISourceLibraryMember sourceLibraryMemberFace_{this};
+  XIHdlParseResults parseResultsFace_{this};
 };
 
 }  // namespace Vad

@@ -179,6 +179,10 @@ CHdlProject::VerilogSurvey CHdlProject::SurveyVerilogFiles() const {
   return survey;
 }
 
+Prjrep::AutoRelease<IHdlFileIterator> CHdlProject::CurrentFileList() const {
+  return CProjectFileList::New(SurveyVerilogFiles().files);
+}
+
 CitI::Result CHdlProject::getAllDesignUnits(IHdlDesignUnitSet** out) {
   if (!out) return CitI::kInvalidArg;
   *out = nullptr;

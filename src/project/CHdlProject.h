@@ -114,6 +114,11 @@ class CHdlProject final : public CitI::IInterface {
     CitI::Result getHierarchyRoot(IHdlNetListNode** out) override { return owner()->getHierarchyRoot(out); }
   };
 
+ public:
+  // The file list that the project hands to the files it brings up to date now.
+  Prjrep::AutoRelease<IHdlFileIterator> CurrentFileList() const;
+
+ private:
   // The project's Verilog files (V3 flag set, plug-in name "PLUGIN_Verilog" in any case), largest
   // order key first, and whether any of them needs a parse.
   struct VerilogSurvey {

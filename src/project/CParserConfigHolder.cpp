@@ -546,10 +546,25 @@ void CParserConfigHolder::EndParse() {
   released.swap(recordedUnits_);
   nextDuplicate_.clear();
   ForgetParseState();
+  TakeParseInputs();
+}
+
+void CParserConfigHolder::TakeParseInputs() {
   CParserConfigBase* config = file_ ? file_->GetParserConfig() : nullptr;
   if (!config) return;
   config->GetSignature(signature_);
   GetLibraryName(library_);
+}
+
+void CParserConfigHolder::AdoptUnits(const std::vector<Prjrep::AutoPtr<CitI::IInterface>>& records,
+                                     IHdlFileIterator* projectFiles) {
+  BeginParse(projectFiles);
+  unitSet_->Clear();
+  for (const Prjrep::AutoPtr<CitI::IInterface>& record : records) {
+    if (auto* element = Prjrep::ImplementationCast<CHdlElement>(record.Get())) element->SetFile(file_);
+    unitSet_->Add(Prjrep::QueryAs<IHdlDesignUnit>(record.Get()));
+  }
+  TakeParseInputs();
 }
 
 CitI::Result CParserConfigHolder::Parse(IHdlFileIterator* projectFiles) {

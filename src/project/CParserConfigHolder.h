@@ -144,6 +144,10 @@ class CParserConfigHolder final : public CitI::IInterface {
   void ExtractPorts(IHdlDesignUnit* unit, IHdlPortIterator** out);
   void BeginParse(IHdlFileIterator* projectFiles);
   void EndParse();
+  // Makes `records` (design-unit records, in set order) the results of a parse of this file with
+  // `projectFiles`, as if the parser had just recorded them.
+  void AdoptUnits(const std::vector<Prjrep::AutoPtr<CitI::IInterface>>& records,
+                  IHdlFileIterator* projectFiles);
   // Whether the last parse is still valid for this project file list (null: none).
   CitI::Result IsUpToDate(bool* valid, IHdlFileIterator* projectFiles) const;
 
@@ -157,6 +161,8 @@ class CParserConfigHolder final : public CitI::IInterface {
   // What every unit-level recording resets: generate depth, component bindings, instance state.
   void ResetForNextUnit();
   void ResetInstanceState();
+  // What the last parse depended on: the configuration's signature and the library.
+  void TakeParseInputs();
   // Clears every plain pointer into the recorded units.
   void ForgetParseState();
   bool IsEnabled(TypeSlot slot) const { return typeEnabled_[slot]; }

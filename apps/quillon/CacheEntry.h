@@ -1,0 +1,30 @@
+// One entry of the parse cache as bytes: a header (magic, format version, payload length, payload
+// checksum), then the key, the messages of the parse and the module's archive of the records.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "Port/MsgMan.h"
+
+namespace quillon {
+
+struct CacheEntry {
+  static constexpr std::uint32_t kFormatVersion = 1;
+
+  std::string key;
+  std::vector<Port_MsgRecord> messages;
+  std::string records;  // the module's archive
+
+  std::string Encode() const;
+  // False, with the entry in an unspecified state, for bytes that are cut, damaged, of another
+  // format or version, or longer than the entry.
+  bool Decode(std::string_view bytes);
+
+  // FNV-1a, 64 bits: the checksum of entries and the content hash of sources.
+  static std::uint64_t Hash(std::string_view bytes);
+};
+
+}  // namespace quillon
