@@ -185,8 +185,8 @@ std::string ScriptProject::Export(const std::string& format, const std::string& 
   ExportPlan plan;
   std::vector<std::string> warnings;
   std::string error;
-  if (!ExportPlanner::PlanProject(order, tree, reader_->Files(), verilog_, top.empty() ? "" : KeyOf(FindUnit(top)),
-                                  plan, warnings, error))
+  if (!ExportPlanner::PlanProject(order, tree, reader_->Files(), verilog_,
+                                  top.empty() ? "" : KeyOf(FindUnit(top)), plan, warnings, error))
     request.Fail(error);
   for (const std::string& warning : warnings) request.log().ReportWarning(warning);
   std::ostringstream text;

@@ -1,7 +1,7 @@
 #include "CommandRunner.h"
 
-#include <unistd.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <cctype>
@@ -18,9 +18,9 @@
 #include "DiagnosticReport.h"
 #include "DotOutput.h"
 #include "ExitStatus.h"
-#include "FileFacts.h"
 #include "ExportPlanner.h"
 #include "ExportWriter.h"
+#include "FileFacts.h"
 #include "FileGraph.h"
 #include "Host/HostComponents.h"
 #include "IHdlElement.h"
@@ -143,16 +143,18 @@ int CommandRunner::ListFactories() {
   return kExitDone;
 }
 
-void CommandRunner::TakeExternalLibraries(const ProjectSources& sources) {
+void CommandRunner::TakeSettings(const ProjectSources& sources) {
   externalLibraries_ = sources.externalLibraries;
   externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
                             options_.externalLibraries.end());
+  verilog_ = ExportPlanner::VerilogSettingsOf(sources.properties);
 }
 
 int CommandRunner::RunOn(Vad::IHdlProject* project, const ProjectSources& sources, std::ostream& out) {
-  MessageLog log(options_.quiet, options_.verbose);
+  MessageLog log(options_.quiet, options_.verbose, ColorOnStandardError());
   log_ = &log;
-  TakeExternalLibraries(sources);
+  TakeSettings(sources);
+  shownPaths_ = ShownPaths(sources, options_.absolutePaths);
   int status = RunCommand(project, sources.files.size(), out);
   log_ = nullptr;
   return status;
@@ -162,8 +164,7 @@ int CommandRunner::RunOnProject() {
   ProjectSources sources;
   std::string error;
   if (!ProjectLoader(sources).Load(options_, error)) return BadInput(error);
-  TakeExternalLibraries(sources);
-  verilog_ = ExportPlanner::VerilogSettingsOf(sources.properties);
+  TakeSettings(sources);
 
   OutputFile file;
   const bool toFile = !options_.outputPath.empty();

@@ -10,8 +10,8 @@
 #include "MessageLog.h"
 #include "Options.h"
 #include "ProjectReader.h"
-#include "ShownPaths.h"
 #include "ProjectSources.h"
+#include "ShownPaths.h"
 
 namespace quillon {
 
@@ -26,7 +26,8 @@ class CommandRunner {
 
  private:
   int ListFactories();
-  void TakeExternalLibraries(const ProjectSources& sources);
+  // The external libraries and the Verilog settings of the sources.
+  void TakeSettings(const ProjectSources& sources);
   int RunOnProject();
   int RunCommand(Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out);
   int ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount, Progress& progress, std::ostream& out);

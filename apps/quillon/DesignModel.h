@@ -67,7 +67,7 @@ struct TreeNodeInfo {
   std::optional<std::string> elementType;
   std::optional<std::string> elementKey;  // design-unit key of the node's element
   std::optional<std::string> file;
-  std::optional<std::string> library;  // the library of the element's file
+  std::optional<std::string> library;       // the library of the element's file
   std::optional<std::string> fileFullPath;  // set by ShownPaths
   // Indices of the children in TreeInfo::nodes, in child order.
   std::vector<std::size_t> children;

@@ -14,8 +14,8 @@ struct Diagnostic {
   Severity severity = Severity::kError;
   std::string code;  // one of DiagnosticCode
   std::string text;
-  std::string file;        // the HDL file of the referring record; empty when no file is at fault
-  std::uint32_t line = 0;  // 0 when the finding has no line
+  std::string file;               // the HDL file of the referring record; empty when no file is at fault
+  std::uint32_t line = 0;         // 0 when the finding has no line
   std::string fileFullPath = {};  // set by ShownPaths, which makes `file` the path shown
 
   bool IsError() const { return severity == Severity::kError; }

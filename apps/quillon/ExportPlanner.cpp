@@ -100,8 +100,8 @@ VerilogSettings ExportPlanner::VerilogSettingsOf(const std::map<std::string, std
 
 bool ExportPlanner::PlanProject(const std::vector<OrderEntry>& order, const TreeInfo& tree,
                                 const std::vector<FileInfo>& files, const VerilogSettings& verilog,
-                                const std::string& topKey, ExportPlan& plan, std::vector<std::string>& leftOut,
-                                std::string& error) {
+                                const std::string& topKey, ExportPlan& plan,
+                                std::vector<std::string>& leftOut, std::string& error) {
   plan = ExportPlan{{}, verilog.includeDirs, verilog.defines, std::nullopt};
   std::vector<std::string> paths;
   if (!Plan(order, FileGraph::Build(tree, order), plan, paths, error)) return false;
@@ -109,7 +109,8 @@ bool ExportPlanner::PlanProject(const std::vector<OrderEntry>& order, const Tree
     leftOut.push_back(path + " is left out of the export: only VHDL and Verilog sources are compiled");
   if (!topKey.empty()) {
     plan.top = TopOf(topKey, files);
-    if (!plan.top) leftOut.push_back(topKey + " is no entity, architecture or module: the export names no top");
+    if (!plan.top)
+      leftOut.push_back(topKey + " is no entity, architecture or module: the export names no top");
   }
   return true;
 }

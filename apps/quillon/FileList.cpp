@@ -25,8 +25,10 @@ constexpr std::array<std::string_view, 6> kHarmlessOptions = {"+notimingchecks",
                                                               "-quiet",          "-64",        "-mfcu"};
 
 // True, with a warning naming the place, when `token` is one of those options.
-bool PassesOverHarmless(const std::string& token, const std::string& where, std::vector<std::string>& warnings) {
-  if (std::find(kHarmlessOptions.begin(), kHarmlessOptions.end(), token) == kHarmlessOptions.end()) return false;
+bool PassesOverHarmless(const std::string& token, const std::string& where,
+                        std::vector<std::string>& warnings) {
+  if (std::find(kHarmlessOptions.begin(), kHarmlessOptions.end(), token) == kHarmlessOptions.end())
+    return false;
   warnings.push_back(where + "the simulator option " + token + " changes nothing here; it is ignored");
   return true;
 }
@@ -203,7 +205,8 @@ bool FileList::ExpandVariable(const std::string& text, std::size_t& at, std::str
   std::size_t nameEnd = nameStart;
   while (nameEnd < text.size() && IsNameCharacter(text[nameEnd])) ++nameEnd;
   if (close && (nameEnd >= text.size() || text[nameEnd] != close)) {
-    error = "the variable after '$" + std::string(1, open) + "' is not closed by '" + std::string(1, close) + "'";
+    error =
+        "the variable after '$" + std::string(1, open) + "' is not closed by '" + std::string(1, close) + "'";
     return false;
   }
   if (nameEnd == nameStart) {  // a lone '$' is part of the path

@@ -69,8 +69,11 @@ Json UnitObject(const UnitInfo& unit) {
 Json FileObject(const FileInfo& file) {
   Json units = Json::array();
   for (const UnitInfo& unit : file.units) units.push_back(UnitObject(unit));
-  return {
-      {"path", file.path}, {"fullPath", file.fullPath}, {"plugin", file.plugin}, {"library", file.library}, {"units", std::move(units)}};
+  return {{"path", file.path},
+          {"fullPath", file.fullPath},
+          {"plugin", file.plugin},
+          {"library", file.library},
+          {"units", std::move(units)}};
 }
 
 std::string Scalar(const Json& value) { return value.dump(-1, ' ', false, Json::error_handler_t::replace); }
@@ -200,7 +203,10 @@ void JsonOutput::Order(const std::vector<OrderEntry>* order, const VerilogSettin
   if (order) {
     list = Json::array();
     for (const OrderEntry& entry : *order) {
-      list.push_back({{"path", entry.path}, {"fullPath", entry.fullPath}, {"library", entry.library}, {"plugin", entry.plugin}});
+      list.push_back({{"path", entry.path},
+                      {"fullPath", entry.fullPath},
+                      {"library", entry.library},
+                      {"plugin", entry.plugin}});
     }
   }
   Write({{"order", std::move(list)},

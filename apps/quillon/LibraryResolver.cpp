@@ -4,9 +4,9 @@
 
 #include "FileList.h"
 #include "PluginTable.h"
+#include "Progress.h"
 #include "ProjectBuilder.h"
 #include "ProjectReader.h"
-#include "Progress.h"
 
 namespace quillon {
 
@@ -93,7 +93,8 @@ bool LibraryResolver::OfferLibraryFileModules(std::string& error) {
 std::optional<SourceFile> LibraryResolver::Find(const std::string& name) const {
   if (auto offer = offered_.find(name); offer != offered_.end()) return offer->second;
   const ProjectSources::LibrarySearch& search = sources_.librarySearch;
-  const std::vector<std::string>& extensions = search.extensions.empty() ? kDefaultExtensions : search.extensions;
+  const std::vector<std::string>& extensions =
+      search.extensions.empty() ? kDefaultExtensions : search.extensions;
   for (const SourceFile& directory : search.directories) {
     for (const std::string& extension : extensions) {
       std::string fileName = name + extension;

@@ -32,7 +32,7 @@ class LibraryResolver {
   void Define(const std::vector<FileInfo>& files);
 
   ProjectSources& sources_;
-  std::map<std::string, SourceFile> offered_;  // module name -> the -v file defining it
+  std::map<std::string, SourceFile> offered_;                      // module name -> the -v file defining it
   std::map<std::string, std::vector<std::string>> modulesOfFile_;  // -v file's full path -> its modules
   std::set<std::string> defined_;
 };

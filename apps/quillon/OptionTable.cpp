@@ -4,10 +4,9 @@ namespace quillon {
 
 namespace {
 
-constexpr CommandSet kProjectCommands = SetOf(Command::kUnits) | SetOf(Command::kTree) |
-                                        SetOf(Command::kOrder) | SetOf(Command::kPorts) |
-                                        SetOf(Command::kCheck) | SetOf(Command::kExport) |
-                                        SetOf(Command::kWatch);
+constexpr CommandSet kProjectCommands =
+    SetOf(Command::kUnits) | SetOf(Command::kTree) | SetOf(Command::kOrder) | SetOf(Command::kPorts) |
+    SetOf(Command::kCheck) | SetOf(Command::kExport) | SetOf(Command::kWatch);
 constexpr CommandSet kDiagnosingCommands =
     SetOf(Command::kTree) | SetOf(Command::kOrder) | SetOf(Command::kCheck) | SetOf(Command::kWatch);
 
@@ -38,7 +37,8 @@ const std::vector<CommandSpec>& OptionTable::Commands() {
       {Command::kCheck, "check", "", "read everything and report problems only"},
       {Command::kFactories, "factories", "", "the classes the module registers"},
       {Command::kExport, "export", "", "the compile order for the tool that compiles it (--to FORMAT)"},
-      {Command::kWatch, "watch", "", "keep reading the sources and print the view (--show) whenever it changes"},
+      {Command::kWatch, "watch", "",
+       "keep reading the sources and print the view (--show) whenever it changes"},
   };
   return commands;
 }
@@ -112,8 +112,7 @@ const std::vector<OptionSpec>& OptionTable::All() {
        true},
 
       {"--top", "UNIT", "Order", SetOf(Command::kOrder) | SetOf(Command::kExport) | SetOf(Command::kTree),
-       "order and export: the files that UNIT and the units below it need, in compile order; tree: the "
-       "hierarchy below UNIT",
+       "the part of the design below UNIT: the files it needs in compile order, or its hierarchy (tree)",
        [](OptionValues& v, const std::string& value) { v.top = value; }},
       {"--unit", "UNIT", "Order", SetOf(Command::kOrder) | SetOf(Command::kExport),
        "by UNIT's kind: a module, its own file; an architecture, the files below its entity; an entity, "
@@ -122,11 +121,19 @@ const std::vector<OptionSpec>& OptionTable::All() {
       {"--with-library", nullptr, "Order", SetOf(Command::kOrder),
        "text output: the library before each path",
        [](OptionValues& v, const std::string&) { v.options.withLibrary = true; }},
-      {"--to", "FORMAT", "Export", SetOf(Command::kExport), "the tool's format",
+      {"--to",
+       "FORMAT",
+       "Export",
+       SetOf(Command::kExport),
+       "the tool's format",
        [](OptionValues& v, const std::string& value) { v.options.exportTo = value; },
        {"make", "ninja", "depfile", "ghdl", "iverilog", "edam", "tcl"}},
 
-      {"--depth", "N", "Tree", SetOf(Command::kTree), "the levels shown below the first; deeper ones are counted",
+      {"--depth",
+       "N",
+       "Tree",
+       SetOf(Command::kTree),
+       "the levels shown below the first; deeper ones are counted",
        [](OptionValues& v, const std::string& value) { v.options.depth = std::stoul(value); },
        {},
        true},
@@ -147,7 +154,11 @@ const std::vector<OptionSpec>& OptionTable::All() {
        [](OptionValues& v, const std::string& value) { v.options.cacheDir = value; }},
       {"--no-cache", nullptr, "Cache", kProjectCommands, "parse every file",
        [](OptionValues& v, const std::string&) { v.options.noCache = true; }},
-      {"--show", "VIEW", "Watch", SetOf(Command::kWatch), "the view that watch prints: order, tree or check",
+      {"--show",
+       "VIEW",
+       "Watch",
+       SetOf(Command::kWatch),
+       "the view that watch prints: order, tree or check",
        [](OptionValues& v, const std::string& value) { v.show = value; },
        {"order", "tree", "check"}},
 

@@ -286,8 +286,8 @@ bool ProjectLoader::AddProjectFile(const SourceArgument& argument, std::string& 
 
 bool ProjectLoader::AddFileList(const SourceArgument& argument, std::string& error) {
   FileList::Contents contents;
-  return lists_.Read(argument.path, argument.kind == SourceArgument::Kind::kFileListRelative, argument.library,
-                     argument.plugin, contents, error) &&
+  return lists_.Read(argument.path, argument.kind == SourceArgument::Kind::kFileListRelative,
+                     argument.library, argument.plugin, contents, error) &&
          TakeListContents(std::move(contents), error);
 }
 
@@ -298,8 +298,8 @@ bool ProjectLoader::TakeListContents(FileList::Contents contents, std::string& e
   ProjectSources::LibrarySearch& search = sources_.librarySearch;
   for (std::string& extension : contents.libraryExtensions) search.extensions.push_back(std::move(extension));
   auto place = [](const FileList::Entry& entry) {
-    return SourceFile{Canonical(entry.path, ""), entry.path, entry.library.empty() ? kDefaultLibrary : entry.library,
-                      entry.plugin};
+    return SourceFile{Canonical(entry.path, ""), entry.path,
+                      entry.library.empty() ? kDefaultLibrary : entry.library, entry.plugin};
   };
   for (const FileList::Entry& entry : contents.libraryDirs) {
     search.directories.push_back(place(entry));

@@ -20,7 +20,7 @@ struct CliRun {
   std::vector<std::string> args;
   std::string workDir;                                           // empty: the test's own
   std::vector<std::pair<std::string, std::string>> environment;  // added to the test's own
-  std::string inputPath = {};                                     // standard input; empty: none
+  std::string inputPath = {};                                    // standard input; empty: none
   bool errorToTerminal = false;  // standard error on a pseudo-terminal instead of a file
 };
 

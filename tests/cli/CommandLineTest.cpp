@@ -42,7 +42,7 @@ TEST(CommandLine, UsageMistakesAreRejectedWithStatusTwo) {
       {{"--depth", "-1", "tree", top}, "--depth"},
       {{"--property", "NOVALUE", "units", top}, "NOVALUE"},
       {{"-D", "=1", "units", top}, "-D"},
-      {{"units", top, "-l", "common"}, "--library common applies to no source"},
+      {{"units", top, "-l", "common"}, "-l common applies to no source"},
       {{"units", top, "--plugin", "PLUGIN_Vhdl"}, "--plugin PLUGIN_Vhdl applies to no source"},
       {{"units", "--lib", "common"}, "--lib needs NAME=PATH"},
   };

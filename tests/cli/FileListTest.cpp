@@ -1,9 +1,9 @@
-#include "FileList.h"
-
 #include <gtest/gtest.h>
 
 #include <map>
 #include <sstream>
+
+#include "FileList.h"
 
 namespace quillon {
 namespace {
@@ -61,8 +61,8 @@ TEST_F(FileListTest, EveryTokenKindOnAnyLine) {
   Contents contents;
   std::string error;
   ASSERT_TRUE(Read("top.f", false, contents, error)) << error;
-  EXPECT_EQ(Paths(contents.sources),
-            (std::vector<std::string>{"a.v", "with blank.v", "c.sv", "d.vhd", "e.vhd", "f.txt", "dir/g.v", "h.v"}));
+  EXPECT_EQ(Paths(contents.sources), (std::vector<std::string>{"a.v", "with blank.v", "c.sv", "d.vhd",
+                                                               "e.vhd", "f.txt", "dir/g.v", "h.v"}));
   EXPECT_EQ(contents.includeDirs, (std::vector<std::string>{"inc", "../shared"}));
   EXPECT_EQ(contents.defines, (std::vector<std::string>{"WIDTH=8", "FAST"}));
   EXPECT_EQ(contents.libraryExtensions, (std::vector<std::string>{".v", ".sv"}));
@@ -128,8 +128,9 @@ TEST_F(FileListTest, HarmlessSimulatorOptionsOnlyWarn) {
   ASSERT_TRUE(Read("top.f", false, contents, error)) << error;
   EXPECT_EQ(Paths(contents.sources), std::vector<std::string>{"a.v"});
   EXPECT_EQ(contents.warnings,
-            (std::vector<std::string>{"top.f:1: the simulator option +notimingchecks changes nothing here; it is ignored",
-                                      "top.f:2: the simulator option -64 changes nothing here; it is ignored"}));
+            (std::vector<std::string>{
+                "top.f:1: the simulator option +notimingchecks changes nothing here; it is ignored",
+                "top.f:2: the simulator option -64 changes nothing here; it is ignored"}));
 }
 
 TEST_F(FileListTest, StandardInputIsReadOnce) {

@@ -57,7 +57,7 @@ TEST(Options, MisspeltCommandsOptionsAndUnitsGetTheClosestNames) {
   const std::vector<Case> cases = {
       {{"ordr", "-P", project}, "unknown command 'ordr'; did you mean 'order'?"},
       {{"compile", "-P", project}, "unknown command 'compile' (see"},
-      {{"order", "--tpo", "top", "-P", project}, "unknown option '--tpo'; did you mean '--top'?"},
+      {{"order", "--tpo", "top", "-P", project}, "unknown option '--tpo'; did you mean '--to' or '--top'?"},
       {{"--strickt", "check", "-P", project}, "unknown option '--strickt'; did you mean '--strict'?"},
       {{"--frobnicate", "units", "-P", project}, "unknown option '--frobnicate' (see"},
       {{"order", "--top", "croe", "-P", project}, "unknown design unit 'croe'; did you mean 'core'?"},
@@ -98,7 +98,8 @@ TEST(Options, ManualPageAndCompletionWordsComeFromTheSameTables) {
     EXPECT_TRUE(Has(man.out, part)) << part;
 
   EXPECT_EQ(Lines(RunQuillon({"--help-words", "commands"}).out),
-            (std::vector<std::string>{"units", "tree", "order", "ports", "check", "factories", "help"}));
+            (std::vector<std::string>{"units", "tree", "order", "ports", "check", "factories", "export",
+                                      "watch", "help"}));
   EXPECT_EQ(Lines(RunQuillon({"--help-words", "--color"}).out),
             (std::vector<std::string>{"auto", "always", "never"}));
   std::vector<std::string> orderWords = Lines(RunQuillon({"--help-words", "order"}).out);

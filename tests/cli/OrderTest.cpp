@@ -35,12 +35,10 @@ TEST(Order, WholeProjectPutsEveryFileAfterTheFilesItUses) {
   EXPECT_EQ(result.status, 0) << result.err;
   Json answer = JsonAnswer(result);
   EXPECT_EQ(OrderedPaths(answer), Mixed({"shared_pkg.vhd", "lane.vhd", "core.vhd", "top.vhd"}));
-  EXPECT_EQ(
-      answer["order"][0],
-      (Json{{"path", DataPath("mixed/shared_pkg.vhd")},
-            {"fullPath", DataPath("mixed/shared_pkg.vhd")},
-            {"library", "shared"},
-            {"plugin", "PLUGIN_Vhdl"}}));
+  EXPECT_EQ(answer["order"][0], (Json{{"path", DataPath("mixed/shared_pkg.vhd")},
+                                      {"fullPath", DataPath("mixed/shared_pkg.vhd")},
+                                      {"library", "shared"},
+                                      {"plugin", "PLUGIN_Vhdl"}}));
   EXPECT_EQ(answer["messages"], Json::array());
 }
 

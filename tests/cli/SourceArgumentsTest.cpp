@@ -34,7 +34,9 @@ const std::vector<std::string> kNeeded = {"rtl/top.v", "rtl/counter.v", "lib/alu
 
 TEST(SourceArguments, LibraryModulesAreReadWhenInstantiatedAndNotDefined) {
   EXPECT_EQ(OrderIn(kLibsearch, {"-F", "rtl/files.f"}), kNeeded);
-  EXPECT_EQ(OrderIn(kLibsearch, {"rtl/top.v", "rtl/counter.v", "-y", "lib", "--library-file", "cells/cells.v"}), kNeeded);
+  EXPECT_EQ(
+      OrderIn(kLibsearch, {"rtl/top.v", "rtl/counter.v", "-y", "lib", "--library-file", "cells/cells.v"}),
+      kNeeded);
   ScopedTextFile list("rtl/top.v\n-y lib\n  -v cells/absent.v\n");
   CliResult missing = RunIn(kLibsearch, {"units", "-f", list.path()});
   EXPECT_EQ(missing.status, 2);
@@ -76,7 +78,8 @@ TEST(SourceArguments, DirectoriesAndPatternsGiveTheirFilesSorted) {
   EXPECT_EQ(none.status, 2);
   EXPECT_NE(none.err.find("no file matches the pattern rtl/*.vhd"), std::string::npos) << none.err;
 
-  CliResult json = RunIn(kLibsearch, {"-q", "--format", "json", "order", "--lib", "cells=cells/*.v", "lib/mux.v"});
+  CliResult json =
+      RunIn(kLibsearch, {"-q", "--format", "json", "order", "--lib", "cells=cells/*.v", "lib/mux.v"});
   ASSERT_EQ(json.status, 0) << json.err;
   const Json order = Json::parse(json.out)["order"];
   ASSERT_EQ(order.size(), 2u);
@@ -87,8 +90,8 @@ TEST(SourceArguments, DirectoriesAndPatternsGiveTheirFilesSorted) {
 TEST(SourceArguments, ListsComeFromStandardInputAndTheEnvironment) {
   ScopedTextFile nested("${HERE}/rtl/top.v // from a list named on standard input\n", "nested.f");
   ScopedTextFile input("$HERE/rtl/counter.v\n-f " + nested.path() + "\n", "stdin.f");
-  CliResult result = RunQuillon(
-      CliRun{{"-q", "order", "-f", "-"}, DataPath(kLibsearch), {{"HERE", DataPath(kLibsearch)}}, input.path()});
+  CliResult result = RunQuillon(CliRun{
+      {"-q", "order", "-f", "-"}, DataPath(kLibsearch), {{"HERE", DataPath(kLibsearch)}}, input.path()});
   EXPECT_EQ(result.status, 0) << result.err;
   EXPECT_EQ(Lines(result.out),
             (std::vector<std::string>{DataPath("libsearch/rtl/counter.v"), DataPath("libsearch/rtl/top.v")}));
