@@ -18,9 +18,9 @@ import subprocess
 import time
 
 HERE = os.path.dirname(os.path.abspath(__file__))
-spec = importlib.util.spec_from_file_location("cli_bench", os.path.join(HERE, "cli-bench.py"))
-cli_bench = importlib.util.module_from_spec(spec)
-spec.loader.exec_module(cli_bench)
+module_file = importlib.util.spec_from_file_location("cli_bench", os.path.join(HERE, "cli-bench.py"))
+cli_bench = importlib.util.module_from_spec(module_file)
+module_file.loader.exec_module(cli_bench)
 
 
 def timed(args):

@@ -26,11 +26,11 @@ std::string Escaped(const std::string& text) {
   return out;
 }
 
-std::string CommandsOf(const OptionSpec& option) {
+std::string CommandsOf(const OptionEntry& option) {
   if (option.commands == 0) return {};
   std::vector<std::string> names;
   std::size_t all = 0;
-  for (const CommandSpec& command : OptionTable::Commands()) {
+  for (const CommandEntry& command : OptionTable::Commands()) {
     if (command.command == Command::kFactories) continue;
     ++all;
     if (option.commands & SetOf(command.command)) names.push_back(command.name);
@@ -41,7 +41,7 @@ std::string CommandsOf(const OptionSpec& option) {
   return text + " only)";
 }
 
-void WriteOption(const OptionSpec& option, std::ostream& out) {
+void WriteOption(const OptionEntry& option, std::ostream& out) {
   out << ".TP\n";
   std::vector<std::string> spellings = OptionTable::Spellings(option);
   for (std::size_t i = 0; i < spellings.size(); ++i)
@@ -61,7 +61,7 @@ void ManPage::Write(std::ostream& out) {
          "builds the design hierarchy and computes the order in which the files must be compiled. A SOURCE "
          "is a file whose plug\\-in follows from its extension. Options may stand before or after the "
          "command.\n.SH COMMANDS\n";
-  for (const CommandSpec& command : OptionTable::Commands()) {
+  for (const CommandEntry& command : OptionTable::Commands()) {
     out << ".TP\n\\fB" << command.name << "\\fR";
     if (*command.operands) out << " \\fI" << command.operands << "\\fR";
     out << "\n" << Escaped(command.summary) << "\n";
@@ -70,7 +70,7 @@ void ManPage::Write(std::ostream& out) {
   // quillon's own options first, then those of the commands under their headings.
   out << ".SH OPTIONS\n.TP\n\\fB\\-h\\fR, \\fB\\-\\-help\\fR\nthe help of quillon or of the command\n";
   std::vector<std::string> groups;
-  for (const OptionSpec& option : OptionTable::All()) {
+  for (const OptionEntry& option : OptionTable::All()) {
     if (!*option.group) continue;
     if (option.commands == 0)
       WriteOption(option, out);
@@ -79,7 +79,7 @@ void ManPage::Write(std::ostream& out) {
   }
   for (const std::string& group : groups) {
     out << ".SS " << group << "\n";
-    for (const OptionSpec& option : OptionTable::All()) {
+    for (const OptionEntry& option : OptionTable::All()) {
       if (option.commands != 0 && option.group == group) WriteOption(option, out);
     }
   }

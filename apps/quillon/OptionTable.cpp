@@ -28,8 +28,8 @@ void AddLibraryAssignment(OptionValues& values, const std::string& value) {
 
 }  // namespace
 
-const std::vector<CommandSpec>& OptionTable::Commands() {
-  static const std::vector<CommandSpec> commands = {
+const std::vector<CommandEntry>& OptionTable::Commands() {
+  static const std::vector<CommandEntry> commands = {
       {Command::kUnits, "units", "", "the design units of every source file"},
       {Command::kTree, "tree", "", "the design hierarchy"},
       {Command::kOrder, "order", "", "the order in which the source files must be compiled"},
@@ -45,9 +45,9 @@ const std::vector<CommandSpec>& OptionTable::Commands() {
 
 // The order of getCompileOrderByDU with its mode flag set depends on the kind of unit, and the
 // help of --unit says so: an entity is ordered from the root of the hierarchy.
-const std::vector<OptionSpec>& OptionTable::All() {
+const std::vector<OptionEntry>& OptionTable::All() {
   using Kind = SourceArgument::Kind;
-  static const std::vector<OptionSpec> options = {
+  static const std::vector<OptionEntry> options = {
       {"--version", nullptr, "Options", 0, "the version and the module quillon loads",
        [](OptionValues& v, const std::string&) { v.versionAsked = true; }},
       {"--color",
@@ -182,7 +182,7 @@ const std::vector<OptionSpec>& OptionTable::All() {
   return options;
 }
 
-std::vector<std::string> OptionTable::Spellings(const OptionSpec& option) {
+std::vector<std::string> OptionTable::Spellings(const OptionEntry& option) {
   std::vector<std::string> spellings;
   std::string names = option.names;
   for (std::size_t start = 0; start <= names.size();) {

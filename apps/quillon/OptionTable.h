@@ -29,14 +29,14 @@ struct OptionValues {
 using CommandSet = unsigned;
 constexpr CommandSet SetOf(Command command) { return 1u << static_cast<unsigned>(command); }
 
-struct CommandSpec {
+struct CommandEntry {
   Command command;
   const char* name;
   const char* operands;  // "UNIT" for ports, else ""
   const char* summary;
 };
 
-struct OptionSpec {
+struct OptionEntry {
   const char* names;  // "-l,--library"
   const char* value;  // the value's name in the help; null for a flag
   const char* group;  // the heading in the help; "" hides the option
@@ -50,10 +50,10 @@ struct OptionSpec {
 
 class OptionTable {
  public:
-  static const std::vector<CommandSpec>& Commands();
-  static const std::vector<OptionSpec>& All();
+  static const std::vector<CommandEntry>& Commands();
+  static const std::vector<OptionEntry>& All();
   // The words of `names` as typed: "-l,--library" -> {"-l", "--library"}.
-  static std::vector<std::string> Spellings(const OptionSpec& option);
+  static std::vector<std::string> Spellings(const OptionEntry& option);
   // What a UNIT is, and the exit statuses: the closing words of the help and the manual page.
   static const char* UnitText();
   static const char* ExitText();

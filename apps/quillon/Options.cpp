@@ -28,7 +28,7 @@ bool IsWholeNumber(const std::string& text) {
 
 // The values of options with choices or numbers are checked here rather than by CLI11, which does
 // not name an option declared hidden in its message.
-bool CheckValue(const OptionSpec& option, const std::string& value, std::string& error) {
+bool CheckValue(const OptionEntry& option, const std::string& value, std::string& error) {
   const std::string name = OptionTable::Spellings(option).back();
   if (option.number && !IsWholeNumber(value)) {
     error = name + ": '" + value + "' is not a whole number that quillon can count";
@@ -60,11 +60,11 @@ bool SplitAssignment(const std::string& text, std::pair<std::string, std::string
 
 std::string UnknownCommand(const std::string& word) {
   std::vector<std::string> names{"help"};
-  for (const CommandSpec& command : OptionTable::Commands()) names.push_back(command.name);
+  for (const CommandEntry& command : OptionTable::Commands()) names.push_back(command.name);
   return "unknown command '" + word + "'" + Suggestions::DidYouMean(word, names);
 }
 
-bool AppliesTo(const OptionSpec& option, Command command) { return (option.commands & SetOf(command)) != 0; }
+bool AppliesTo(const OptionEntry& option, Command command) { return (option.commands & SetOf(command)) != 0; }
 
 // Options are recorded as they are parsed, with the number of sources before them, so that -l and --plugin
 // apply to the sources after them whether they stand before or after the command. CLI11 runs the callbacks of
@@ -77,12 +77,12 @@ class Parser {
 
  private:
   struct Occurrence {
-    const OptionSpec* option;
+    const OptionEntry* option;
     std::string value;
     std::size_t sourcesBefore;
   };
   struct CommandApp {
-    const CommandSpec* spec;
+    const CommandEntry* entry;
     CLI::App* app;
     std::string unit;
     std::vector<std::string> sources;
@@ -90,8 +90,8 @@ class Parser {
   };
 
   void Declare();
-  void DeclareOption(CLI::App& app, const OptionSpec& option, bool shown);
-  void DeclareCommand(const CommandSpec& command);
+  void DeclareOption(CLI::App& app, const OptionEntry& option, bool shown);
+  void DeclareCommand(const CommandEntry& command);
   std::size_t SourcesSoFar() const;
   const CommandApp* SelectedCommand() const;
 
@@ -112,7 +112,7 @@ class Parser {
   std::vector<std::string> helpTopic_;
 };
 
-void Parser::DeclareOption(CLI::App& app, const OptionSpec& option, bool shown) {
+void Parser::DeclareOption(CLI::App& app, const OptionEntry& option, bool shown) {
   auto record = [this, &option](const std::string& value) {
     occurrences_.push_back({&option, value, SourcesSoFar()});
   };
@@ -128,16 +128,16 @@ void Parser::DeclareOption(CLI::App& app, const OptionSpec& option, bool shown) 
   declared->trigger_on_parse()->group(shown ? option.group : "");
 }
 
-void Parser::DeclareCommand(const CommandSpec& spec) {
-  CLI::App* app = app_.add_subcommand(spec.name, spec.summary)->group("Commands");
-  CommandApp& command = commands_.emplace_back(CommandApp{&spec, app, {}, {}, nullptr});
-  if (*spec.operands) app->add_option(spec.operands, command.unit, "the design unit")->type_name("");
+void Parser::DeclareCommand(const CommandEntry& entry) {
+  CLI::App* app = app_.add_subcommand(entry.name, entry.summary)->group("Commands");
+  CommandApp& command = commands_.emplace_back(CommandApp{&entry, app, {}, {}, nullptr});
+  if (*entry.operands) app->add_option(entry.operands, command.unit, "the design unit")->type_name("");
   command.sourcesOption =
       app->add_option("SOURCE", command.sources, "a source file; the plug-in follows from its extension")
           ->type_name("");
-  bool namesUnits = std::string_view(spec.operands) == "UNIT";
-  for (const OptionSpec& option : OptionTable::All()) {
-    if (!AppliesTo(option, spec.command)) continue;
+  bool namesUnits = std::string_view(entry.operands) == "UNIT";
+  for (const OptionEntry& option : OptionTable::All()) {
+    if (!AppliesTo(option, entry.command)) continue;
     DeclareOption(*app, option, true);
     namesUnits = namesUnits || (option.value && std::string_view(option.value) == "UNIT");
   }
@@ -155,8 +155,8 @@ void Parser::Declare() {
   app_.allow_extras();
   app_.footer(std::string(kCommandHelp) + "\n" + OptionTable::ExitText());
   app_.add_option("COMMAND", strayWords_)->group("");
-  for (const OptionSpec& option : OptionTable::All()) DeclareOption(app_, option, option.commands == 0);
-  for (const CommandSpec& command : OptionTable::Commands()) DeclareCommand(command);
+  for (const OptionEntry& option : OptionTable::All()) DeclareOption(app_, option, option.commands == 0);
+  for (const CommandEntry& command : OptionTable::Commands()) DeclareCommand(command);
   help_ =
       app_.add_subcommand("help", "this help, or with a COMMAND the help of that command")->group("Commands");
   help_->add_option("COMMAND", helpTopic_);
@@ -209,8 +209,8 @@ Options::Outcome Parser::Run(int argc, const char* const* argv, std::string& err
     error = "no command given";
     return Options::Outcome::kUsageError;
   }
-  values_.options.command = command->spec->command;
-  if (command->spec->command == Command::kPorts && command->unit.empty()) {
+  values_.options.command = command->entry->command;
+  if (command->entry->command == Command::kPorts && command->unit.empty()) {
     error = "ports needs a UNIT";
     return Options::Outcome::kUsageError;
   }
@@ -227,7 +227,7 @@ bool Parser::ShowHelpTopic() const {
     return true;
   }
   for (const CommandApp& command : commands_) {
-    if (command.spec->name != helpTopic_[0]) continue;
+    if (command.entry->name != helpTopic_[0]) continue;
     std::cout << command.app->help(app_.get_name());
     return true;
   }
@@ -240,17 +240,17 @@ void Parser::ShowCompletionWords(const std::string& of) const {
   std::vector<std::string> words;
   const CommandApp* command = nullptr;
   for (const CommandApp& each : commands_) {
-    if (of == "commands") words.push_back(each.spec->name);
-    if (each.spec->name == of) command = &each;
+    if (of == "commands") words.push_back(each.entry->name);
+    if (each.entry->name == of) command = &each;
   }
   if (of == "commands") words.push_back("help");
   if (command || of == "options") words.insert(words.end(), {"-h", "--help"});
-  for (const OptionSpec& option : OptionTable::All()) {
+  for (const OptionEntry& option : OptionTable::All()) {
     std::vector<std::string> spellings = OptionTable::Spellings(option);
     if (std::find(spellings.begin(), spellings.end(), of) != spellings.end())
       words.insert(words.end(), option.choices.begin(), option.choices.end());
     bool offered = option.commands == 0 ? command || of == "options"
-                                        : command && AppliesTo(option, command->spec->command);
+                                        : command && AppliesTo(option, command->entry->command);
     if (offered && *option.group) words.insert(words.end(), spellings.begin(), spellings.end());
   }
   for (const std::string& word : words) std::cout << word << '\n';
@@ -270,7 +270,7 @@ bool Parser::TakeWords(std::string& error) {
     return false;
   }
   std::vector<std::string> optionNames{"--help"};
-  for (const OptionSpec& option : OptionTable::All()) {
+  for (const OptionEntry& option : OptionTable::All()) {
     if (!*option.group) continue;
     for (const std::string& spelling : OptionTable::Spellings(option))
       if (spelling.size() > 2) optionNames.push_back(spelling);

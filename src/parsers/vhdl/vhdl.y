@@ -79,7 +79,7 @@ void RecordEntityInstance(VhdlParseContext& ctx, VhdlText label, VhdlText entity
 }
 
 // Inside a configuration declaration a binding is a unit the configuration depends on; in an
-// architecture it is a configuration specification.
+// architecture it binds the component instances of its own (`for u : comp use entity ...`).
 void RecordConfigBinding(VhdlParseContext& ctx, VhdlText instances, VhdlText component, VhdlText entity,
                          std::string_view architecture) {
   if (ctx.openDeclaration == Vad::VhdlDeclaration::kConfiguration) {
