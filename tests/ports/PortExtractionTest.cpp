@@ -16,7 +16,7 @@
 
 #include "IHdlElaborationData.h"
 #include "IHdlPort.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "Port/MsgManData.h"
@@ -64,7 +64,7 @@ Strings Describe(Vad::IHdlPortIterator* ports) {
   return lines;
 }
 
-class PortExtraction : public pipeline_test::PipelineTest {
+class PortExtraction : public test_host::PipelineTest {
  protected:
   void SetUp() override {
     defaultWasRegistered_ = Port_MsgDispatcher::removeMsgMan(Port_MsgDispatcher::getDefaultMsgMan());

@@ -4,9 +4,9 @@
 #include "EntityDecl.h"
 #include "IDesignUnit.h"
 #include "IDesignUnitType.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 
-using namespace pipeline_test;
+using namespace test_host;
 
 namespace {
 

@@ -2,14 +2,14 @@
 
 #include "Host/FileComponent.h"
 #include "Host/FileNameHelper.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "Port/MsgManData.h"
 #include "Prjrep/RefCounting.h"
 #include "RavA/Factory.h"
 #include "TFactory.h"
 #include "generic.h"
 
-using namespace pipeline_test;
+using namespace test_host;
 
 namespace {
 

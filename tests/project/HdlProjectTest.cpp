@@ -2,14 +2,14 @@
 
 #include "CHdlProject.h"
 #include "CLibRefs.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "Port/MsgManData.h"
 #include "Prjrep/RefCounting.h"
 #include "module.h"
 
-using namespace pipeline_test;
+using namespace test_host;
 
 namespace {
 

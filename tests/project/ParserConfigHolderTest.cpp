@@ -6,12 +6,12 @@
 #include "EntityInst.h"
 #include "Library.h"
 #include "PackageDecl.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "Prjrep/TListIter.h"
 #include "Use.h"
 #include "module.h"
 
-using namespace pipeline_test;
+using namespace test_host;
 using Vad::CParserConfigHolder;
 
 namespace {

@@ -2,10 +2,10 @@
 
 #include "CHdlPropertyIterator.h"
 #include "CParserConfigBase.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "Prjrep/RefCounting.h"
 
-using namespace pipeline_test;
+using namespace test_host;
 
 namespace {
 

@@ -12,7 +12,7 @@
 #include "GenericParser.h"
 #include "HrfParser.h"
 #include "Parser.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "PluginParserFactory.h"
 #include "PlxParser.h"
 #include "Port/Env.h"
@@ -25,7 +25,7 @@
 #include "generic.h"
 #include "module.h"
 
-using namespace pipeline_test;
+using namespace test_host;
 
 namespace {
 

@@ -16,7 +16,7 @@
 
 #include "CHdlElement.h"
 #include "CParserConfigHolder.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "Port/File.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
@@ -26,7 +26,7 @@
 
 namespace convert_test {
 
-class ConverterParse : public pipeline_test::PipelineTest {
+class ConverterParse : public test_host::PipelineTest {
  protected:
   void SetUp() override {
     project_ = NewProject();

@@ -15,7 +15,7 @@
 #include "CParserConfigHolder.h"
 #include "EdifParser.h"
 #include "EdifParserEx.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "ScopedTempDir.h"
@@ -69,7 +69,7 @@ class ScopedCurrentDir {
   std::string saved_;
 };
 
-class EdifRead : public pipeline_test::PipelineTest {
+class EdifRead : public test_host::PipelineTest {
  protected:
   void SetUp() override { project_ = NewProject(); }
 

@@ -13,7 +13,7 @@
 
 #include "CHdlElement.h"
 #include "CParserConfigHolder.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "ScopedTempDir.h"
@@ -21,7 +21,7 @@
 
 namespace hrf_test {
 
-class HierarchyRead : public pipeline_test::PipelineTest {
+class HierarchyRead : public test_host::PipelineTest {
  protected:
   void SetUp() override {
     project_ = NewProject();

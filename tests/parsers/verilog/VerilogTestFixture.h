@@ -13,7 +13,7 @@
 #include <vector>
 
 #include "CHdlElement.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "Port/Env.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
@@ -26,7 +26,7 @@ namespace verilog_test {
 
 inline constexpr const char* kVerilogPlugin = "PLUGIN_Verilog";
 
-class VerilogProject : public pipeline_test::PipelineTest {
+class VerilogProject : public test_host::PipelineTest {
  protected:
   void SetUp() override { project_ = NewProject(); }
 

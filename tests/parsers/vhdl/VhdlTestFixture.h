@@ -12,13 +12,13 @@
 
 #include "CHdlElement.h"
 #include "CVhdlDU.h"
-#include "PipelineFixtures.h"
+#include "TestHost.h"
 #include "ScopedTempDir.h"
 #include "VhdlParser.h"
 
 namespace vhdl_test {
 
-class VhdlParse : public pipeline_test::PipelineTest {
+class VhdlParse : public test_host::PipelineTest {
  protected:
   void SetUp() override { project_ = NewProject(); }
 

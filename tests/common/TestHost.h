@@ -1,5 +1,5 @@
-// Shared set-up of the parse-pipeline tests: host components and module factories in the
-// registry, and projects and files made the way a host makes them.
+// The shared test host: host components and module factories in the registry, and projects and
+// files made the way a host makes them. Every test area builds on it.
 #pragma once
 
 #include <gtest/gtest.h>
@@ -29,7 +29,7 @@
 
 extern "C" void InstFactoryEntry();
 
-namespace pipeline_test {
+namespace test_host {
 
 class PipelineTest : public testing::Test {
  protected:
@@ -161,4 +161,4 @@ class PipelineTest : public testing::Test {
   }
 };
 
-}  // namespace pipeline_test
+}  // namespace test_host
