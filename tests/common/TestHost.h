@@ -1,5 +1,6 @@
-// The shared test host: host components and module factories in the registry, and projects and
-// files made the way a host makes them. Every test area builds on it.
+// The shared test host: host components and module factories in the registry, projects and files
+// made the way a host makes them, message collection and the environment of the cell libraries.
+// Every test area builds on it.
 #pragma once
 
 #include <gtest/gtest.h>
@@ -24,12 +25,82 @@
 #include "IHdlProject.h"
 #include "ISourceLibraryMember.h"
 #include "Identifiers.h"
+#include "Port/Env.h"
+#include "Port/File.h"
+#include "Port/MsgCollector.h"
+#include "Port/MsgDispatcher.h"
+#include "Port/MsgManData.h"
 #include "Prjrep/AutoPtr.h"
 #include "Prjrep/Casts.h"
+#include "RavA/Factory.h"
+#include "ScopedEnv.h"
 
 extern "C" void InstFactoryEntry();
 
 namespace test_host {
+
+// A counted object owned by the test: released when this goes out of scope.
+template <class T>
+class Owned : public Prjrep::AutoRelease<T> {
+ public:
+  using Prjrep::AutoRelease<T>::AutoRelease;
+  T& operator*() const { return *this->Get(); }
+};
+
+// The module's factories in the registry for one test, and an empty registry afterwards.
+class RegisteredModule : public testing::Test {
+ protected:
+  void SetUp() override { InstFactoryEntry(); }
+  void TearDown() override { RavA::Factory::Clear(); }
+};
+
+// Every message dispatched while it lives, besides the managers already registered.
+class CollectedMessages {
+ public:
+  CollectedMessages() { EXPECT_TRUE(Port_MsgDispatcher::addMsgMan(&collector_)); }
+  ~CollectedMessages() { Port_MsgDispatcher::removeMsgMan(&collector_); }
+  CollectedMessages(const CollectedMessages&) = delete;
+  CollectedMessages& operator=(const CollectedMessages&) = delete;
+
+  const std::vector<Port_MsgRecord>& records() const { return collector_.records(); }
+  Port_MsgCollector& collector() { return collector_; }
+
+ private:
+  Port_MsgCollector collector_;
+};
+
+// The debug text that `action` writes.
+template <class Action>
+std::string DebugTextOf(Action action) {
+  Port_DebugCapture debug;
+  action();
+  return debug.text();
+}
+
+// CORVANE naming the repository's cell libraries, as the command-line host sets it.
+class ScopedCellLibraries : public ScopedEnv {
+ public:
+  ScopedCellLibraries() : ScopedEnv("CORVANE", Port_Env::GetInstallRoot().c_str()) {}
+};
+
+inline std::string CurrentDirectory() {
+  Port::StringBase dir;
+  EXPECT_TRUE(Port::File::getcwd(&dir));
+  return dir.str();
+}
+
+class ScopedWorkingDirectory {
+ public:
+  explicit ScopedWorkingDirectory(const std::string& dir) : saved_(CurrentDirectory()) {
+    EXPECT_TRUE(Port::File::chdir(dir.c_str()));
+  }
+  ScopedWorkingDirectory(const ScopedWorkingDirectory&) = delete;
+  ScopedWorkingDirectory& operator=(const ScopedWorkingDirectory&) = delete;
+  ~ScopedWorkingDirectory() { Port::File::chdir(saved_.c_str()); }
+
+ private:
+  std::string saved_;
+};
 
 class PipelineTest : public testing::Test {
  protected:
