@@ -7,14 +7,17 @@
 #include "CBasecellLoader.h"
 #include "CBlockcellLoader.h"
 #include "CTimecellLoader.h"
-#include "LibRefTestSupport.h"
-#include "Port/MsgCollector.h"
-#include "Port/MsgDispatcher.h"
+#include "CLibRefs.h"
 #include "ScopedTempDir.h"
+#include "TestHost.h"
 
-using namespace libref_test;
+using namespace test_host;
 
 namespace {
+
+bool IsCell(const Vad::CLibRefs& references, std::string_view library, std::string_view name) {
+  return references.HasLibraryUnit(library, "vcomponents", "all", name, "VHDL");
+}
 
 std::vector<std::string> Entries(const std::string& dir) {
   std::vector<std::string> names;

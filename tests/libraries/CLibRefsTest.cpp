@@ -4,17 +4,58 @@
 #include <string>
 #include <vector>
 
+#include "CLibLoader.h"
 #include "CLibRefs.h"
-#include "Host/PropertyInstance.h"
-#include "Identifiers.h"
-#include "LibRefTestSupport.h"
-#include "Prjrep/AutoPtr.h"
-#include "Prjrep/Casts.h"
+#include "TestHost.h"
+#include "rudiva/RudIva.h"
 
-using namespace libref_test;
+using test_host::ScopedCellLibraries;
 using Vad::CLibRefs;
 
 namespace {
+
+bool IsCell(const CLibRefs& references, std::string_view library, std::string_view name) {
+  return references.HasLibraryUnit(library, "vcomponents", "all", name, "VHDL");
+}
+
+// What the counting loaders were asked to do, kept outside them because the references own them:
+// "<library> load" and "<library> family <name>" for every call.
+struct LoaderLog {
+  int loads = 0;
+  std::vector<std::string> families;
+  std::vector<std::string> calls;
+};
+
+// Logs its loads and families and declares one component, "<LIBRARY>_CELL", in "vcomponents".
+class CountingLoader final : public Vad::CLibLoader {
+ public:
+  CountingLoader(const char* library, LoaderLog* log, bool loads = true)
+      : CLibLoader(library, "chdp.ini", RudIva::kSynthesisLibraries), log_(log), loads_(loads) {}
+
+  bool Load(Vad::CLibRefs* references) override {
+    ++log_->loads;
+    log_->calls.push_back(LibraryName().str() + " load");
+    references->RemoveLibrary(LibraryName());
+    Port::StringBase cell = LibraryName();
+    cell.MakeUpper();
+    if (loads_) references->AddLibraryUnit(LibraryName(), "vcomponents", cell.str() + "_CELL");
+    return loads_;
+  }
+  void SetFamily(const Port::StringBase& family) override {
+    log_->families.push_back(family.str());
+    log_->calls.push_back(LibraryName().str() + " family " + family.str());
+  }
+
+ protected:
+  Port::StringBase FamilyTestFile(const Port::StringBase&) const override { return {}; }
+  Port::StringBase FamilyDirectory(const Port::StringBase&) const override { return {}; }
+  Port::StringBase DefaultDirectory() const override { return {}; }
+  Port::StringBase MappingTextFor(const Port::StringBase&) const override { return {}; }
+
+ private:
+  LoaderLog* log_;
+  bool loads_;
+};
 
 // The registry tests work on names of their own; the cell libraries stay unloaded.
 class Registry : public testing::Test {
@@ -34,39 +75,33 @@ class Registry : public testing::Test {
   CLibRefs references_;
 };
 
-TEST_F(Registry, AnyPackageFindsAComponentOfTheLibraryInExactCaseOrAfterLowerCasing) {
-  EXPECT_TRUE(Has("MyLib", "*", "all", "Cell_A"));
+// A package "*..." stands for any package of the library, an item other than "all" must name the
+// component, and names match exactly or after lower-casing both sides.
+TEST_F(Registry, ComponentLookUpFollowsLibraryPackageItemAndLetterCase) {
+  struct Case {
+    const char* library;
+    const char* package;
+    const char* item;
+    const char* name;
+    bool found;
+  };
+  const Case cases[] = {
+      {"MyLib", "*", "all", "Cell_A", true},       {"MyLib", "*anything", "all", "Cell_B", true},
+      {"mylib", "*", "all", "cell_a", true},       {"MYLIB", "*", "all", "CELL_B", true},
+      {"MyLib", "*", "all", "CELL_A", true},       {"MyLib", "*", "all", "Cell_X", false},
+      {"MyLib", "*", "all", "Cell", false},        {"MyLib", "Pkg_A", "all", "Cell_A", true},
+      {"mylib", "pkg_a", "all", "CELL_A", true},   {"MyLib", "Pkg_B", "all", "Cell_A", false},
+      {"MyLib", "Pkg_C", "all", "Cell_A", false},  {"MyLib", "*", "ALL", "Cell_A", true},
+      {"MyLib", "*", "Cell_A", "Cell_A", true},    {"MyLib", "*", "cell_a", "Cell_A", true},
+      {"MyLib", "*", "Cell_B", "Cell_A", false},   {"MyLib", "Pkg_A", "everything", "Cell_A", false},
+      {"OtherLib", "*", "all", "Cell_A", false},   {"OtherLib", "Pkg_A", "all", "Cell_A", false},
+      {"", "*", "all", "Cell_A", false},           {"basecell", "*", "all", "QL_AND2", false},
+  };
+  for (const Case& c : cases) {
+    EXPECT_EQ(Has(c.library, c.package, c.item, c.name), c.found)
+        << c.library << " " << c.package << " " << c.item << " " << c.name;
+  }
   EXPECT_TRUE(Has("MyLib", "*", "all", "Cell_B", "VHDL"));
-  EXPECT_TRUE(Has("MyLib", "*anything", "all", "Cell_B"));
-  // Only the lower-case registry knows these spellings.
-  EXPECT_TRUE(Has("mylib", "*", "all", "cell_a"));
-  EXPECT_TRUE(Has("MYLIB", "*", "all", "CELL_B"));
-  EXPECT_TRUE(Has("MyLib", "*", "all", "CELL_A"));
-
-  EXPECT_FALSE(Has("MyLib", "*", "all", "Cell_X"));  // declared by another library
-  EXPECT_FALSE(Has("MyLib", "*", "all", "Cell"));
-}
-
-TEST_F(Registry, ANamedPackageMustDeclareTheComponent) {
-  EXPECT_TRUE(Has("MyLib", "Pkg_A", "all", "Cell_A"));
-  EXPECT_TRUE(Has("mylib", "pkg_a", "all", "CELL_A"));
-  EXPECT_FALSE(Has("MyLib", "Pkg_B", "all", "Cell_A"));
-  EXPECT_FALSE(Has("MyLib", "Pkg_C", "all", "Cell_A"));
-}
-
-TEST_F(Registry, AnItemOtherThanAllMustNameTheComponent) {
-  EXPECT_TRUE(Has("MyLib", "*", "ALL", "Cell_A"));
-  EXPECT_TRUE(Has("MyLib", "*", "Cell_A", "Cell_A"));
-  EXPECT_TRUE(Has("MyLib", "*", "cell_a", "Cell_A"));
-  EXPECT_FALSE(Has("MyLib", "*", "Cell_B", "Cell_A"));
-  EXPECT_FALSE(Has("MyLib", "Pkg_A", "everything", "Cell_A"));
-}
-
-TEST_F(Registry, ALibraryThatWasNeverLoadedKnowsNoComponent) {
-  EXPECT_FALSE(Has("OtherLib", "*", "all", "Cell_A"));
-  EXPECT_FALSE(Has("OtherLib", "Pkg_A", "all", "Cell_A"));
-  EXPECT_FALSE(Has("", "*", "all", "Cell_A"));
-  EXPECT_FALSE(Has("basecell", "*", "all", "QL_AND2"));  // CORVANE unset: nothing was loaded
 }
 
 TEST_F(Registry, RemovingALibraryForgetsItsComponentsInEveryCaseAndNoOtherLibrarys) {
@@ -82,15 +117,6 @@ TEST_F(Registry, RemovingALibraryForgetsItsComponentsInEveryCaseAndNoOtherLibrar
   EXPECT_TRUE(Has("MyLib", "*", "all", "Cell_C"));
   EXPECT_FALSE(Has("MyLib", "*", "all", "Cell_A"));
 }
-
-TEST_F(Registry, AnswersTheImplementationIdentityWithItself) {
-  EXPECT_EQ(Prjrep::ImplementationCast<CLibRefs>(&references_), &references_);
-  EXPECT_EQ(references_.QueryInterface(CitI::IInterface::Iid()), &references_);
-  EXPECT_NE(references_.QueryInterface(Prjrep::IRefCount::Iid()), nullptr);
-  EXPECT_EQ(references_.QueryInterface(Vad::ClassIds::CLibRefs()), nullptr);
-}
-
-// ---- loaders and families ------------------------------------------------------------------------
 
 class Families : public testing::Test {
  protected:
@@ -149,48 +175,34 @@ TEST_F(Families, ReloadingSetsTheFamilyOfTheNamedLoaderOnly) {
   EXPECT_EQ(references_.Family(), "");  // reloading one library does not set the project's family
 }
 
-// ---- the cell libraries under data/ --------------------------------------------------------------
-
-class CellLibraries : public testing::Test {
- protected:
-  ScopedCellLibraries corvane_;
-};
-
-TEST_F(CellLibraries, TheDefaultLibrariesAreLoadedOnConstruction) {
+// The cell libraries under data/: the default ones on construction, a family's own after a family
+// change (replacing the default cells), and the default ones again for a family without its own.
+TEST(CellLibraries, EachFamilyShowsItsOwnCellsAndHidesTheReplacedOnes) {
+  ScopedCellLibraries corvane;
   CLibRefs references;
-  EXPECT_TRUE(IsCell(references, "basecell", "QL_LUT4"));
-  EXPECT_TRUE(IsCell(references, "basecell", "ql_and2"));
-  EXPECT_TRUE(IsCell(references, "blockcell", "QB_RAM4K"));
-  EXPECT_TRUE(IsCell(references, "timecell", "QT_FF"));
-  EXPECT_FALSE(IsCell(references, "basecell", "QB_RAM4K"));
-  EXPECT_FALSE(IsCell(references, "basecell", "LM_LUT6"));
-}
-
-TEST_F(CellLibraries, AFamilyChangeShowsTheFamilysCellsAndHidesTheReplacedOnes) {
-  CLibRefs references;
+  // "<library>.<cell>" for every cell that must be there, "!<library>.<cell>" for one that must not.
+  const auto expectCells = [&](const char* family, const std::vector<std::string>& cells) {
+    for (const std::string& cell : cells) {
+      const bool absent = cell[0] == '!';
+      const std::size_t dot = cell.find('.');
+      const std::string library = cell.substr(absent ? 1 : 0, dot - (absent ? 1 : 0));
+      EXPECT_EQ(IsCell(references, library, cell.substr(dot + 1)), !absent) << family << " " << cell;
+    }
+  };
+  expectCells("default", {"basecell.QL_LUT4", "basecell.ql_and2", "blockcell.QB_RAM4K", "timecell.QT_FF",
+                          "!basecell.QB_RAM4K", "!basecell.LM_LUT6"});
   references.LoadLibraries("lumen");
-  EXPECT_TRUE(IsCell(references, "basecell", "LM_LUT6"));
-  EXPECT_TRUE(IsCell(references, "basecell", "QL_AND2"));
-  EXPECT_FALSE(IsCell(references, "basecell", "QL_LUT4"));
-  EXPECT_TRUE(IsCell(references, "blockcell", "LM_RAM9K"));
-  EXPECT_FALSE(IsCell(references, "blockcell", "QB_RAM4K"));
-  EXPECT_TRUE(IsCell(references, "timecell", "QT_FF"));  // lumen uses the default timing library
-
-  // A family without libraries of its own falls back to the default ones.
+  expectCells("lumen", {"basecell.LM_LUT6", "basecell.QL_AND2", "blockcell.LM_RAM9K", "timecell.QT_FF",
+                        "!basecell.QL_LUT4", "!blockcell.QB_RAM4K"});
   references.LoadLibraries("");
-  EXPECT_TRUE(IsCell(references, "basecell", "QL_LUT4"));
-  EXPECT_FALSE(IsCell(references, "basecell", "LM_LUT6"));
-  EXPECT_TRUE(IsCell(references, "blockcell", "QB_RAM4K"));
-  EXPECT_FALSE(IsCell(references, "blockcell", "LM_RAM9K"));
-}
+  expectCells("kestrel", {"basecell.QL_LUT4", "blockcell.QB_RAM4K", "!basecell.LM_LUT6", "!blockcell.LM_RAM9K"});
 
-TEST(CellLibrariesMissing, WithoutCorvaneTheLoadersFindNothing) {
   ScopedEnv noCellLibraries("CORVANE", nullptr);
-  CLibRefs references;
-  references.LoadLibraries("lumen");
+  CLibRefs without;
+  without.LoadLibraries("lumen");
   for (const char* library : {"basecell", "blockcell", "timecell"}) {
-    EXPECT_FALSE(references.HasLibraryUnit(library, "*", "all", "QL_AND2", "VHDL")) << library;
-    EXPECT_FALSE(references.HasLibraryUnit(library, "*", "all", "LM_LUT6", "VHDL")) << library;
+    EXPECT_FALSE(without.HasLibraryUnit(library, "*", "all", "QL_AND2", "VHDL")) << library;
+    EXPECT_FALSE(without.HasLibraryUnit(library, "*", "all", "LM_LUT6", "VHDL")) << library;
   }
 }
 

@@ -5,7 +5,6 @@
 #include "../parsers/vhdl/VhdlTestFixture.h"
 #include "CHdlProject.h"
 #include "CLibRefs.h"
-#include "LibRefTestSupport.h"
 
 using testing::ElementsAre;
 
@@ -29,7 +28,7 @@ const std::string kArch = " parent |Architecture||rtl|top||";
 
 class LibraryCellInstances : public vhdl_test::VhdlParse {
  protected:
-  libref_test::ScopedCellLibraries corvane_;
+  test_host::ScopedCellLibraries corvane_;
 };
 
 TEST_F(LibraryCellInstances, InstancesOfDefaultCellsAreNotRecordedButOthersAre) {

@@ -7,6 +7,7 @@
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "Port/MsgManData.h"
+#include "TestHost.h"
 
 namespace {
 
@@ -21,8 +22,7 @@ void Issue(Port_MsgMan::MsgType type, const char* text) {
 }  // namespace
 
 TEST(MsgCapture, GathersErrorsWarningsAndInformationOnlyAndSilencesTheOthers) {
-  Port_MsgCollector collector;
-  Port_MsgDispatcher::addMsgMan(&collector);
+  test_host::CollectedMessages collected;
   Port::StringBase captured;
   {
     Vad::MsgCapture capture;
@@ -33,13 +33,12 @@ TEST(MsgCapture, GathersErrorsWarningsAndInformationOnlyAndSilencesTheOthers) {
     captured = capture.CapturedText();
   }
   EXPECT_EQ(captured, "e1w2w3i4");
-  EXPECT_TRUE(collector.records().empty());
+  EXPECT_TRUE(collected.records().empty());
 
   // After the capture the managers hear messages again.
   Port_MsgManData::createObject("ProjectMgmt", "../src/Test", 1, "")->issueInfo("after");
-  ASSERT_EQ(collector.records().size(), 1u);
-  EXPECT_EQ(collector.records()[0].text, "after");
-  Port_MsgDispatcher::removeMsgMan(&collector);
+  ASSERT_EQ(collected.records().size(), 1u);
+  EXPECT_EQ(collected.records()[0].text, "after");
 }
 
 TEST(MsgCapture, RestoresEveryManagerInItsEarlierStateAndEnablesTheDefault) {
