@@ -61,13 +61,9 @@ TEST_F(DesignUnitLookup, AnArchitectureReportsTheFlagOfItsEntityInTheSameFile) {
   EXPECT_EQ(Prjrep::QueryAs<Vad::IHdlDesignUnit>(lonely)->GetUnitFlag(0, &flag), 2);
 }
 
-TEST_F(DesignUnitLookup, UnitsReachTheFileTypeAndTheHostsDesignUnitType) {
+TEST_F(DesignUnitLookup, UnitsReachTheHostsDesignUnitTypeOfTheirFileType) {
   auto file = RecordedFile(project_.Get(), "/p/counter.vhd", false);
   Vad::CHdlElement* entity = UnitOfKind(file.Get(), Vad::DbType::kEntity);
-  Prjrep::AutoRelease<Vad::IFileType> fileType;
-  ASSERT_EQ(entity->GetFileType(fileType.Out()), CitI::kOk);
-  EXPECT_EQ(fileType.Get(), FileObject(file.Get())->GetFileType().Get());
-
   Prjrep::AutoRelease<Vad::IDesignUnitType> type;
   ASSERT_EQ(Prjrep::QueryAs<Vad::IDesignUnit>(entity)->GetDesignUnitType(type.Out()), CitI::kOk);
   ASSERT_TRUE(type);
@@ -90,17 +86,6 @@ TEST_F(DesignUnitLookup, TheSameUnitIsOneOfTheSameKindKeyLibraryAndFullFileName)
   EXPECT_FALSE(entity->IsSameDesignUnit(UnitOfKind(copy.Get(), Vad::DbType::kArchitecture)));
   SetLibrary(copy.Get(), "other");
   EXPECT_FALSE(entity->IsSameDesignUnit(UnitOfKind(copy.Get(), Vad::DbType::kEntity)));
-}
-
-TEST_F(DesignUnitLookup, LibraryNameComesFromTheFilesSourceLibrary) {
-  auto file = RecordedFile(project_.Get(), "/p/counter.vhd", false);
-  Vad::CHdlElement* entity = UnitOfKind(file.Get(), Vad::DbType::kEntity);
-  Port::StringBase library;
-  ASSERT_EQ(entity->GetLibraryName(&library), CitI::kOk);
-  EXPECT_EQ(library, "work");
-  SetLibrary(file.Get(), "ip_lib");
-  ASSERT_EQ(entity->GetLibraryName(&library), CitI::kOk);
-  EXPECT_EQ(library, "ip_lib");
 }
 
 }  // namespace

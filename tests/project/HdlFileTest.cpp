@@ -2,11 +2,11 @@
 
 #include "Host/FileComponent.h"
 #include "Host/FileNameHelper.h"
-#include "TestHost.h"
 #include "Port/MsgManData.h"
 #include "Prjrep/RefCounting.h"
 #include "RavA/Factory.h"
 #include "TFactory.h"
+#include "TestHost.h"
 #include "generic.h"
 
 using namespace test_host;
@@ -94,47 +94,25 @@ class HdlFile : public PipelineTest {
   Prjrep::AutoPtr<Vad::IHdlProject> project_;
 };
 
-TEST_F(HdlFile, AnswersItsFacesAndIsItsOwnIInterface) {
-  auto file = NewBareFile();
-  ASSERT_TRUE(file);
-  CitI::IInterface* object = file->QueryInterface(CitI::IInterface::Iid());
-  EXPECT_EQ(Prjrep::ObjectCast<Vad::CHdlFile>(object), object);
-  for (const Port::XUID& id :
-       {Vad::IHdlFileV3::Iid(), Vad::IFileCompReference::Iid(), Prjrep::IRefCount::Iid(),
-        Vad::ICompAdmin::Iid(), Prjrep::IFileNameHelper::Iid(), Vad::ISourceLibraryMember::Iid()}) {
-    EXPECT_NE(file->QueryInterface(id), nullptr) << id.ToString();
-  }
-  EXPECT_EQ(file->QueryInterface(Vad::IHdlProject::Iid()), nullptr);
-  EXPECT_EQ(Prjrep::RefCountOf(file.Get()), 1u);
-  Prjrep::AutoPtr<CitI::IInterface> none;
-  EXPECT_EQ(file->Reserved8(nullptr, none.Out()), CitI::kNotImpl);
-  EXPECT_FALSE(none);
-}
-
+// Parts longer than the full path: nothing is cut past its start.
 TEST_F(HdlFile, FileNameCutsTheNameFromTheHelpersFullPath) {
   ScopedHelperFactory helpers(true);
   auto file = NewBareFile();
-  Port::StringBase directory, name;
-  FixedPartsHelper::fullPath = "C:/x/top.v";
-  FixedPartsHelper::baseName = "top";
-  FixedPartsHelper::extension = "v";
-  ASSERT_EQ(file->getFileName(&directory, &name), CitI::kOk);
-  EXPECT_EQ(directory, "C:/x/");
-  EXPECT_EQ(name, "top.v");
-
-  FixedPartsHelper::fullPath = "C:/x/Makefile";
-  FixedPartsHelper::baseName = "Makefile";
-  FixedPartsHelper::extension = "";
-  ASSERT_EQ(file->getFileName(&directory, &name), CitI::kOk);
-  EXPECT_EQ(directory, "C:/x/");
-  EXPECT_EQ(name, "Makefile");
-
-  // Parts longer than the full path: nothing is cut past its start.
-  FixedPartsHelper::fullPath = "a";
-  FixedPartsHelper::baseName = "longer";
-  ASSERT_EQ(file->getFileName(&directory, &name), CitI::kOk);
-  EXPECT_EQ(directory, "");
-  EXPECT_EQ(name, "longer");
+  const std::vector<std::vector<const char*>> cases{
+      {"C:/x/top.v", "top", "v", "C:/x/", "top.v"},
+      {"C:/x/Makefile", "Makefile", "", "C:/x/", "Makefile"},
+      {"a", "longer", "", "", "longer"},
+  };
+  for (const auto& c : cases) {
+    FixedPartsHelper::fullPath = c[0];
+    FixedPartsHelper::baseName = c[1];
+    FixedPartsHelper::extension = c[2];
+    Port::StringBase directory, name;
+    ASSERT_EQ(file->getFileName(&directory, &name), CitI::kOk);
+    EXPECT_EQ(directory, c[3]) << c[0];
+    EXPECT_EQ(name, c[4]) << c[0];
+  }
+  Port::StringBase name;
   EXPECT_EQ(file->getFileName(nullptr, &name), CitI::kInvalidArg);
 }
 
@@ -168,32 +146,33 @@ TEST_F(HdlFile, PathOperationsReachTheHelperThroughTheFilesOwnFace) {
 
 TEST_F(HdlFile, KeysFlagsAndNamesAreStoredAsGiven) {
   auto file = NewBareFile();
+  std::uint64_t key = 0, alias = 0;
   EXPECT_EQ(file->setOrderKey(0xFFFFFFFF00000001ull), CitI::kOk);
-  std::uint64_t key12 = 0, key13 = 0;
-  EXPECT_EQ(file->getOrderKey(&key12), CitI::kOk);
-  EXPECT_EQ(file->getOrderKeyAlias(&key13), CitI::kOk);
-  EXPECT_EQ(key12, 0xFFFFFFFF00000001ull);
-  EXPECT_EQ(key13, key12);
+  EXPECT_EQ(file->getOrderKey(&key), CitI::kOk);
+  EXPECT_EQ(file->getOrderKeyAlias(&alias), CitI::kOk);
+  EXPECT_EQ(key, 0xFFFFFFFF00000001ull);
+  EXPECT_EQ(alias, key);
   EXPECT_EQ(file->getOrderKey(nullptr), CitI::kOk);
-
   Port::StringBase plugin;
   EXPECT_EQ(file->setPluginName("PLUGIN_Verilog"), CitI::kOk);
   EXPECT_EQ(file->getPluginName(&plugin), CitI::kOk);
   EXPECT_EQ(plugin, "PLUGIN_Verilog");
 
-  bool flag = true;
-  auto* v3 = Prjrep::QueryAs<Vad::IHdlFileV3>(file.Get());
-  EXPECT_EQ(v3->getV3Flag(&flag), CitI::kOk);
-  EXPECT_FALSE(flag);
-  EXPECT_EQ(v3->setV3Flag(true), CitI::kOk);
-  v3->getV3Flag(&flag);
-  EXPECT_TRUE(flag);
-
-  EXPECT_EQ(file->getNeedsParse(&flag), CitI::kOk);
-  EXPECT_TRUE(flag);
+  bool v3 = true, needsParse = false;
+  auto* v3Face = Prjrep::QueryAs<Vad::IHdlFileV3>(file.Get());
+  EXPECT_EQ(v3Face->getV3Flag(&v3), CitI::kOk);
+  EXPECT_EQ(file->getNeedsParse(&needsParse), CitI::kOk);
+  EXPECT_FALSE(v3);
+  EXPECT_TRUE(needsParse);
+  EXPECT_EQ(v3Face->setV3Flag(true), CitI::kOk);
   EXPECT_EQ(file->setNeedsParse(false), CitI::kOk);
-  file->getNeedsParse(&flag);
-  EXPECT_FALSE(flag);
+  v3Face->getV3Flag(&v3);
+  file->getNeedsParse(&needsParse);
+  EXPECT_TRUE(v3);
+  EXPECT_FALSE(needsParse);
+  Prjrep::AutoPtr<CitI::IInterface> none;
+  EXPECT_EQ(file->Reserved8(nullptr, none.Out()), CitI::kNotImpl);
+  EXPECT_FALSE(none);
 }
 
 TEST_F(HdlFile, InitializeAfterCreateWantsAFileType) {

@@ -2,11 +2,9 @@
 
 #include "CHdlProject.h"
 #include "CLibRefs.h"
-#include "TestHost.h"
-#include "Port/MsgCollector.h"
-#include "Port/MsgDispatcher.h"
 #include "Port/MsgManData.h"
 #include "Prjrep/RefCounting.h"
+#include "TestHost.h"
 #include "module.h"
 
 using namespace test_host;
@@ -51,23 +49,6 @@ class HdlProject : public PipelineTest {
 
   Prjrep::AutoPtr<Vad::IHdlProject> project_;
 };
-
-TEST_F(HdlProject, AnswersItsFacesInOrderAndItsFixedSlots) {
-  CitI::IInterface* object = project_->QueryInterface(CitI::IInterface::Iid());
-  EXPECT_NE(Prjrep::ObjectCast<Vad::CHdlProject>(object), nullptr);
-  EXPECT_NE(Files(), nullptr);
-  EXPECT_NE(Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get()), nullptr);
-  EXPECT_EQ(project_->QueryInterface(Vad::IHdlFile::Iid()), nullptr);
-  EXPECT_EQ(Prjrep::RefCountOf(project_.Get()), 1u);
-  EXPECT_EQ(project_->Reserved2(), CitI::kOk);
-  EXPECT_EQ(project_->Reserved3(), CitI::kOk);
-  Prjrep::AutoPtr<CitI::IInterface> none;
-  EXPECT_EQ(project_->Reserved7(none.Out()), CitI::kNotImpl);
-  EXPECT_FALSE(none);
-  EXPECT_EQ(project_->createNewFile(nullptr), CitI::kInvalidArg);
-  EXPECT_EQ(project_->getAllDesignUnits(nullptr), CitI::kInvalidArg);
-  EXPECT_EQ(project_->getParserConfig(nullptr), CitI::kInvalidArg);
-}
 
 TEST_F(HdlProject, KeepsOneConfigurationAndMakesLooseOnesOnRequest) {
   Prjrep::AutoPtr<Vad::IHdlParserConfig> own, again, loose;
@@ -279,13 +260,10 @@ TEST_F(HdlProject, ConfigurationAndLibraryChangesBringFilesUpToDateAgain) {
 }
 
 TEST_F(HdlProject, UndefinedInstancesAreReportedAsNotDefined) {
-  Port_MsgCollector collector;
-  ASSERT_TRUE(Port_MsgDispatcher::addMsgMan(&collector));
-  auto* elaboration = Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get());
-  EXPECT_EQ(elaboration->getUndefinedInstances(), CitI::kFail);
-  Port_MsgDispatcher::removeMsgMan(&collector);
-  ASSERT_EQ(collector.records().size(), 1u);
-  const Port_MsgRecord& message = collector.records()[0];
+  test_host::CollectedMessages messages;
+  EXPECT_EQ(Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get())->getUndefinedInstances(), CitI::kFail);
+  ASSERT_EQ(messages.records().size(), 1u);
+  const Port_MsgRecord& message = messages.records()[0];
   EXPECT_EQ(message.type, Port_MsgMan::kError);
   EXPECT_EQ(message.text,
             "Not Defined:  Vad::CHdlVie::CHdlView_IHdlElaborationData::getUndefinedInstances\n");
@@ -307,13 +285,21 @@ TEST_F(HdlProject, PortsAreAskedOnlyOfThisModulesUnits) {
   EXPECT_EQ(ports, nullptr);  // the generic parser extracts no ports
 }
 
-TEST_F(HdlProject, ElaborationOperationsRefuseMissingArguments) {
+TEST_F(HdlProject, OperationsRefuseMissingArgumentsAndFixedSlotsAnswerAsBefore) {
   auto* elaboration = Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get());
   EXPECT_EQ(elaboration->getHierarchyRoot(nullptr), CitI::kInvalidArg);
   EXPECT_EQ(elaboration->getCompileOrder(nullptr, nullptr), CitI::kInvalidArg);
   Vad::IHdlFileIterator* order = nullptr;
   EXPECT_EQ(elaboration->getCompileOrderByDU(nullptr, true, &order), CitI::kFail);
   EXPECT_EQ(Prjrep::ObjectCast<Vad::CHdlProject>(project_.Get())->getElaborator(nullptr), CitI::kInvalidArg);
+  EXPECT_EQ(project_->createNewFile(nullptr), CitI::kInvalidArg);
+  EXPECT_EQ(project_->getAllDesignUnits(nullptr), CitI::kInvalidArg);
+  EXPECT_EQ(project_->getParserConfig(nullptr), CitI::kInvalidArg);
+  EXPECT_EQ(project_->Reserved2(), CitI::kOk);
+  EXPECT_EQ(project_->Reserved3(), CitI::kOk);
+  Prjrep::AutoPtr<CitI::IInterface> none;
+  EXPECT_EQ(project_->Reserved7(none.Out()), CitI::kNotImpl);
+  EXPECT_FALSE(none);
 }
 
 // Two VHDL sources of our own, read through the whole road from the host's calls to the records.

@@ -6,8 +6,8 @@
 #include "EntityInst.h"
 #include "Library.h"
 #include "PackageDecl.h"
-#include "TestHost.h"
 #include "Prjrep/TListIter.h"
+#include "TestHost.h"
 #include "Use.h"
 #include "module.h"
 
@@ -51,23 +51,23 @@ class Holder : public PipelineTest {
 };
 
 TEST_F(Holder, QueriesAnswerFromTheFileItsLibraryAndItsProjectConfiguration) {
-  Port::StringBase text;
-  holder_->GetFullPath(text);
-  EXPECT_EQ(text, "/proj/src/counter.vhd");
-  holder_->GetBaseName(text);
-  EXPECT_EQ(text, "counter");
-  holder_->GetExtension(text);
-  EXPECT_EQ(text, "vhd");
-  holder_->GetFileName(text);
-  EXPECT_EQ(text, "counter.vhd");
-  holder_->GetPluginName(text);
-  EXPECT_EQ(text, "PLUGIN_Vhdl");
-  holder_->GetLibraryName(text);
-  EXPECT_EQ(text, "work");
+  const auto answers = [&] {
+    std::vector<std::string> texts;
+    for (auto query : {&CParserConfigHolder::GetFullPath, &CParserConfigHolder::GetBaseName,
+                       &CParserConfigHolder::GetExtension, &CParserConfigHolder::GetFileName,
+                       &CParserConfigHolder::GetPluginName, &CParserConfigHolder::GetLibraryName}) {
+      Port::StringBase text = "stale";
+      (holder_->*query)(text);
+      texts.push_back(text.str());
+    }
+    return texts;
+  };
+  EXPECT_EQ(answers(), (std::vector<std::string>{"/proj/src/counter.vhd", "counter", "vhd", "counter.vhd",
+                                                 "PLUGIN_Vhdl", "work"}));
   SetLibrary(file_.Get(), "ip_lib");
-  holder_->GetLibraryName(text);
-  EXPECT_EQ(text, "ip_lib");
+  EXPECT_EQ(answers().back(), "ip_lib");
 
+  Port::StringBase text;
   SetProperty(project_.Get(), "PROP_Parse_Target", "synthesis");
   EXPECT_EQ(holder_->GetProperty("PROP_Parse_Target", text), CitI::kOk);
   EXPECT_EQ(text, "synthesis");

@@ -1,6 +1,5 @@
 #include <gtest/gtest.h>
 
-#include <optional>
 #include <typeinfo>
 
 #include "AbelParser.h"
@@ -12,13 +11,13 @@
 #include "GenericParser.h"
 #include "HrfParser.h"
 #include "Parser.h"
-#include "TestHost.h"
 #include "PluginParserFactory.h"
 #include "PlxParser.h"
 #include "Port/Env.h"
 #include "Port/MsgManData.h"
 #include "SchematicParser.h"
 #include "SingleModuleParser.h"
+#include "TestHost.h"
 #include "VerilogParser.h"
 #include "VhdlParser.h"
 #include "WaverParser.h"
@@ -29,31 +28,11 @@ using namespace test_host;
 
 namespace {
 
-constexpr const char* kSelectionVariables[] = {"CORVANE_EDIFPARSER_EX", "CORVANE_EDIFPARSER_PLX",
-                                               "CORVANE_EDIFPARSER_BASIC"};
-
-// Clears the EDIF selection variables for the test and puts them back afterwards.
-class ScopedSelectionEnvironment {
- public:
-  ScopedSelectionEnvironment() {
-    for (const char* name : kSelectionVariables) {
-      const char* value = Port_Env::GetEnv(name);
-      saved_.push_back(value ? std::optional<std::string>(value) : std::nullopt);
-      Port_Env::UnsetEnv(name);
-    }
-  }
-  ~ScopedSelectionEnvironment() {
-    for (std::size_t i = 0; i < saved_.size(); ++i) {
-      if (saved_[i]) {
-        Port_Env::SetEnv(kSelectionVariables[i], saved_[i]->c_str());
-      } else {
-        Port_Env::UnsetEnv(kSelectionVariables[i]);
-      }
-    }
-  }
-
- private:
-  std::vector<std::optional<std::string>> saved_;
+// The EDIF selection variables, cleared for each test and put back afterwards.
+struct ScopedSelectionEnvironment {
+  ScopedEnv ex{"CORVANE_EDIFPARSER_EX", nullptr};
+  ScopedEnv plx{"CORVANE_EDIFPARSER_PLX", nullptr};
+  ScopedEnv basic{"CORVANE_EDIFPARSER_BASIC", nullptr};
 };
 
 class ParserFramework : public PipelineTest {
@@ -91,18 +70,25 @@ void ExpectParser(const std::unique_ptr<Vad::Parser>& parser, std::string_view p
 }
 
 TEST_F(ParserFramework, EveryPluginNameOfTheTableGetsItsParserWithoutWarning) {
+  const std::pair<const char*, const std::type_info*> plugins[] = {
+      {"PLUGIN_Vhdl", &typeid(Vad::VhdlParser)},
+      {"PLUGIN_Verilog", &typeid(Vad::VerilogParser)},
+      {"PLUGIN_Hrf", &typeid(Vad::HrfParser)},
+      {"PLUGIN_SingleModule", &typeid(Vad::SingleModuleParser)},
+      {"PLUGIN_AssocModule", &typeid(Vad::AssocModuleParser)},
+      {"PLUGIN_Abel", &typeid(Vad::AbelParser)},
+      {"PLUGIN_AbelVector", &typeid(Vad::AbelVectorParser)},
+      {"PLUGIN_Schematic", &typeid(Vad::SchematicParser)},
+      {"PLUGIN_Waver", &typeid(Vad::WaverParser)},
+      {"PLUGIN_Fsmdraw", &typeid(Vad::SingleModuleParser)},
+      {"PLUGIN_General", &typeid(Vad::GenericParser)},
+  };
   Port_DebugCapture debug;
-  ExpectParser<Vad::VhdlParser>(ParserFor("PLUGIN_Vhdl"), "PLUGIN_Vhdl");
-  ExpectParser<Vad::VerilogParser>(ParserFor("PLUGIN_Verilog"), "PLUGIN_Verilog");
-  ExpectParser<Vad::HrfParser>(ParserFor("PLUGIN_Hrf"), "PLUGIN_Hrf");
-  ExpectParser<Vad::SingleModuleParser>(ParserFor("PLUGIN_SingleModule"), "PLUGIN_SingleModule");
-  ExpectParser<Vad::AssocModuleParser>(ParserFor("PLUGIN_AssocModule"), "PLUGIN_AssocModule");
-  ExpectParser<Vad::AbelParser>(ParserFor("PLUGIN_Abel"), "PLUGIN_Abel");
-  ExpectParser<Vad::AbelVectorParser>(ParserFor("PLUGIN_AbelVector"), "PLUGIN_AbelVector");
-  ExpectParser<Vad::SchematicParser>(ParserFor("PLUGIN_Schematic"), "PLUGIN_Schematic");
-  ExpectParser<Vad::WaverParser>(ParserFor("PLUGIN_Waver"), "PLUGIN_Waver");
-  ExpectParser<Vad::SingleModuleParser>(ParserFor("PLUGIN_Fsmdraw"), "PLUGIN_Fsmdraw");
-  ExpectParser<Vad::GenericParser>(ParserFor("PLUGIN_General"), "PLUGIN_General");
+  for (const auto& [plugin, type] : plugins) {
+    auto parser = ParserFor(plugin);
+    ASSERT_NE(parser, nullptr) << plugin;
+    EXPECT_EQ(typeid(*parser), *type) << plugin;
+  }
   EXPECT_EQ(debug.text(), "");
 }
 
