@@ -29,28 +29,30 @@ std::vector<Port::XUID> Join(std::vector<Port::XUID> faces, const std::vector<Po
 const Port::XUID kUnknown{std::string_view("{0F0F0F0F-1234-4567-89AB-0123456789AB}")};
 
 std::vector<ClassFaces> Table() {
-  const std::vector<Port::XUID> record{CitI::IInterface::Iid(),  Prjrep::IRefCount::Iid(),
-                                       Ids::ImplementationIdentity(), Ids::IEventSender(),
-                                       Ids::IHdlDesignUnit(),    Ids::IHdlGraphicsPosition(),
-                                       Ids::IHdlClientData(),    Ids::IHdlTextPosition(),
-                                       Ids::IName(),             Ids::IHdlElement(),
-                                       Ids::IHdlDUProperties(),  Ids::IInstanceData(),
-                                       Ids::ITimestamp(),        Ids::IDesignUnit(),
-                                       Ids::IPersist()};
+  const std::vector<Port::XUID> record{
+      CitI::IInterface::Iid(), Prjrep::IRefCount::Iid(), Ids::ImplementationIdentity(),
+      Ids::IEventSender(),     Ids::IHdlDesignUnit(),    Ids::IHdlGraphicsPosition(),
+      Ids::IHdlClientData(),   Ids::IHdlTextPosition(),  Ids::IName(),
+      Ids::IHdlElement(),      Ids::IHdlDUProperties(),  Ids::IInstanceData(),
+      Ids::ITimestamp(),       Ids::IDesignUnit(),       Ids::IPersist()};
   const std::vector<Port::XUID> vhdlUnit = Join(record, {Ids::IHdlUseClauses()});
   return {
-      {"{10977847-7D8D-46e9-AC19-7B0EED3C4657}", "CHdlProject",
+      {"{10977847-7D8D-46e9-AC19-7B0EED3C4657}",
+       "CHdlProject",
        {CitI::IInterface::Iid(), Prjrep::IRefCount::Iid(), Ids::IHdlProject(), Ids::IHdlFileSet(),
         Ids::IHdlElaborationData()}},
-      {"{E16DACC1-8C84-40e5-9BD1-6CB03EFBC730}", "CHdlFile",
+      {"{E16DACC1-8C84-40e5-9BD1-6CB03EFBC730}",
+       "CHdlFile",
        {CitI::IInterface::Iid(), Prjrep::IRefCount::Iid(), Ids::IHdlFile(), Ids::IHdlFileV3(),
         Ids::IFileCompReference(), Ids::ICompAdmin(), Ids::IFileNameHelper(), Ids::ISourceLibraryMember(),
         Ids::IHdlParseResults()}},
-      {"{FAA048F9-8C24-49c7-85D3-F06A29DD8991}", "CParserConfigHolder",
+      {"{FAA048F9-8C24-49c7-85D3-F06A29DD8991}",
+       "CParserConfigHolder",
        {CitI::IInterface::Iid(), Prjrep::IRefCount::Iid(), Vad::ClassIds::CParserConfigHolder()}},
-      {"{4A0A6551-1ACD-4fc7-8920-FD1FEDBAB94F}", "CParserConfigBase",
-       {CitI::IInterface::Iid(), Prjrep::IRefCount::Iid(), Ids::IHdlParserConfig(), Ids::IPropertyInstanceSet(),
-        Vad::ClassIds::CParserConfigBase()}},
+      {"{4A0A6551-1ACD-4fc7-8920-FD1FEDBAB94F}",
+       "CParserConfigBase",
+       {CitI::IInterface::Iid(), Prjrep::IRefCount::Iid(), Ids::IHdlParserConfig(),
+        Ids::IPropertyInstanceSet(), Vad::ClassIds::CParserConfigBase()}},
       {"{B455570A-EED2-4698-A482-28044A3997D1}", "Arch", vhdlUnit},
       {"{E98AEF7C-E10B-484f-A7CD-963EDE1BF7D9}", "CompInst", record},
       {"{E2CC8569-A0F6-4aca-AFBE-31FF458253C6}", "EntityDecl", vhdlUnit},
@@ -60,22 +62,29 @@ std::vector<ClassFaces> Table() {
       {"{11A2A34D-836F-4a38-919B-B48596CFB15F}", "PackageDecl", vhdlUnit},
       {"{57990C42-7A4B-434b-A0D2-7F23B7AD3A05}", "Use", record},
       {"{BD090D6C-F645-4865-81F9-5449CC51FBC8}", "module", record},
-      {"{9EF5D01C-AD83-45f9-BA57-9BCDCACF20A0}", "CNetListNode",
+      {"{9EF5D01C-AD83-45f9-BA57-9BCDCACF20A0}",
+       "CNetListNode",
        {CitI::IInterface::Iid(), Prjrep::IRefCount::Iid(), Prjrep::IRefCountV1::Iid(),
         Ids::ImplementationIdentity(), Ids::IHdlNetListNode(), Ids::IHdlNetListNodeInternal(),
         Ids::IHdlPartitionData(), Ids::IInstanceData(), UtilI::kTclCollectableId}},
-      {"{8F9FBAB9-1703-4d81-B0DC-173EF14A6BF7}", "CElaborator",
+      {"{8F9FBAB9-1703-4d81-B0DC-173EF14A6BF7}",
+       "CElaborator",
        {CitI::IInterface::Iid(), Prjrep::IRefCount::Iid(), Prjrep::IRefCountV1::Iid()}},
       {"{808B1C11-0D94-4e59-BFC8-767D8F5A6B13}", "generic", record},
-      {"{C54A64FB-ED25-4d16-89FE-A274D9CB3E60}", "CLibRefs",
+      {"{C54A64FB-ED25-4d16-89FE-A274D9CB3E60}",
+       "CLibRefs",
        {CitI::IInterface::Iid(), Prjrep::IRefCount::Iid(), Ids::ImplementationIdentity()}},
   };
 }
 
 // Every identifier some class answers, the class identifiers, and some that none answers.
 std::vector<Port::XUID> Probes(const std::vector<ClassFaces>& table) {
-  std::vector<Port::XUID> probes{CitI::IFactory::Iid(), CommonI::IRefCount::Iid(), Ids::IHdlPort(),
-                                 Ids::IHdlDesignUnitSet(), Ids::ISourceLibrary(), kUnknown,
+  std::vector<Port::XUID> probes{CitI::IFactory::Iid(),
+                                 CommonI::IRefCount::Iid(),
+                                 Ids::IHdlPort(),
+                                 Ids::IHdlDesignUnitSet(),
+                                 Ids::ISourceLibrary(),
+                                 kUnknown,
                                  Port::XUID(Ids::IHdlElement().High(), 0)};
   for (const ClassFaces& entry : table) {
     probes.push_back(Port::XUID(std::string_view(entry.classId)));
@@ -119,7 +128,8 @@ TEST_F(Conformance, EveryClassAnswersExactlyItsFacesSymmetricallyAndWithoutTakin
   const std::vector<Port::XUID> probes = Probes(table);
   for (const ClassFaces& entry : table) {
     SCOPED_TRACE(entry.name);
-    Owned<CitI::IInterface> object(RavA::Factory::CreateInstance(Port::XUID(std::string_view(entry.classId))));
+    Owned<CitI::IInterface> object(
+        RavA::Factory::CreateInstance(Port::XUID(std::string_view(entry.classId))));
     ASSERT_TRUE(object);
     ASSERT_EQ(Prjrep::RefCountOf(object.Get()), 1u);
     for (const Port::XUID& probe : probes) {
@@ -137,6 +147,12 @@ TEST_F(Conformance, EveryClassAnswersExactlyItsFacesSymmetricallyAndWithoutTakin
       EXPECT_EQ(face->QueryInterface(kUnknown), nullptr) << id.ToString();
     }
     EXPECT_TRUE(FacesAreDistinct(object.Get(), entry.faces));
+    if (Listed(entry.faces, Ids::ImplementationIdentity())) {
+      // The implementation itself: the object, or for a net-list node its node face.
+      const Port::XUID same =
+          entry.name == std::string("CNetListNode") ? Ids::IHdlNetListNode() : CitI::IInterface::Iid();
+      EXPECT_EQ(object->QueryInterface(Ids::ImplementationIdentity()), object->QueryInterface(same));
+    }
     EXPECT_EQ(Prjrep::RefCountOf(object.Get()), 1u) << "queries take no reference";
   }
 }
