@@ -6,8 +6,8 @@
 
 #include "CBasecellLoader.h"
 #include "CBlockcellLoader.h"
-#include "CTimecellLoader.h"
 #include "CLibRefs.h"
+#include "CTimecellLoader.h"
 #include "ScopedTempDir.h"
 #include "TestHost.h"
 
@@ -27,24 +27,20 @@ std::vector<std::string> Entries(const std::string& dir) {
 
 std::string Platform() { return Port_Env::GetPlatformPath(); }
 
+// "<name>=$CORVANE/<folder>/<name>" for each name, one a line.
+std::string Mappings(const std::string& folder, std::initializer_list<const char*> names) {
+  std::string text;
+  for (const char* name : names) text += std::string(name) + "=$CORVANE/" + folder + "/" + name + "\n";
+  return text;
+}
+
 TEST(MappingFiles, TheTimingLibraryIsReadThroughTheSimulationMappingUnderTheFixedFolder) {
   Vad::CTimecellLoader loader;
   EXPECT_STREQ(loader.MappingFileName(), "corvanesim.ini");
   const std::string expected =
-      "std=$CORVANE/vhdl/hdp/nt/std\n"
-      "ieee=$CORVANE/vhdl/hdp/nt/ieee\n"
-      "synopsys=$CORVANE/vhdl/hdp/nt/synopsys\n"
-      "timecell=$CORVANE/vhdl/hdp/nt/timecell\n"
-      "basecell=$CORVANE/vhdl/hdp/nt/basecell\n"
-      "qlprim=$CORVANE/vhdl/hdp/nt/qlprim\n"
-      "qlmacro=$CORVANE/vhdl/hdp/nt/qlmacro\n"
-      "qlio=$CORVANE/vhdl/hdp/nt/qlio\n"
-      "corvanecorelib=$CORVANE/vhdl/hdp/nt/corvanecorelib\n"
-      "timecell_ver=$CORVANE/verilog/hdp/nt/timecell_ver\n"
-      "basecell_ver=$CORVANE/verilog/hdp/nt/basecell_ver\n"
-      "qlprim_ver=$CORVANE/verilog/hdp/nt/qlprim_ver\n"
-      "qlmacro_ver=$CORVANE/verilog/hdp/nt/qlmacro_ver\n"
-      "qlio_ver=$CORVANE/verilog/hdp/nt/qlio_ver\n";
+      Mappings("vhdl/hdp/nt", {"std", "ieee", "synopsys", "timecell", "basecell", "qlprim", "qlmacro", "qlio",
+                               "corvanecorelib"}) +
+      Mappings("verilog/hdp/nt", {"timecell_ver", "basecell_ver", "qlprim_ver", "qlmacro_ver", "qlio_ver"});
   EXPECT_EQ(loader.MappingText(), expected);
 
   ScopedCellLibraries corvane;
@@ -53,41 +49,28 @@ TEST(MappingFiles, TheTimingLibraryIsReadThroughTheSimulationMappingUnderTheFixe
   EXPECT_EQ(loader.MappingText(), expected);
 }
 
-TEST(MappingFiles, TheUnifiedLibraryMapsTheFamilysDirectoryOrTheDefaultOne) {
-  Vad::CBasecellLoader loader;
-  EXPECT_STREQ(loader.MappingFileName(), "chdp.ini");
-  const std::string furtherLibraries =
-      "qlprim=$CORVANE/vhdl/syn/qlprim\n"
-      "qlmacro=$CORVANE/vhdl/syn/qlmacro\n"
-      "qlio=$CORVANE/vhdl/syn/qlio\n"
-      "basecell_ver=$CORVANE/verilog/syn/basecell_ver\n"
-      "blockcell_ver=$CORVANE/verilog/syn/blockcell_ver\n";
-  const std::string head = "std=$CORVANE/vhdl/syn/std\nieee=$CORVANE/vhdl/syn/ieee\n";
-  EXPECT_EQ(loader.MappingText(), head + "basecell=$CORVANE/vhdl/syn/basecell\n" + furtherLibraries);
+// The unified library maps the family's directory, or the default one for a family without a test
+// file; the macro library maps its own directory and the default unified library.
+TEST(MappingFiles, TheSynthesisLibrariesMapTheFamilysDirectoryOrTheDefaultOne) {
+  const std::string head = Mappings("vhdl/syn", {"std", "ieee"});
+  const std::string tail = Mappings("vhdl/syn", {"qlprim", "qlmacro", "qlio"}) +
+                           Mappings("verilog/syn", {"basecell_ver", "blockcell_ver"});
+  const std::string basecell = "basecell=$CORVANE/vhdl/syn/basecell\n";
+  Vad::CBasecellLoader unified;
+  EXPECT_STREQ(unified.MappingFileName(), "chdp.ini");
+  EXPECT_EQ(unified.MappingText(), head + basecell + tail);
+  unified.SetFamily("lumen");
+  EXPECT_EQ(unified.LibraryDirectory(), "$CORVANE/lumen/vhdl/syn/basecell");
+  EXPECT_EQ(unified.MappingText(), head + "basecell=$CORVANE/lumen/vhdl/syn/basecell\n" + tail);
+  unified.SetFamily("kestrel");
+  EXPECT_EQ(unified.LibraryDirectory(), "");
+  EXPECT_EQ(unified.MappingText(), head + basecell + tail);
 
-  loader.SetFamily("lumen");
-  EXPECT_EQ(loader.LibraryDirectory(), "$CORVANE/lumen/vhdl/syn/basecell");
-  EXPECT_EQ(loader.MappingText(), head + "basecell=$CORVANE/lumen/vhdl/syn/basecell\n" + furtherLibraries);
-
-  loader.SetFamily("kestrel");  // no test file: back to the default directory
-  EXPECT_EQ(loader.LibraryDirectory(), "");
-  EXPECT_EQ(loader.MappingText(), head + "basecell=$CORVANE/vhdl/syn/basecell\n" + furtherLibraries);
-}
-
-TEST(MappingFiles, TheMacroLibraryMapsItsDirectoryAndTheDefaultUnifiedLibrary) {
-  Vad::CBlockcellLoader loader;
-  EXPECT_STREQ(loader.MappingFileName(), "chdp.ini");
-  const std::string tail =
-      "basecell=$CORVANE/vhdl/syn/basecell\n"
-      "qlprim=$CORVANE/vhdl/syn/qlprim\n"
-      "qlmacro=$CORVANE/vhdl/syn/qlmacro\n"
-      "qlio=$CORVANE/vhdl/syn/qlio\n"
-      "basecell_ver=$CORVANE/verilog/syn/basecell_ver\n"
-      "blockcell_ver=$CORVANE/verilog/syn/blockcell_ver\n";
-  const std::string head = "std=$CORVANE/vhdl/syn/std\nieee=$CORVANE/vhdl/syn/ieee\n";
-  EXPECT_EQ(loader.MappingText(), head + "blockcell=$CORVANE/vhdl/syn/blockcell\n" + tail);
-  loader.SetFamily("lumen");
-  EXPECT_EQ(loader.MappingText(), head + "blockcell=$CORVANE/lumen/vhdl/syn/blockcell\n" + tail);
+  Vad::CBlockcellLoader macros;
+  EXPECT_STREQ(macros.MappingFileName(), "chdp.ini");
+  EXPECT_EQ(macros.MappingText(), head + "blockcell=$CORVANE/vhdl/syn/blockcell\n" + basecell + tail);
+  macros.SetFamily("lumen");
+  EXPECT_EQ(macros.MappingText(), head + "blockcell=$CORVANE/lumen/vhdl/syn/blockcell\n" + basecell + tail);
 }
 
 // Each test loads from a working directory of its own, with temporary directories made in a

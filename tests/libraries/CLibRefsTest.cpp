@@ -86,16 +86,16 @@ TEST_F(Registry, ComponentLookUpFollowsLibraryPackageItemAndLetterCase) {
     bool found;
   };
   const Case cases[] = {
-      {"MyLib", "*", "all", "Cell_A", true},       {"MyLib", "*anything", "all", "Cell_B", true},
-      {"mylib", "*", "all", "cell_a", true},       {"MYLIB", "*", "all", "CELL_B", true},
-      {"MyLib", "*", "all", "CELL_A", true},       {"MyLib", "*", "all", "Cell_X", false},
-      {"MyLib", "*", "all", "Cell", false},        {"MyLib", "Pkg_A", "all", "Cell_A", true},
-      {"mylib", "pkg_a", "all", "CELL_A", true},   {"MyLib", "Pkg_B", "all", "Cell_A", false},
-      {"MyLib", "Pkg_C", "all", "Cell_A", false},  {"MyLib", "*", "ALL", "Cell_A", true},
-      {"MyLib", "*", "Cell_A", "Cell_A", true},    {"MyLib", "*", "cell_a", "Cell_A", true},
-      {"MyLib", "*", "Cell_B", "Cell_A", false},   {"MyLib", "Pkg_A", "everything", "Cell_A", false},
-      {"OtherLib", "*", "all", "Cell_A", false},   {"OtherLib", "Pkg_A", "all", "Cell_A", false},
-      {"", "*", "all", "Cell_A", false},           {"basecell", "*", "all", "QL_AND2", false},
+      {"MyLib", "*", "all", "Cell_A", true},      {"MyLib", "*anything", "all", "Cell_B", true},
+      {"mylib", "*", "all", "cell_a", true},      {"MYLIB", "*", "all", "CELL_B", true},
+      {"MyLib", "*", "all", "CELL_A", true},      {"MyLib", "*", "all", "Cell_X", false},
+      {"MyLib", "*", "all", "Cell", false},       {"MyLib", "Pkg_A", "all", "Cell_A", true},
+      {"mylib", "pkg_a", "all", "CELL_A", true},  {"MyLib", "Pkg_B", "all", "Cell_A", false},
+      {"MyLib", "Pkg_C", "all", "Cell_A", false}, {"MyLib", "*", "ALL", "Cell_A", true},
+      {"MyLib", "*", "Cell_A", "Cell_A", true},   {"MyLib", "*", "cell_a", "Cell_A", true},
+      {"MyLib", "*", "Cell_B", "Cell_A", false},  {"MyLib", "Pkg_A", "everything", "Cell_A", false},
+      {"OtherLib", "*", "all", "Cell_A", false},  {"OtherLib", "Pkg_A", "all", "Cell_A", false},
+      {"", "*", "all", "Cell_A", false},          {"basecell", "*", "all", "QL_AND2", false},
   };
   for (const Case& c : cases) {
     EXPECT_EQ(Has(c.library, c.package, c.item, c.name), c.found)
@@ -195,7 +195,8 @@ TEST(CellLibraries, EachFamilyShowsItsOwnCellsAndHidesTheReplacedOnes) {
   expectCells("lumen", {"basecell.LM_LUT6", "basecell.QL_AND2", "blockcell.LM_RAM9K", "timecell.QT_FF",
                         "!basecell.QL_LUT4", "!blockcell.QB_RAM4K"});
   references.LoadLibraries("");
-  expectCells("kestrel", {"basecell.QL_LUT4", "blockcell.QB_RAM4K", "!basecell.LM_LUT6", "!blockcell.LM_RAM9K"});
+  expectCells("kestrel",
+              {"basecell.QL_LUT4", "blockcell.QB_RAM4K", "!basecell.LM_LUT6", "!blockcell.LM_RAM9K"});
 
   ScopedEnv noCellLibraries("CORVANE", nullptr);
   CLibRefs without;
