@@ -140,7 +140,8 @@ TEST(CHdlElement, PropertiesRefuseEmptyKeysReplaceValuesAndKeepByteOrder) {
   EXPECT_EQ(properties->RemoveProperty(""), CitI::kFail);
   EXPECT_EQ(properties->GetProperty("PARTITION", nullptr), CitI::kInvalidArg);
 
-  for (const char* key : {"PARTITION", "PARTITION", "ab", "a"}) EXPECT_EQ(properties->SetProperty(key, key), CitI::kOk);
+  for (const char* key : {"PARTITION", "PARTITION", "ab", "a"})
+    EXPECT_EQ(properties->SetProperty(key, key), CitI::kOk);
   EXPECT_EQ(properties->SetProperty("PARTITION", "p2"), CitI::kOk);
   value = "stale";
   EXPECT_EQ(properties->GetProperty("PARTITION", &value), CitI::kOk);
@@ -263,9 +264,10 @@ TEST_F(Element, LibraryNameComesFromTheSourceFilesLibrary) {
 
   Owned<NamelessLibrary> nameless(new NamelessLibrary);
   QueryAs<Vad::ISourceLibraryMember>(file_.Get())->setSourceLibrary(nameless.Get());
-  EXPECT_EQ(DebugTextOf([&] { EXPECT_EQ(entity_->GetLibraryName(&name), CitI::kFail); }),
-            "Error - CHdlElement::GetLibraryName(): Unable to get the IName interface from the ISourceLibrary "
-            "component.\n");
+  EXPECT_EQ(
+      DebugTextOf([&] { EXPECT_EQ(entity_->GetLibraryName(&name), CitI::kFail); }),
+      "Error - CHdlElement::GetLibraryName(): Unable to get the IName interface from the ISourceLibrary "
+      "component.\n");
   EXPECT_EQ(name, "");
   EXPECT_EQ(entity_->GetLibraryName(nullptr), CitI::kInvalidArg);
 }
@@ -329,8 +331,9 @@ TEST_F(Element, DesignUnitFaceKeepsHostTextAndHandsOutTheBindingSet) {
   EXPECT_EQ(designUnit->GetDesignUnitView(&view), CitI::kNotImpl);
   EXPECT_EQ(view, nullptr);
 
-  EXPECT_EQ(DebugTextOf([&] { EXPECT_EQ(designUnit->GetOutboundTransformBindings(nullptr), CitI::kNullOut); }),
-            "ERROR: DesignUnit::GetOutboundTransformBindings - Invalid Parameter.\n");
+  EXPECT_EQ(
+      DebugTextOf([&] { EXPECT_EQ(designUnit->GetOutboundTransformBindings(nullptr), CitI::kNullOut); }),
+      "ERROR: DesignUnit::GetOutboundTransformBindings - Invalid Parameter.\n");
   Owned<Vad::ITransformBindingInstanceSet> bindings;
   EXPECT_EQ(designUnit->GetOutboundTransformBindings(bindings.Out()), CitI::kOk);
   ASSERT_TRUE(bindings);

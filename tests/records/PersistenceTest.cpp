@@ -50,7 +50,8 @@ struct Design {
       Port::StringBase key;
       (records->ComposeStoreKey(key), ...);
     };
-    compose(library, entity, architecture, component, instance, package, body, use, width, top, moduleInstance);
+    compose(library, entity, architecture, component, instance, package, body, use, width, top,
+            moduleInstance);
     std::uint32_t seed = 1;
     for (Vad::CHdlElement* element : All()) Decorate(*element, seed++);
     // A reference back to a record written before, and one to a record written after.
@@ -127,7 +128,8 @@ std::string ArchivedFieldsOf(Vad::CHdlElement* record, std::int32_t version) {
   return text + (record->IsInGenerate() && version >= 9 ? " generate" : "");
 }
 
-class RecordPersistence : public test_host::RegisteredModule, public testing::WithParamInterface<std::int32_t> {
+class RecordPersistence : public test_host::RegisteredModule,
+                          public testing::WithParamInterface<std::int32_t> {
  protected:
   std::vector<Owned<CitI::IInterface>> SaveAndLoad(const Design& design) {
     ScopedTempDir dir;
@@ -139,7 +141,8 @@ class RecordPersistence : public test_host::RegisteredModule, public testing::Wi
       for (Vad::CHdlElement* root : design.Roots())
         EXPECT_EQ(writing->WriteObject(QueryAs<Prjrep::IPersist>(root)), CitI::kOk) << root->GetName().str();
     });
-    EXPECT_EQ(written.size(), design.Roots().size() * std::string("Error -- m_pParent can't be null\n").size())
+    EXPECT_EQ(written.size(),
+              design.Roots().size() * std::string("Error -- m_pParent can't be null\n").size())
         << "each parentless root is reported once";
     EXPECT_EQ(Prjrep::ObjectCast<Port::FileArchive>(writing.Get())->Close(), CitI::kOk);
 
@@ -176,14 +179,14 @@ TEST_P(RecordPersistence, EveryRecordClassComesBackWithItsFieldsAndLinks) {
   for (auto& root : roots) loaded.push_back(Prjrep::ImplementationCast<Vad::CHdlElement>(root.Get()));
   // Children come back owned by their new parents, with the back pointers set.
   const std::vector<Vad::CHdlElement*> loadedChildren{ChildOf(loaded[2], 0), ChildOf(loaded[2], 1),
-                                                     ChildOf(loaded[7], 0)};
+                                                      ChildOf(loaded[7], 0)};
   ASSERT_EQ(ChildOf(loaded[2], 2), nullptr);
   ASSERT_EQ(ChildOf(loaded[7], 1), nullptr);
   loaded.insert(loaded.end(), loadedChildren.begin(), loadedChildren.end());
   const std::vector<Vad::CHdlElement*> all = saved.All();
-  const char* const classFields[] = {"work",       "counter", "counter|rtl||", "decl|types",
-                                     "body|types", "ieee|std_logic_1164|all",    "WIDTH",
-                                     "top",        "u1|adder", "u2|adder||fast", "u3|adder"};
+  const char* const classFields[] = {
+      "work",  "counter", "counter|rtl||", "decl|types",     "body|types", "ieee|std_logic_1164|all",
+      "WIDTH", "top",     "u1|adder",      "u2|adder||fast", "u3|adder"};
   for (std::size_t i = 0; i < all.size(); ++i) {
     ASSERT_NE(loaded[i], nullptr) << i;
     EXPECT_NE(loaded[i], all[i]);

@@ -72,13 +72,17 @@ class ScriptArchive final : public Prjrep::IArchive {
     *object = nullptr;
     return Take("ReadObjectRef", refs_, object);
   }
-  CitI::Result WriteInt(std::int32_t value) override { return Put("WriteInt " + std::to_string(value), ints_, value); }
+  CitI::Result WriteInt(std::int32_t value) override {
+    return Put("WriteInt " + std::to_string(value), ints_, value);
+  }
   CitI::Result ReadInt(std::int32_t* value) override { return Take("ReadInt", ints_, value); }
   CitI::Result WriteInt64(std::int64_t value) override {
     return Put("WriteInt64 " + std::to_string(value), ints_, value);
   }
   CitI::Result ReadInt64(std::int64_t* value) override { return Take("ReadInt64", ints_, value); }
-  CitI::Result WriteBool(bool value) override { return Put(value ? "WriteBool 1" : "WriteBool 0", ints_, value); }
+  CitI::Result WriteBool(bool value) override {
+    return Put(value ? "WriteBool 1" : "WriteBool 0", ints_, value);
+  }
   CitI::Result ReadBool(bool* value) override { return Take("ReadBool", ints_, value); }
   CitI::Result WriteString(const Port::StringBase& value) override {
     return Put("WriteString " + value.str(), strings_, value);
@@ -166,17 +170,21 @@ template <class Record, class... Args>
 RecordCase Of(const char* classId, std::uint32_t type, const char* designUnitKey, const char* storeKey,
               Args... args) {
   const bool instance = type == Vad::DbType::kComponentInstantiation;
-  return {classId, type,
+  return {classId,
+          type,
           [=](Vad::Arch* parent, std::string* key) {
             return Keyed(new Record(args..., instance ? parent : nullptr), key);
           },
-          [] { return new Record; }, designUnitKey, storeKey};
+          [] { return new Record; },
+          designUnitKey,
+          storeKey};
 }
 
 const std::vector<RecordCase>& RecordCases() {
   using namespace Vad;
   static const std::vector<RecordCase> cases{
-      Of<Library>("{7B140123-F848-4cb3-9125-64CC03A8200D}", DbType::kLibrary, "Library", "||Library|work|", "work"),
+      Of<Library>("{7B140123-F848-4cb3-9125-64CC03A8200D}", DbType::kLibrary, "Library", "||Library|work|",
+                  "work"),
       Of<EntityDecl>("{E2CC8569-A0F6-4aca-AFBE-31FF458253C6}", DbType::kEntity, "Entity|counter",
                      "|Entity||counter", "counter"),
       Of<Arch>("{B455570A-EED2-4698-A482-28044A3997D1}", DbType::kArchitecture, "Architecture|counter|rtl",
@@ -189,7 +197,8 @@ const std::vector<RecordCase>& RecordCases() {
               "ieee.std_logic_1164.all"),
       Of<generic>("{808B1C11-0D94-4e59-BFC8-767D8F5A6B13}", DbType::kGeneric, "Generic|WIDTH",
                   "|Generic||WIDTH", "WIDTH"),
-      Of<module>("{BD090D6C-F645-4865-81F9-5449CC51FBC8}", DbType::kModule, "Module|top", "|Module||top", "top"),
+      Of<module>("{BD090D6C-F645-4865-81F9-5449CC51FBC8}", DbType::kModule, "Module|top", "|Module||top",
+                 "top"),
       Of<CompInst>("{E98AEF7C-E10B-484f-A7CD-963EDE1BF7D9}", DbType::kComponentInstantiation,
                    "ComponentInstantiation", "|ComponentInstantiation||counter|rtl|u1|adder|", "u1", "adder"),
       {"{AF9C1056-1ED5-46d1-BD53-C559888FA192}", DbType::kEntityInstantiation,
@@ -200,7 +209,8 @@ const std::vector<RecordCase>& RecordCases() {
          instance->SetArchitectureName("fast");
          return Keyed(instance, key);
        },
-       [] { return new EntityInst; }, "EntityInstantiation", "|EntityInstantiation||counter|rtl|u2|adder||fast"},
+       [] { return new EntityInst; }, "EntityInstantiation",
+       "|EntityInstantiation||counter|rtl|u2|adder||fast"},
   };
   return cases;
 }
