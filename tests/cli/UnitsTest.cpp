@@ -36,7 +36,8 @@ std::vector<std::string> UnitKeys(std::vector<std::string> args, const std::stri
   CliResult result = RunQuillon(CliRun{args, workDir, {}});
   EXPECT_EQ(result.status, status) << result.err;
   std::vector<std::string> keys;
-  for (const auto& file : nlohmann::json::parse(result.out)["files"])
+  const nlohmann::json answer = nlohmann::json::parse(result.out);
+  for (const auto& file : answer["files"])
     for (const auto& unit : file["units"]) keys.push_back(unit["key"]);
   return keys;
 }
