@@ -1,11 +1,15 @@
 #include "CliRun.h"
 
 #include <fcntl.h>
+#include <gtest/gtest.h>
 #include <spawn.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <cstdio>
+#include <cstdlib>
 #include <cstring>
+#include <filesystem>
 #include <fstream>
 #include <iterator>
 #include <sstream>
@@ -15,11 +19,6 @@ extern char** environ;
 namespace cli_test {
 
 namespace {
-
-std::string ReadFile(const std::string& path) {
-  std::ifstream in(path, std::ios::binary);
-  return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
-}
 
 std::vector<std::string> EnvironmentWith(const std::vector<std::pair<std::string, std::string>>& added) {
   std::vector<std::string> entries;
@@ -100,8 +99,8 @@ CliResult RunProgram(const std::string& program, const CliRun& run) {
   while (waitpid(child, &waitStatus, 0) < 0 && errno == EINTR) {
   }
   result.status = WIFEXITED(waitStatus) ? WEXITSTATUS(waitStatus) : 128 + WTERMSIG(waitStatus);
-  result.out = ReadFile(outPath);
-  result.err = terminal >= 0 ? ReadTerminal(master) : ReadFile(errPath);
+  result.out = ReadText(outPath);
+  result.err = terminal >= 0 ? ReadTerminal(master) : ReadText(errPath);
   if (master >= 0) close(master);
   return result;
 }
@@ -112,6 +111,67 @@ ScopedTextFile::ScopedTextFile(std::string_view text, std::string_view name) : p
 
 std::string DataDir() { return std::string(QUILLON_TEST_DATA_DIR) + "/cli"; }
 std::string DataPath(const std::string& name) { return DataDir() + "/" + name; }
+std::string ExamplePath(const std::string& name) {
+  static const std::string examples = std::filesystem::weakly_canonical(
+      std::filesystem::path(QUILLON_TEST_DATA_DIR) / ".." / ".." / "examples");
+  return examples + "/" + name;
+}
+
+std::string ReadText(const std::string& path) {
+  std::ifstream in(path, std::ios::binary);
+  return std::string(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
+}
+
+namespace {
+
+void ReplaceAll(std::string& text, const std::string& what, const std::string& with) {
+  if (what.empty()) return;
+  for (std::size_t at = text.find(what); at != std::string::npos; at = text.find(what, at + with.size()))
+    text.replace(at, what.size(), with);
+}
+
+}  // namespace
+
+void ExpectOutputMatches(const std::string& text, const std::string& name, const std::string& tempDir) {
+  std::string stable = text;
+  ReplaceAll(stable, tempDir, "@TMP@");
+  ReplaceAll(stable, DataDir(), "@DATA@");
+  ReplaceAll(stable, ExamplePath(""), "@EXAMPLES@/");
+  const std::string path = DataPath("expected/" + name);
+  const char* update = std::getenv("QUILLON_UPDATE_EXPECTED");
+  if (update && std::string(update) == "1") {
+    std::ofstream(path, std::ios::binary) << stable;
+    std::printf("rewrote %s\n", path.c_str());
+    return;
+  }
+  EXPECT_TRUE(std::filesystem::is_regular_file(path)) << path;
+  EXPECT_EQ(stable, ReadText(path)) << "differs from " << path;
+}
+
+void ExpectOutputsMatch(const std::vector<OutputCase>& cases) {
+  for (const OutputCase& each : cases) {
+    SCOPED_TRACE(each.expected);
+    CliResult result = RunQuillon(CliRun{each.args, each.workDir, {}});
+    EXPECT_EQ(result.status, each.status) << result.err;
+    ExpectOutputMatches(result.out, each.expected);
+  }
+}
+
+void ExpectRejected(const CliResult& result, const std::string& named) {
+  EXPECT_EQ(result.status, 2) << result.err;
+  EXPECT_EQ(result.out, "");
+  std::vector<std::string> lines = Lines(result.err);
+  ASSERT_EQ(lines.size(), 1u) << result.err;
+  EXPECT_EQ(lines[0].rfind("quillon: ", 0), 0u) << lines[0];
+  EXPECT_NE(lines[0].find(named), std::string::npos) << lines[0];
+}
+
+void ExpectAllRejected(const std::vector<BadInput>& cases) {
+  for (const BadInput& bad : cases) {
+    SCOPED_TRACE(bad.named);
+    ExpectRejected(RunQuillon(CliRun{bad.args, bad.workDir, {}}), bad.named);
+  }
+}
 
 std::vector<std::string> Lines(const std::string& text) {
   std::vector<std::string> lines;

@@ -36,12 +36,40 @@ inline CliResult RunQuillon(std::vector<std::string> args) {
 // The test data folder of these tests: tests/data/cli.
 std::string DataDir();
 std::string DataPath(const std::string& name);
+// A file of the example project in examples/.
+std::string ExamplePath(const std::string& name);
+std::string ReadText(const std::string& path);
+
+// Compares `text` with the file tests/data/cli/expected/NAME, in which @DATA@ stands for DataDir(),
+// @EXAMPLES@ for the examples folder and @TMP@ for `tempDir` when one is given. With
+// QUILLON_UPDATE_EXPECTED=1 in the environment the file is written from `text` instead.
+void ExpectOutputMatches(const std::string& text, const std::string& name, const std::string& tempDir = {});
+
+// One run whose standard output must match an expected file.
+struct OutputCase {
+  std::string expected;
+  std::vector<std::string> args;
+  int status = 0;
+  std::string workDir = {};
+};
+void ExpectOutputsMatch(const std::vector<OutputCase>& cases);
+
+// A usage or input mistake: exit status 2, nothing on standard output, and one line on standard error,
+// "quillon: ..." naming `named`.
+void ExpectRejected(const CliResult& result, const std::string& named);
+struct BadInput {
+  std::vector<std::string> args;
+  std::string named;
+  std::string workDir = {};
+};
+void ExpectAllRejected(const std::vector<BadInput>& cases);
 
 // A file with the given text in a fresh temporary directory, removed at the end.
 class ScopedTextFile {
  public:
   explicit ScopedTextFile(std::string_view text, std::string_view name = "list.f");
   const std::string& path() const { return path_; }
+  const std::string& dir() const { return dir_.path(); }
   std::string Beside(std::string_view name) const { return dir_.Path(name); }
 
  private:

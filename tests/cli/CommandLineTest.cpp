@@ -1,5 +1,5 @@
-// Usage and bad input: every mistake gets one line naming what is wrong and exit status 2 (1 where
-// the module reports the failure), never a crash.
+// Usage and bad input: every mistake gets one line naming what is wrong (with the closest names when
+// something is misspelt) and exit status 2, never a crash.
 #include <gtest/gtest.h>
 
 #include <string>
@@ -10,29 +10,19 @@
 namespace cli_test {
 namespace {
 
-struct BadInput {
-  std::vector<std::string> args;
-  std::string named;  // what the message must name
-};
-
-void ExpectOneLineNaming(const CliResult& result, const std::string& named) {
-  EXPECT_EQ(result.status, 2) << result.err;
-  EXPECT_EQ(result.out, "");
-  std::vector<std::string> lines = Lines(result.err);
-  ASSERT_EQ(lines.size(), 1u) << result.err;
-  EXPECT_EQ(lines[0].rfind("quillon: ", 0), 0u) << lines[0];
-  EXPECT_NE(lines[0].find(named), std::string::npos) << lines[0];
-}
-
-TEST(CommandLine, UsageMistakesAreRejectedWithStatusTwo) {
-  const std::string top = DataPath("mixed/top.vhd");
-  const std::vector<BadInput> cases = {
+TEST(CommandLine, UsageMistakesAreRejectedWithTheClosestNames) {
+  const std::string top = DataPath("mixed/top.vhd"), project = DataPath("mixed/project.json");
+  ExpectAllRejected({
       {{}, "no command"},
-      {{"compile", top}, "unknown command 'compile'"},
-      {{"--frobnicate", "units", top}, "--frobnicate"},
+      {{"ordr", "-P", project}, "unknown command 'ordr'; did you mean 'order'?"},
+      {{"compile", top}, "unknown command 'compile' (see"},
+      {{"order", "--tpo", "top", "-P", project}, "unknown option '--tpo'; did you mean '--to' or '--top'?"},
+      {{"--strickt", "check", "-P", project}, "unknown option '--strickt'; did you mean '--strict'?"},
+      {{"--frobnicate", "units", top}, "unknown option '--frobnicate' (see"},
       {{"units"}, "no sources"},
       {{"ports"}, "UNIT"},
-      {{"--format", "xml", "units", top}, "xml"},
+      {{"--color", "sometimes", "units", top}, "--color: 'sometimes' is not one of auto always never"},
+      {{"units", "--format", "xml", top}, "--format: 'xml' is not one of text json dot"},
       {{"--format", "dot", "units", top}, "--format dot"},
       {{"--top", "top", "units", top}, "--top"},
       {{"--top", "top", "--unit", "top", "order", top}, "--unit"},
@@ -45,15 +35,33 @@ TEST(CommandLine, UsageMistakesAreRejectedWithStatusTwo) {
       {{"units", top, "-l", "common"}, "-l common applies to no source"},
       {{"units", top, "--plugin", "PLUGIN_Vhdl"}, "--plugin PLUGIN_Vhdl applies to no source"},
       {{"units", "--lib", "common"}, "--lib needs NAME=PATH"},
-  };
-  for (const BadInput& bad : cases) {
-    SCOPED_TRACE(bad.named);
-    ExpectOneLineNaming(RunQuillon(bad.args), bad.named);
-  }
+      {{"export", "-P", project}, "--to"},
+      {{"order", "--to", "make", "-P", project}, "--to"},
+      {{"export", "--to", "cmake", "-P", project}, "cmake"},
+  });
 }
 
-TEST(CommandLine, UnreadableSourcesAreRejectedWithStatusTwo) {
-  const std::vector<BadInput> cases = {
+TEST(CommandLine, UnknownUnitsAreRejectedWithTheClosestNames) {
+  const std::string project = DataPath("mixed/project.json");
+  ExpectAllRejected({
+      {{"order", "--top", "croe", "-P", project}, "unknown design unit 'croe'; did you mean 'core'?"},
+      {{"ports", "Entity|tpo", "-P", project},
+       "unknown design unit 'Entity|tpo'; did you mean 'Entity|top'?"},
+      {{"ports", "zzzzzz", "-P", project}, "unknown design unit 'zzzzzz'"},
+      {{"order", "--unit", "Entity|nowhere", "-P", project}, "unknown design unit 'Entity|nowhere'"},
+      {{"tree", "--top", "nothing", "-P", project}, "unknown design unit 'nothing'"},
+  });
+  CliResult result = RunQuillon({"ports", "zzzzzz", "-P", project});
+  EXPECT_EQ(result.err.find("did you mean"), std::string::npos) << result.err;
+}
+
+TEST(CommandLine, UnreadableSourcesAndListsAreRejectedNamingFileAndLine) {
+  ScopedTextFile missing("lane.vhd\nnot_here.vhd\n");
+  ScopedTextFile plus("+libext+.v\n+nosuch+1\n");
+  ScopedTextFile library("rtl/top.v\n-y lib\n  -v cells/absent.v\n");
+  ScopedTextFile unset("rtl/top.v\n$NOT_SET_ANYWHERE/a.v\n");
+  const std::string libsearch = DataPath("libsearch");
+  ExpectAllRejected({
       {{"units", DataPath("mixed/absent.vhd")}, "no such source file: " + DataPath("mixed/absent.vhd")},
       {{"units", "-P", DataPath("absent.json")}, "cannot read project file " + DataPath("absent.json")},
       {{"units", "-P", DataPath("mixed")}, "cannot read project file " + DataPath("mixed")},
@@ -62,32 +70,18 @@ TEST(CommandLine, UnreadableSourcesAreRejectedWithStatusTwo) {
       {{"units", "-P", DataPath("missing_source.json")}, "no such source file: " + DataPath("missing.vhd")},
       {{"units", "-f", DataPath("absent.f")}, "cannot read file list " + DataPath("absent.f")},
       {{"units", "-o", DataPath("no/such/dir/out.json"), DataPath("mixed/top.vhd")}, "cannot write"},
-  };
-  for (const BadInput& bad : cases) {
-    SCOPED_TRACE(bad.named);
-    ExpectOneLineNaming(RunQuillon(bad.args), bad.named);
-  }
-}
-
-TEST(CommandLine, FileListNamesTheLineOfAMissingSource) {
-  ScopedTextFile list("lane.vhd\nnot_here.vhd\n");
-  CliResult result = RunQuillon(CliRun{{"units", "-f", list.path()}, DataPath("mixed"), {}});
-  ExpectOneLineNaming(result, list.path() + ":2: no such source file: " + DataPath("mixed/not_here.vhd"));
-}
-
-TEST(CommandLine, FileListRejectsAnUnknownPlusOption) {
-  ScopedTextFile list("+libext+.v\n+nosuch+1\n");
-  ExpectOneLineNaming(RunQuillon({"units", "-f", list.path()}),
-                      list.path() + ":2: unknown list option +nosuch+1");
-}
-
-TEST(CommandLine, UnknownUnitIsBadInput) {
-  const std::string project = DataPath("mixed/project.json");
-  ExpectOneLineNaming(RunQuillon({"order", "--top", "nowhere", "-P", project}),
-                      "unknown design unit 'nowhere'");
-  ExpectOneLineNaming(RunQuillon({"order", "--unit", "Entity|nowhere", "-P", project}),
-                      "unknown design unit 'Entity|nowhere'");
-  ExpectOneLineNaming(RunQuillon({"ports", "nowhere", "-P", project}), "unknown design unit 'nowhere'");
+      {{"units", "-f", missing.path()},
+       missing.path() + ":2: no such source file: " + DataPath("mixed/not_here.vhd"),
+       DataPath("mixed")},
+      {{"units", "-f", plus.path()}, plus.path() + ":2: unknown list option +nosuch+1"},
+      {{"units", "-f", library.path()},
+       library.path() + ":3: no such library file: cells/absent.v",
+       libsearch},
+      {{"units", "-f", unset.path()},
+       unset.path() + ":2: the environment variable NOT_SET_ANYWHERE is not set",
+       libsearch},
+      {{"units", "rtl/*.vhd"}, "no file matches the pattern rtl/*.vhd", libsearch},
+  });
 }
 
 }  // namespace

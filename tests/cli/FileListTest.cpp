@@ -17,10 +17,24 @@ class FileListTest : public ::testing::Test {
     return reader_.Read(path, relativeToList, "", "", contents, error);
   }
 
+  // Each entry as its path, after "LIBRARY:" when it has one and before " PLUGIN" when it has one.
   std::vector<std::string> Paths(const std::vector<FileList::Entry>& entries) {
     std::vector<std::string> paths;
-    for (const FileList::Entry& entry : entries) paths.push_back(entry.path);
+    for (const FileList::Entry& entry : entries) {
+      paths.push_back((entry.library.empty() ? "" : entry.library + ":") + entry.path +
+                      (entry.plugin.empty() ? "" : " " + entry.plugin));
+    }
     return paths;
+  }
+
+  // The contents of the list "top.f" holding `text`, or of standard input when `text` is empty.
+  Contents ReadOk(const std::string& text) {
+    std::string path = text.empty() ? FileList::kStandardInput : "top.f";
+    if (!text.empty()) files_[path] = text;
+    Contents contents;
+    std::string error;
+    EXPECT_TRUE(Read(path, false, contents, error)) << error;
+    return contents;
   }
 
   // The error of reading `text` as the list "bad.f".
@@ -50,53 +64,41 @@ class FileListTest : public ::testing::Test {
 };
 
 TEST_F(FileListTest, EveryTokenKindOnAnyLine) {
-  files_["top.f"] =
+  Contents contents = ReadOk(
       "a.v \"with blank.v\" 'c.sv' // a comment\n"
       "# a whole-line comment\n"
       "/* a comment\n   over lines */ d.vhd\n"
       "+incdir+inc+../shared +define+WIDTH=8+FAST\n"
       "+libext+.v+sv -y cells -v lib/gates.v\n"
       "-l common e.vhd -sv f.txt\n"
-      "dir//g.v ./h.v\n";
-  Contents contents;
-  std::string error;
-  ASSERT_TRUE(Read("top.f", false, contents, error)) << error;
-  EXPECT_EQ(Paths(contents.sources), (std::vector<std::string>{"a.v", "with blank.v", "c.sv", "d.vhd",
-                                                               "e.vhd", "f.txt", "dir/g.v", "h.v"}));
+      "dir//g.v ./h.v\n");
+  EXPECT_EQ(Paths(contents.sources),
+            (std::vector<std::string>{"a.v", "with blank.v", "c.sv", "d.vhd", "common:e.vhd",
+                                      "common:f.txt " + std::string(FileList::kVerilogPlugin),
+                                      "common:dir/g.v " + std::string(FileList::kVerilogPlugin), "common:h.v " + std::string(FileList::kVerilogPlugin)}));
   EXPECT_EQ(contents.includeDirs, (std::vector<std::string>{"inc", "../shared"}));
   EXPECT_EQ(contents.defines, (std::vector<std::string>{"WIDTH=8", "FAST"}));
   EXPECT_EQ(contents.libraryExtensions, (std::vector<std::string>{".v", ".sv"}));
   EXPECT_EQ(Paths(contents.libraryDirs), std::vector<std::string>{"cells"});
   EXPECT_EQ(Paths(contents.libraryFiles), std::vector<std::string>{"lib/gates.v"});
-  EXPECT_EQ(contents.sources[3].library, "");
-  EXPECT_EQ(contents.sources[4].library, "common");
-  EXPECT_EQ(contents.sources[4].plugin, "");
-  EXPECT_EQ(contents.sources[5].plugin, FileList::kVerilogPlugin);
   EXPECT_EQ(contents.sources[3].where, "top.f:4: ");
 }
 
 TEST_F(FileListTest, NestedListsTakePathsFromTheCurrentOrTheListDirectory) {
-  files_["top.f"] = "-F rtl/core/core.f\n-f sim/sim.f\ntop.v\n";
   files_["rtl/core/core.f"] = "-l core cpu.v +incdir+inc\n-F ../alu/alu.f\n";
   files_["rtl/alu/alu.f"] = "/abs/alu.v adder.v\n";
   files_["sim/sim.f"] = "sim/tb.v\n";
-  Contents contents;
-  std::string error;
-  ASSERT_TRUE(Read("top.f", false, contents, error)) << error;
-  EXPECT_EQ(Paths(contents.sources), (std::vector<std::string>{"rtl/core/cpu.v", "/abs/alu.v",
-                                                               "rtl/alu/adder.v", "sim/tb.v", "top.v"}));
-  EXPECT_EQ(contents.includeDirs, std::vector<std::string>{"rtl/core/inc"});
+  Contents contents = ReadOk("-F rtl/core/core.f\n-f sim/sim.f\ntop.v\n");
   // A library set inside a list holds for that list and the lists it names, not after it.
-  EXPECT_EQ(contents.sources[2].library, "core");
-  EXPECT_EQ(contents.sources[3].library, "");
+  EXPECT_EQ(Paths(contents.sources), (std::vector<std::string>{"core:rtl/core/cpu.v", "core:/abs/alu.v",
+                                                               "core:rtl/alu/adder.v", "sim/tb.v", "top.v"}));
+  EXPECT_EQ(contents.includeDirs, std::vector<std::string>{"rtl/core/inc"});
 }
 
 TEST_F(FileListTest, VariablesComeFromTheEnvironmentOutsideSingleQuotes) {
   environment_ = {{"PROJECT_HOME", "/home/p"}, {"REV", "b"}};
-  files_["top.f"] = "$PROJECT_HOME/a.v ${PROJECT_HOME}/x_$(REV).v \"$REV dir/c.v\" '$REV/d.v' cost$.v\n";
-  Contents contents;
-  std::string error;
-  ASSERT_TRUE(Read("top.f", false, contents, error)) << error;
+  Contents contents =
+      ReadOk("$PROJECT_HOME/a.v ${PROJECT_HOME}/x_$(REV).v \"$REV dir/c.v\" '$REV/d.v' cost$.v\n");
   EXPECT_EQ(Paths(contents.sources),
             (std::vector<std::string>{"/home/p/a.v", "/home/p/x_b.v", "b dir/c.v", "$REV/d.v", "cost$.v"}));
 
@@ -113,19 +115,12 @@ TEST_F(FileListTest, ErrorsNameTheListAndTheLine) {
   EXPECT_EQ(ErrorOf("+define+=1\n"), "bad.f:1: +define+ needs NAME[=VALUE], not '=1'");
   EXPECT_EQ(ErrorOf("-f absent.f\n"), "bad.f:1: cannot read file list absent.f");
 
-  files_["a.f"] = "one.v\n-f b.f\n";
-  files_["b.f"] = "two.v\n\n-f ./a.f\n";
-  Contents contents;
-  std::string error;
-  EXPECT_FALSE(Read("a.f", false, contents, error));
-  EXPECT_EQ(error, "b.f:3: the list a.f includes itself");
+  files_["b.f"] = "two.v\n\n-f ./bad.f\n";
+  EXPECT_EQ(ErrorOf("one.v\n-f b.f\n"), "b.f:3: the list bad.f includes itself");
 }
 
 TEST_F(FileListTest, HarmlessSimulatorOptionsOnlyWarn) {
-  files_["top.f"] = "+notimingchecks a.v\n-64\n";
-  Contents contents;
-  std::string error;
-  ASSERT_TRUE(Read("top.f", false, contents, error)) << error;
+  Contents contents = ReadOk("+notimingchecks a.v\n-64\n");
   EXPECT_EQ(Paths(contents.sources), std::vector<std::string>{"a.v"});
   EXPECT_EQ(contents.warnings,
             (std::vector<std::string>{
@@ -136,13 +131,8 @@ TEST_F(FileListTest, HarmlessSimulatorOptionsOnlyWarn) {
 TEST_F(FileListTest, StandardInputIsReadOnce) {
   input_.str("a.v\n-F rtl/more.f\n");
   files_["rtl/more.f"] = "b.v\n";
-  files_["again.f"] = "-f -\n";
-  Contents contents;
-  std::string error;
-  ASSERT_TRUE(Read(FileList::kStandardInput, false, contents, error)) << error;
-  EXPECT_EQ(Paths(contents.sources), (std::vector<std::string>{"a.v", "rtl/b.v"}));
-  EXPECT_FALSE(Read("again.f", false, contents, error));
-  EXPECT_EQ(error, "again.f:1: standard input is read once; it is named as a list twice");
+  EXPECT_EQ(Paths(ReadOk("").sources), (std::vector<std::string>{"a.v", "rtl/b.v"}));
+  EXPECT_EQ(ErrorOf("-f -\n"), "bad.f:1: standard input is read once; it is named as a list twice");
 }
 
 }  // namespace

@@ -1,4 +1,5 @@
-// The tree command end to end: the hierarchy that the module builds, in JSON, text and DOT.
+// The tree command end to end: the hierarchy that the module builds in JSON, text and DOT, and the
+// parts of it shown when asked (--top, --depth, --instances).
 #include <gtest/gtest.h>
 
 #include <fstream>
@@ -11,106 +12,16 @@
 namespace cli_test {
 namespace {
 
-using Json = nlohmann::json;
-
-Json TreeOf(const std::vector<std::string>& args) {
-  std::vector<std::string> all{"-q", "--format", "json", "tree"};
-  all.insert(all.end(), args.begin(), args.end());
-  CliResult result = RunQuillon(all);
-  EXPECT_EQ(result.status, 0) << result.err;
-  Json answer = Json::parse(result.out, nullptr, false);
-  EXPECT_FALSE(answer.is_discarded()) << result.out;
-  return answer;
-}
-
-std::string BaseName(const Json& path) {
-  if (!path.is_string()) return "-";
-  std::string text = path;
-  return text.substr(text.rfind('/') + 1);
-}
-
-std::string Text(const Json& value) { return value.is_string() ? value.get<std::string>() : "null"; }
-
-// One line a node below the root: indent, name, instance, path, type, element type, file.
-void Outline(const Json& node, int depth, std::vector<std::string>& lines) {
-  lines.push_back(std::string(depth * 2, ' ') + Text(node["name"]) + " | " + Text(node["instance"]) + " | " +
-                  Text(node["path"]) + " | " + Text(node["type"]) + " | " + Text(node["elementType"]) +
-                  " | " + BaseName(node["file"]));
-  for (const Json& child : node["children"]) Outline(child, depth + 1, lines);
-}
-
-std::vector<std::string> OutlineBelowRoot(const Json& root) {
-  std::vector<std::string> lines;
-  for (const Json& top : root["children"]) Outline(top, 0, lines);
-  return lines;
-}
-
-const Json* ChildWithInstance(const Json& node, const std::string& label) {
-  for (const Json& child : node["children"]) {
-    if (child["instance"] == label) return &child;
-  }
-  return nullptr;
-}
-
-TEST(Hierarchy, JsonTreeGivesEveryNodeItsNamesPathAndFile) {
-  Json answer = TreeOf({"-P", DataPath("mixed/project.json")});
-  const Json& root = answer["root"];
-  EXPECT_EQ(root["name"], "");
-  EXPECT_TRUE(root["elementType"].is_null());
-  EXPECT_TRUE(root["file"].is_null());
-  EXPECT_EQ(
-      OutlineBelowRoot(root),
-      (std::vector<std::string>{
-          "Architecture|top|rtl |  | /top | instance | Architecture | top.vhd",
-          "  work:Architecture|core|rtl | u_core | /top/u_core | instance | Architecture | core.vhd",
-          "    work:Architecture|lane|rtl | u_lane | /top/u_core/u_lane | instance | Architecture | lane.vhd",
-          "      work:Entity|lane |  |  | work:Entity | Entity | lane.vhd",
-          "    work:Entity|core |  |  | work:Entity | Entity | core.vhd",
-          "      shared:PackageDecl|shared_pkg |  |  | shared:PackageDecl | PackageDecl | shared_pkg.vhd",
-          "  work:Entity|top |  |  | work:Entity | Entity | top.vhd",
-      }));
-  const Json& core = *ChildWithInstance(root["children"][0], "u_core");
-  EXPECT_EQ(core["kind"], "work:Architecture");
-  EXPECT_EQ(core["unit"], "core");
-  EXPECT_EQ(core["architecture"], "rtl");
-  EXPECT_EQ(core["libraryCell"], false);
-  EXPECT_EQ(core["partition"], "");
-  EXPECT_EQ(core["file"], DataPath("mixed/core.vhd"));
-  EXPECT_EQ(answer["messages"], Json::array());
-}
-
-TEST(Hierarchy, UnitMissingFromTheProjectHasNoElementAndNoFile) {
-  Json answer = TreeOf({DataPath("stray/stray.vhd")});
-  ASSERT_EQ(answer["root"]["children"].size(), 1u);
-  const Json* mystery = ChildWithInstance(answer["root"]["children"][0], "u_mystery");
-  ASSERT_NE(mystery, nullptr) << answer.dump(2);
-  EXPECT_EQ((*mystery)["unit"], "mystery_block");
-  EXPECT_TRUE((*mystery)["elementType"].is_null());
-  EXPECT_TRUE((*mystery)["file"].is_null());
-  EXPECT_EQ((*mystery)["libraryCell"], false);
-
-  CliResult text = RunQuillon({"tree", DataPath("stray/stray.vhd")});
-  EXPECT_NE(text.out.find("  u_mystery: mystery_block [work:Architecture] (not in the project)\n"),
-            std::string::npos)
-      << text.out;
-}
-
-TEST(Hierarchy, TextTreeIndentsEachLevelAndNamesFilesByBaseNameUnlessVerbose) {
-  CliResult result = RunQuillon({"tree", "-P", DataPath("mixed/project.json")});
-  EXPECT_EQ(result.status, 0) << result.err;
-  EXPECT_EQ(Lines(result.out), (std::vector<std::string>{
-                                   "top(rtl) [Architecture]  top.vhd",
-                                   "  u_core: core(rtl) [work:Architecture]  core.vhd",
-                                   "    u_lane: lane(rtl) [work:Architecture]  lane.vhd",
-                                   "      lane [work:Entity]  lane.vhd",
-                                   "    core [work:Entity]  core.vhd",
-                                   "      shared_pkg [shared:PackageDecl]  shared_pkg.vhd",
-                                   "  top [work:Entity]  top.vhd",
-                               }));
-
-  CliResult verbose = RunQuillon({"-v", "tree", "-P", DataPath("mixed/project.json")});
-  EXPECT_EQ(verbose.status, 0) << verbose.err;
-  EXPECT_EQ(Lines(verbose.out)[1], "  u_core: core(rtl) [work:Architecture]  " + DataPath("mixed/core.vhd"));
+TEST(Hierarchy, TreeShowsEveryNodeWithItsNamesPathAndFile) {
+  const std::string project = DataPath("mixed/project.json"), stray = DataPath("stray/stray.vhd");
+  ExpectOutputsMatch({
+      {"tree-mixed.json", {"-q", "--format", "json", "tree", "-P", project}},
+      {"tree-mixed.txt", {"tree", "-P", project}},  // files by base name unless verbose
+      {"tree-mixed-verbose.txt", {"-v", "tree", "-P", project}},
+      // A unit missing from the project has no element and no file.
+      {"tree-stray.json", {"-q", "--format", "json", "tree", stray}},
+      {"tree-stray.txt", {"tree", stray}},
+  });
 }
 
 TEST(Hierarchy, CircularReferenceIsAWarningNotAFailure) {
@@ -118,92 +29,80 @@ TEST(Hierarchy, CircularReferenceIsAWarningNotAFailure) {
       RunQuillon({"--format", "json", "tree", DataPath("cycle/ping.vhd"), DataPath("cycle/pong.vhd")});
   EXPECT_EQ(result.status, 0) << result.err;
   EXPECT_NE(result.err.find("WARNING: Circular Reference: "), std::string::npos) << result.err;
-  Json answer = Json::parse(result.out, nullptr, false);
-  ASSERT_FALSE(answer.is_discarded());
-  ASSERT_FALSE(answer["messages"].empty());
-  EXPECT_EQ(answer["messages"][0]["severity"], "warning");
-  EXPECT_EQ(Text(answer["messages"][0]["text"]).rfind("Circular Reference: ", 0), 0u);
+  // The message names where in the module it was raised, which no expected file should pin.
+  nlohmann::json message = nlohmann::json::parse(result.out)["messages"][0];
+  EXPECT_EQ(message["severity"], "warning");
+  EXPECT_EQ(message["text"].get<std::string>().rfind("Circular Reference: ", 0), 0u) << message;
 }
 
-// A package that two others use; the second occurrence points at the first.
-constexpr const char* kSharedPackages =
-    "package base is\nend package;\n"
-    "use work.base.all;\npackage common is\nend package;\n"
-    "use work.common.all;\npackage user_a is\nend package;\n"
-    "use work.common.all;\npackage user_b is\nend package;\n";
+// Two packages use a third; the second occurrence points at the first, unless --top leaves the first
+// out. DOT draws the shared package once, with an edge from each user.
+TEST(Hierarchy, SharedSubtreeIsShownOnceAndReferencedAfterwards) {
+  const std::string source = DataPath("shared/shared.vhd");
+  ExpectOutputsMatch({
+      {"tree-shared.txt", {"tree", source}},
+      {"tree-shared.json", {"-q", "--format", "json", "tree", source}},
+      {"tree-shared-dot.txt", {"--format", "dot", "tree", source}},
+      {"tree-shared-top-user-b.txt", {"tree", "--top", "user_b", source}},
+  });
+}
 
-TEST(Hierarchy, SharedSubtreeIsPrintedOnceAndReferencedAfterwards) {
-  ScopedTextFile source(kSharedPackages, "shared.vhd");
-  CliResult text = RunQuillon({"tree", source.path()});
-  EXPECT_EQ(text.status, 0) << text.err;
-  std::string at = "  shared.vhd";
-  EXPECT_EQ(Lines(text.out), (std::vector<std::string>{
-                                 "user_a [PackageDecl]" + at,
-                                 "  common [work:PackageDecl]" + at,
-                                 "    base [work:PackageDecl]" + at,
-                                 "user_b [PackageDecl]" + at,
-                                 "  common [work:PackageDecl] (shared, see above)",
-                             }));
+TEST(Hierarchy, TopDepthAndInstancesChooseWhatIsShown) {
+  const std::string project = DataPath("mixed/project.json");
+  auto tree = [&](std::vector<std::string> options) {
+    options.insert(options.begin(), {"tree", "-P", project});
+    return options;
+  };
+  ExpectOutputsMatch({
+      // An entity stands for its architecture.
+      {"tree-top-core.txt", tree({"--top", "core"})},
+      {"tree-top-lane-rtl.txt", tree({"--top", "Architecture|lane|rtl"})},
+      {"tree-top-lane.json", tree({"-q", "--format", "json", "--top", "lane"})},
+      // --depth counts what it leaves out; --instances leaves out entities and packages.
+      {"tree-depth-1.txt", tree({"--depth", "1"})},
+      {"tree-depth-0.txt", tree({"--depth", "0"})},
+      {"tree-depth-1.json", tree({"-q", "--format", "json", "--depth", "1"})},
+      {"tree-instances.txt", tree({"--instances"})},
+      {"tree-instances-depth-0.txt", tree({"--instances", "--depth", "0", "--top", "top"})},
+  });
+}
 
-  Json answer = TreeOf({source.path()});
-  const Json& again = answer["root"]["children"][1]["children"][0];
-  EXPECT_EQ(again["name"], "work:PackageDecl|common");
-  EXPECT_EQ(again["shared"], true);
-  EXPECT_TRUE(again["children"].empty());
-  const Json& first = answer.at(Json::json_pointer(again["firstOccurrence"].get<std::string>()));
-  EXPECT_EQ(first["name"], "work:PackageDecl|common");
-  EXPECT_EQ(first["children"][0]["name"], "work:PackageDecl|base");
-  EXPECT_FALSE(first.contains("shared"));
+TEST(Hierarchy, DotDrawsEachUnitOnceInTheClusterOfItsLibraryAndQuotesNames) {
+  ExpectOutputsMatch({{"tree-libraries-dot.txt",
+                       {"-q", "--format", "dot", "tree", "-l", "util", DataPath("libraries/pkg.vhd"), "-l",
+                        "work", DataPath("libraries/design.vhd")}}});
 
-  // Drawn once, with an edge from each user.
-  CliResult dot = RunQuillon({"--format", "dot", "tree", source.path()});
-  EXPECT_EQ(dot.status, 0) << dot.err;
-  std::string tooltip = "tooltip=\"" + source.path() + "\", shape=ellipse];";
-  EXPECT_EQ(Lines(dot.out), (std::vector<std::string>{
-                                "digraph hierarchy {",
-                                "  rankdir=LR;",
-                                "  newrank=true;",
-                                "  nodesep=0.15;",
-                                "  node [shape=box, fontsize=10];",
-                                "  subgraph \"cluster_work\" {",
-                                "    label=\"work\";",
-                                "    n0 [label=\"user_a\\nPackageDecl\", " + tooltip,
-                                "    n1 [label=\"common\\nPackageDecl\", " + tooltip,
-                                "    n2 [label=\"base\\nPackageDecl\", " + tooltip,
-                                "    n3 [label=\"user_b\\nPackageDecl\", " + tooltip,
-                                "  }",
-                                "  n0 -> n1;",
-                                "  n1 -> n2;",
-                                "  n3 -> n1;",
-                                "}",
-                            }));
+  ScopedTextFile source("package p is\nend package;\n", "odd \"name\".vhd");
+  CliResult result = RunQuillon({"-q", "--format", "dot", "order", "-l", "x\"y\\z", source.path()});
+  ASSERT_EQ(result.status, 0) << result.err;
+  EXPECT_NE(result.out.find("subgraph \"cluster_x\\\"y\\\\z\" {"), std::string::npos) << result.out;
+  EXPECT_NE(result.out.find("[label=\"1. odd \\\"name\\\".vhd\""), std::string::npos) << result.out;
 }
 
 // Deeper than a printer that recursed once per level could go in the sanitizer build.
 constexpr int kChainDepth = 8000;
 
 TEST(Hierarchy, DeepChainsPrintAndOrderWithoutRecursion) {
-  std::string modules;
-  std::string packages;
+  std::string modules, packages;
   for (int i = 0; i < kChainDepth; ++i) {
-    std::string next = std::to_string(i + 1);
-    modules += "module m" + std::to_string(i) + ";\n";
-    if (i + 1 < kChainDepth) modules += "  m" + next + " u ();\n";
-    modules += "endmodule\n";
-    if (i + 1 < kChainDepth) packages += "use work.p" + next + ".all;\n";
-    packages += "package p" + std::to_string(i) + " is\nend package;\n";
+    const std::string next = std::to_string(i + 1);
+    const bool last = i + 1 == kChainDepth;
+    modules +=
+        "module m" + std::to_string(i) + ";\n" + (last ? "" : "  m" + next + " u ();\n") + "endmodule\n";
+    packages += (last ? "" : "use work.p" + next + ".all;\n") + "package p" + std::to_string(i) +
+                " is\nend package;\n";
   }
   ScopedTextFile verilog(modules, "chain.v");
-  std::string vhdl = verilog.Beside("chain.vhd");
-  { std::ofstream(vhdl) << packages; }
+  const std::string vhdl = verilog.Beside("chain.vhd");
+  std::ofstream(vhdl) << packages;
 
   CliResult tree = RunQuillon({"tree", verilog.path(), vhdl});
   ASSERT_EQ(tree.status, 0) << tree.err;
   std::vector<std::string> lines = Lines(tree.out);
   ASSERT_EQ(lines.size(), 2u * kChainDepth);
-  std::string indent(2 * 100, ' ');
-  EXPECT_EQ(lines[kChainDepth - 1], indent + "(level " + std::to_string(kChainDepth - 1) + ") u: m" +
-                                        std::to_string(kChainDepth - 1) + " [work:Module]  chain.v");
+  const std::string deepest = std::to_string(kChainDepth - 1);
+  EXPECT_EQ(lines[kChainDepth - 1],
+            std::string(2 * 100, ' ') + "(level " + deepest + ") u: m" + deepest + " [work:Module]  chain.v");
 
   CliResult order = RunQuillon({"order", verilog.path(), vhdl});
   ASSERT_EQ(order.status, 0) << order.err;
@@ -212,10 +111,9 @@ TEST(Hierarchy, DeepChainsPrintAndOrderWithoutRecursion) {
   // The package chain has no instance paths, whose texts grow with the depth.
   CliResult json = RunQuillon({"--format", "json", "tree", vhdl});
   ASSERT_EQ(json.status, 0) << json.err;
-  Json answer = Json::parse(json.out, nullptr, false);
-  ASSERT_FALSE(answer.is_discarded());
+  nlohmann::json answer = nlohmann::json::parse(json.out);
   int depth = 0;
-  for (const Json* node = &answer["root"]; !(*node)["children"].empty(); node = &(*node)["children"][0])
+  for (const auto* node = &answer["root"]; !(*node)["children"].empty(); node = &(*node)["children"][0])
     ++depth;
   EXPECT_EQ(depth, kChainDepth);
 

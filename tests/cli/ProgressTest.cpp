@@ -6,26 +6,23 @@
 #include <vector>
 
 #include "CliRun.h"
-#include "ScopedTempDir.h"
 
 namespace cli_test {
 namespace {
 
 TEST(Progress, LargeProjectsCountTheFilesOnATerminalOnly) {
   ScopedTempDir dir;
-  std::vector<std::string> args{"units"};
+  CliRun run{{"units"}, {}, {}};
   for (int i = 0; i < 50; ++i) {
-    std::string path = dir.Path("unit" + std::to_string(i) + ".vhd");
-    std::ofstream(path) << "entity unit" << i << " is end entity;\n";
-    args.push_back(path);
+    run.args.push_back(dir.Path("unit" + std::to_string(i) + ".vhd"));
+    std::ofstream(run.args.back()) << "entity unit" << i << " is end entity;\n";
   }
-  CliRun run{args, {}, {}};
   run.errorToTerminal = true;
   CliResult terminal = RunQuillon(run);
   EXPECT_EQ(terminal.status, 0) << terminal.err;
   EXPECT_NE(terminal.err.find("quillon: parsing 1/50"), std::string::npos) << terminal.err;
   EXPECT_NE(terminal.err.find("quillon: parsing 50/50"), std::string::npos) << terminal.err;
-  EXPECT_EQ(terminal.err.substr(terminal.err.size() - 4), "\r\033[K") << "the line is taken off at the end";
+  EXPECT_TRUE(terminal.err.ends_with("\r\033[K")) << "the line is taken off at the end";
 
   run.args.insert(run.args.begin(), "-q");
   EXPECT_EQ(RunQuillon(run).err, "");

@@ -1,10 +1,7 @@
-// The units command end to end: sources from the command line, project files and file lists,
-// and the JSON and text answers.
+// The units command end to end: sources from the command line, project files and file lists, what
+// reaches the parsers (targets, macros, include directories), and the JSON and text answers.
 #include <gtest/gtest.h>
 
-#include <fstream>
-#include <iterator>
-#include <map>
 #include <nlohmann/json.hpp>
 #include <string>
 #include <vector>
@@ -14,117 +11,66 @@
 namespace cli_test {
 namespace {
 
-using Json = nlohmann::json;
-
-Json ParsedJson(const std::string& text) {
-  Json document = Json::parse(text, nullptr, false);
-  EXPECT_FALSE(document.is_discarded()) << text;
-  return document;
+TEST(Units, AnswersGiveEveryRecordOfEveryFile) {
+  const std::string mixed = DataPath("mixed");
+  ExpectOutputsMatch({
+      {"units-mixed.json", {"--format", "json", "units", "-P", mixed + "/project.json"}},
+      // The list names no library: everything goes to work.
+      {"units-mixed-list.json", {"--format", "json", "units", "-f", "sources.f"}, 0, mixed},
+      // One unit named after a file of an unknown extension.
+      {"units-readme.json", {"--format", "json", "units", mixed + "/readme.notes"}},
+      // Library and plug-in apply to the sources after them.
+      {"units-library-plugin.json",
+       {"--format", "json", "units", mixed + "/top.vhd", "-l", "first", mixed + "/core.vhd", "--plugin",
+        "PLUGIN_General", mixed + "/lane.vhd"}},
+      // VHDL units list the store keys of their use clauses.
+      {"units-uses.json", {"--format", "json", "units", DataPath("uses/e.vhd")}},
+      {"units-top.txt", {"units", mixed + "/top.vhd"}},  // one line per unit in line order
+  });
 }
 
-Json UnitsOf(const std::vector<std::string>& args, const std::string& workDir = {}) {
-  std::vector<std::string> all{"--format", "json", "units"};
-  all.insert(all.end(), args.begin(), args.end());
-  CliResult result = RunQuillon(CliRun{all, workDir, {}});
-  EXPECT_EQ(result.status, 0) << result.err;
-  return ParsedJson(result.out);
-}
-
-std::string ExpectedText(const std::string& name) {
-  std::ifstream in(DataPath(name), std::ios::binary);
-  std::string text((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
-  for (std::size_t at = text.find("@DATA@"); at != std::string::npos; at = text.find("@DATA@", at)) {
-    text.replace(at, 6, DataDir());
-  }
-  return text;
-}
-
-const Json* FileNamed(const Json& units, const std::string& path) {
-  for (const Json& file : units["files"]) {
-    if (file["fullPath"] == path) return &file;
-  }
-  return nullptr;
-}
-
-std::vector<std::string> KeysOf(const Json& file) {
+// The design-unit keys of every file, in file order.
+std::vector<std::string> UnitKeys(std::vector<std::string> args, const std::string& workDir = {},
+                                  int status = 0) {
+  args.insert(args.begin(), {"--format", "json", "units"});
+  CliResult result = RunQuillon(CliRun{args, workDir, {}});
+  EXPECT_EQ(result.status, status) << result.err;
   std::vector<std::string> keys;
-  for (const Json& unit : file["units"]) keys.push_back(unit["storeKey"]);
+  const nlohmann::json answer = nlohmann::json::parse(result.out);
+  for (const auto& file : answer["files"])
+    for (const auto& unit : file["units"]) keys.push_back(unit["key"]);
   return keys;
-}
-
-TEST(Units, ProjectFileGivesEveryRecordOfEveryFile) {
-  Json units = UnitsOf({"-P", DataPath("mixed/project.json")});
-  EXPECT_EQ(units, ParsedJson(ExpectedText("mixed/expected/units.json")));
-}
-
-TEST(Units, SourceWithAnUnknownExtensionIsOneUnitNamedAfterTheFile) {
-  Json units = UnitsOf({DataPath("mixed/readme.notes")});
-  ASSERT_EQ(units["files"].size(), 1u);
-  const Json& file = units["files"][0];
-  EXPECT_EQ(file["plugin"], "PLUGIN_General");
-  ASSERT_EQ(file["units"].size(), 1u);
-  EXPECT_EQ(file["units"][0]["type"], "Generic");
-  EXPECT_EQ(file["units"][0]["name"], "readme.notes");
-  EXPECT_EQ(file["units"][0]["key"], "Generic|readme.notes");
-}
-
-TEST(Units, FileListReadsTheSameFilesAsTheProjectFile) {
-  Json fromList = UnitsOf({"-f", DataPath("mixed/sources.f")}, DataPath("mixed"));
-  Json fromProject = UnitsOf({"-P", DataPath("mixed/project.json")});
-  ASSERT_EQ(fromList["files"].size(), fromProject["files"].size());
-  for (std::size_t i = 0; i < fromList["files"].size(); ++i) {
-    EXPECT_EQ(fromList["files"][i]["fullPath"], fromProject["files"][i]["path"]);
-    EXPECT_EQ(KeysOf(fromList["files"][i]), KeysOf(fromProject["files"][i]));
-  }
-  // The list names no library: everything goes to work.
-  EXPECT_EQ((*FileNamed(fromList, DataPath("mixed/shared_pkg.vhd")))["library"], "work");
-  EXPECT_EQ((*FileNamed(fromProject, DataPath("mixed/shared_pkg.vhd")))["library"], "shared");
-}
-
-TEST(Units, LibraryAndPluginApplyToTheSourcesAfterThem) {
-  Json units = UnitsOf({DataPath("mixed/top.vhd"), "-l", "first", DataPath("mixed/core.vhd"), "--plugin",
-                        "PLUGIN_General", DataPath("mixed/lane.vhd")});
-  const Json* top = FileNamed(units, DataPath("mixed/top.vhd"));
-  const Json* core = FileNamed(units, DataPath("mixed/core.vhd"));
-  const Json* lane = FileNamed(units, DataPath("mixed/lane.vhd"));
-  ASSERT_TRUE(top && core && lane);
-  EXPECT_EQ((*top)["library"], "work");
-  EXPECT_EQ((*top)["plugin"], "PLUGIN_Vhdl");
-  EXPECT_EQ((*core)["library"], "first");
-  EXPECT_EQ((*core)["plugin"], "PLUGIN_Vhdl");
-  EXPECT_EQ((*lane)["library"], "first");
-  EXPECT_EQ((*lane)["plugin"], "PLUGIN_General");
-  EXPECT_EQ(KeysOf(*lane), std::vector<std::string>{"|Generic||lane.vhd"});
 }
 
 TEST(Units, ParseTargetReachesTheParserFromEveryPlaceThatSetsIt) {
   const std::string source = DataPath("mixed/pragmas.vhd");
-  const std::vector<std::string> both{"|Entity||always_there", "|Entity||model_only"};
-  const std::vector<std::string> synthesisOnly{"|Entity||always_there"};
-  EXPECT_EQ(KeysOf(UnitsOf({source})["files"][0]), both);
-  EXPECT_EQ(KeysOf(UnitsOf({"--target", "synthesis", source})["files"][0]), synthesisOnly);
-  EXPECT_EQ(KeysOf(UnitsOf({"--property", "PROP_Parse_Target=synthesis", source})["files"][0]),
-            synthesisOnly);
-
+  const std::vector<std::string> both{"Entity|always_there", "Entity|model_only"};
+  const std::vector<std::string> synthesisOnly{"Entity|always_there"};
+  EXPECT_EQ(UnitKeys({source}), both);
+  EXPECT_EQ(UnitKeys({"--target", "synthesis", source}), synthesisOnly);
+  EXPECT_EQ(UnitKeys({"--property", "PROP_Parse_Target=synthesis", source}), synthesisOnly);
   ScopedTextFile project(
       R"({"properties": {"PROP_Parse_Target": "synthesis"}, "files": [{"path": ")" + source + R"("}]})",
       "project.json");
-  EXPECT_EQ(KeysOf(UnitsOf({"-P", project.path()})["files"][0]), synthesisOnly);
+  EXPECT_EQ(UnitKeys({"-P", project.path()}), synthesisOnly);
   // The command line has the last word.
-  EXPECT_EQ(KeysOf(UnitsOf({"-P", project.path(), "--target", "simulation"})["files"][0]), both);
+  EXPECT_EQ(UnitKeys({"-P", project.path(), "--target", "simulation"}), both);
 }
 
-TEST(Units, TextOutputIsOneLinePerUnitInLineOrder) {
-  CliResult result = RunQuillon({"units", DataPath("mixed/top.vhd")});
-  EXPECT_EQ(result.status, 0) << result.err;
-  const std::string path = DataPath("mixed/top.vhd");
-  EXPECT_EQ(Lines(result.out), (std::vector<std::string>{
-                                   path + ":1: Library ieee (library work)",
-                                   path + ":2: Use ieee.std_logic_1164.all (library work)",
-                                   path + ":5: Entity Entity|top (library work)",
-                                   path + ":8: Architecture Architecture|top|rtl (library work)",
-                                   path + ":11: EntityInstantiation u_core (library work)",
-                               }));
+TEST(Units, VerilogFilesAreCompiledInTheOrderGivenWithMacrosAndIncludeDirectories) {
+  const std::string first = DataPath("verilog/first.v"), second = DataPath("verilog/second.v");
+  // first.v defines the macro that second.v tests.
+  EXPECT_EQ(UnitKeys({first, second}), (std::vector<std::string>{"Module|first", "Module|second"}));
+  EXPECT_EQ(UnitKeys({second, first}), (std::vector<std::string>{"Module|first"}));
+
+  // A missing include file is an error of the compiler; a file's units come in store-key order.
+  const std::string gated = DataPath("verilog/gated.v"), include = DataPath("verilog/include");
+  const std::vector<std::string> both{"Module|from_command_line", "Module|from_include"};
+  EXPECT_EQ(UnitKeys({gated}, {}, 1), std::vector<std::string>{});
+  EXPECT_EQ(UnitKeys({"-D", "FROM_COMMAND_LINE", gated}, {}, 1), std::vector<std::string>{both[0]});
+  EXPECT_EQ(UnitKeys({"-I", include, gated}), std::vector<std::string>{both[1]});
+  EXPECT_EQ(UnitKeys({"-D", "FROM_COMMAND_LINE", "-I", include, gated}), both);
+  EXPECT_EQ(UnitKeys({"-f", "gated.f"}, DataPath("verilog")), both);
 }
 
 TEST(Units, OutputFileTakesTheAnswerInsteadOfStandardOutput) {
@@ -133,44 +79,20 @@ TEST(Units, OutputFileTakesTheAnswerInsteadOfStandardOutput) {
       RunQuillon({"--format", "json", "-o", placeholder.path(), "units", DataPath("mixed/top.vhd")});
   EXPECT_EQ(result.status, 0) << result.err;
   EXPECT_EQ(result.out, "");
-  std::ifstream in(placeholder.path());
-  std::string written((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
-  EXPECT_EQ(ParsedJson(written), UnitsOf({DataPath("mixed/top.vhd")}));
+  EXPECT_EQ(ReadText(placeholder.path()),
+            RunQuillon({"--format", "json", "units", DataPath("mixed/top.vhd")}).out);
 }
 
 TEST(Units, VerboseAddsTheDeveloperTexts) {
-  const std::vector<std::pair<std::string, std::string>> noDebugVariable{{"QUILLON_DEBUG", ""}};
   const std::vector<std::string> args{"--plugin", "PLUGIN_Unheard", "units", DataPath("mixed/top.vhd")};
-  std::vector<std::string> verbose{"--verbose"};
-  verbose.insert(verbose.end(), args.begin(), args.end());
   const std::string text = "Parser PLUGIN_Unheard not found. Using PLUGIN_General";
-
-  CliResult plain = RunQuillon(CliRun{args, {}, noDebugVariable});
+  CliResult plain = RunQuillon(CliRun{args, {}, {{"QUILLON_DEBUG", ""}}});
   EXPECT_EQ(plain.status, 0) << plain.err;
   EXPECT_EQ(plain.err.find(text), std::string::npos) << plain.err;
-  CliResult shown = RunQuillon(CliRun{verbose, {}, noDebugVariable});
+  CliResult shown =
+      RunQuillon(CliRun{{"--verbose", args[0], args[1], args[2], args[3]}, {}, {{"QUILLON_DEBUG", ""}}});
   EXPECT_EQ(shown.status, 0) << shown.err;
   EXPECT_NE(shown.err.find(text), std::string::npos) << shown.err;
-}
-
-TEST(Units, VhdlUnitsListTheStoreKeysOfTheirUseClauses) {
-  ScopedTextFile source(
-      "library ieee;\n"
-      "use ieee.std_logic_1164.all;\n"
-      "entity e is end;\n"
-      "architecture a of e is\n"
-      "  use work.p.all;\n"
-      "begin\n"
-      "end;\n",
-      "e.vhd");
-  Json units = UnitsOf({source.path()});
-  ASSERT_EQ(units["files"].size(), 1u);
-  std::map<std::string, Json> usesByType;
-  for (const Json& unit : units["files"][0]["units"]) usesByType[unit["type"]] = unit.value("uses", Json());
-  EXPECT_EQ(usesByType["Entity"], Json::array({"||Use|ieee|std_logic_1164|all|"}));
-  EXPECT_EQ(usesByType["Architecture"], Json::array({"||Use|work|p|all|"}));
-  EXPECT_TRUE(usesByType["Library"].is_null());
-  EXPECT_TRUE(usesByType["Use"].is_null());
 }
 
 }  // namespace

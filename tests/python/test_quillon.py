@@ -10,18 +10,16 @@ import quillon
 
 SOURCE = os.environ.get("QUILLON_SOURCE_DIR", os.path.join(os.path.dirname(__file__), "..", ".."))
 EXAMPLE = os.path.join(SOURCE, "examples", "project.json")
-DATA = os.path.join(SOURCE, "tests", "data")
 
 
 def data(*parts):
-    return os.path.normpath(os.path.join(DATA, *parts))
+    return os.path.normpath(os.path.join(SOURCE, "tests", "data", *parts))
 
 
 def written(folder, name, text):
-    path = os.path.join(folder, name)
-    with open(path, "w") as out:
+    with open(os.path.join(folder, name), "w") as out:
         out.write(text)
-    return path
+    return os.path.join(folder, name)
 
 
 class ExampleProjectTest(unittest.TestCase):
@@ -35,10 +33,9 @@ class ExampleProjectTest(unittest.TestCase):
 
     def test_units_carry_file_library_and_line(self):
         units = {unit.key: unit for unit in self.project.units()}
-        timing = units["PackageDecl|timing_pkg"]
+        timing, crossing = units["PackageDecl|timing_pkg"], units["Architecture|crossing|structural"]
         self.assertEqual(timing.library, "common")
         self.assertTrue(timing.file.endswith("examples/common/timing_pkg.vhd"))
-        crossing = units["Architecture|crossing|structural"]
         self.assertEqual((crossing.type, crossing.library, crossing.line), ("Architecture", "work", 16))
         self.assertEqual(units["Module|chime"].line, 4)
         uses = [unit for unit in self.project.units() if unit.type == "Use" and unit.file == crossing.file]
@@ -46,9 +43,7 @@ class ExampleProjectTest(unittest.TestCase):
         self.assertIn("Unit(type='Module', name='chime'", repr(units["Module|chime"]))
 
     def test_tree_has_instances_files_and_shared_nodes(self):
-        root = self.project.tree()
-        tops = [node.unit for node in root.children]
-        self.assertIn("crossing", tops)
+        self.assertIn("crossing", [node.unit for node in self.project.tree().children])
         crossing = self.project.tree("crossing")
         self.assertEqual((crossing.unit, crossing.architecture, crossing.library, crossing.line),
                          ("crossing", "structural", "work", 16))
@@ -56,31 +51,29 @@ class ExampleProjectTest(unittest.TestCase):
         self.assertEqual(set(labels), {"input", "control", "cars", "people", "bell"})
         self.assertTrue(labels["bell"].file.endswith("chime.v"))
         self.assertEqual(labels["cars"].kind, "work:Architecture")
-        timer = [node for node in labels["control"].walk() if node.instance == "timer"]
-        self.assertEqual([node.unit for node in timer], ["phase_timer"])
+        self.assertEqual([node.unit for node in labels["control"].walk() if node.instance == "timer"],
+                         ["phase_timer"])
         light = [node for node in crossing.walk() if node.unit == "light_pkg"]
         self.assertEqual(len(light), 1, "a shared package node is one object, walked once")
         self.assertIn("instance='bell'", repr(labels["bell"]))
 
-    def test_order_whole_and_for_one_unit(self):
+    def test_order_and_export_whole_and_for_one_unit(self):
         order = self.project.order()
         names = [os.path.basename(entry.path) for entry in order]
-        self.assertEqual(names[0], "timing_pkg.vhd")
-        self.assertEqual(names[-1], "crossing.vhd")
+        self.assertEqual((names[0], names[-1]), ("timing_pkg.vhd", "crossing.vhd"))
         self.assertLess(names.index("light_pkg.vhd"), names.index("lamp_driver.vhd"))
         self.assertEqual({entry.language for entry in order}, {"VHDL", "Verilog"})
-        controller = [(f.library, os.path.basename(f.path)) for f in self.project.order("controller")]
-        self.assertEqual(controller, [("common", "timing_pkg.vhd"), ("work", "phase_timer.vhd"),
-                                      ("work", "light_pkg.vhd"), ("work", "controller.vhd")])
+        controller = [("common", "timing_pkg.vhd"), ("work", "phase_timer.vhd"), ("work", "light_pkg.vhd"),
+                      ("work", "controller.vhd")]
+        self.assertEqual([(f.library, os.path.basename(f.path)) for f in self.project.order("controller")],
+                         controller)
         alone = self.project.order("Architecture|controller|rtl", alone=True)
         self.assertLess(len(alone), len(controller) + 1)
         self.assertTrue(alone[-1].path.endswith("controller.vhd"))
 
-    def test_export_matches_the_order_and_refuses_unknown_formats(self):
         tcl = self.project.export("tcl", "controller")
-        listed = [line.split()[1] for line in tcl.splitlines() if line.startswith("  {")]
-        self.assertEqual([os.path.basename(path) for path in listed],
-                         ["timing_pkg.vhd", "phase_timer.vhd", "light_pkg.vhd", "controller.vhd"])
+        listed = [os.path.basename(line.split()[1]) for line in tcl.splitlines() if line.startswith("  {")]
+        self.assertEqual(listed, [name for _, name in controller])
         self.assertIn("set quillon_top {work controller", tcl)
         self.assertIn("crossing.vhd", self.project.export("make"))
         with self.assertRaises(quillon.Error):
@@ -92,10 +85,8 @@ class ExampleProjectTest(unittest.TestCase):
                          [(1, "clk", "in"), (2, "button", "in")])
         self.assertEqual([port.name for port in self.project.ports("chime")], ["clk", "walk", "tone"])
 
-    def test_the_example_is_sound(self):
+    def test_the_example_is_sound_and_errors_are_exceptions_with_their_messages(self):
         self.assertEqual([d for d in self.project.diagnostics() if d.severity == "error"], [])
-
-    def test_errors_are_exceptions_with_their_messages(self):
         with self.assertRaises(quillon.Error) as caught:
             self.project.ports("nowhere")
         self.assertIn("unknown design unit 'nowhere'", str(caught.exception))
@@ -108,32 +99,27 @@ class ExampleProjectTest(unittest.TestCase):
 
 
 class FixtureTest(unittest.TestCase):
-    def test_files_tuples_and_libraries(self):
+    def test_files_tuples_libraries_and_port_ranges(self):
         project = quillon.Project([data("ports", "mixer.vhd"), (data("ports", "gauge.vhd"), "meters")],
                                   libraries={"sizes": [data("ports", "sizes_pkg.vhd")]})
         libraries = {os.path.basename(unit.file): unit.library for unit in project.units()}
         self.assertEqual(libraries, {"mixer.vhd": "work", "gauge.vhd": "meters", "sizes_pkg.vhd": "sizes"})
 
-    def test_port_ranges_follow_generic_defaults(self):
-        names = ("sizes_pkg.vhd", "gauge.vhd", "mixer.vhd", "pair.v")
-        project = quillon.Project([data("ports", name) for name in names])
+        project = quillon.Project([data("ports", name) for name in ("sizes_pkg.vhd", "gauge.vhd", "mixer.vhd",
+                                                                    "pair.v")])
         ports = {port.name: port for port in project.ports("mixer")}
-        self.assertEqual((ports["samples"].high, ports["samples"].low), (7, 0))
-        self.assertEqual((ports["level"].high, ports["level"].low), (7, 0))
-        self.assertIsNone(ports["clk"].low)
+        self.assertEqual([(ports[name].high, ports[name].low) for name in ("samples", "level", "clk")],
+                         [(7, 0), (7, 0), (None, None)])
         self.assertEqual(ports["probe"].direction, "inout")
-        stage = {port.name: port for port in project.ports("stage")}
-        self.assertEqual((stage["d"].high, stage["d"].low), (3, 0))
+        self.assertEqual([(port.high, port.low) for port in project.ports("stage") if port.name == "d"], [(3, 0)])
         with self.assertRaisesRegex(quillon.Error, "gauge"):
             project.ports("gauge")
 
     def test_diagnostics_and_messages_of_broken_designs(self):
         with tempfile.TemporaryDirectory() as folder:
-            cycle = quillon.Project([
-                written(folder, "a.vhd", "use work.pkg_b.all;\npackage pkg_a is end;\n"),
-                written(folder, "b.vhd", "use work.pkg_a.all;\npackage pkg_b is end;\n")])
-            found = [(d.severity, d.code) for d in cycle.diagnostics()]
-            self.assertEqual(found, [("error", "no-valid-order")])
+            cycle = quillon.Project([written(folder, "a.vhd", "use work.pkg_b.all;\npackage pkg_a is end;\n"),
+                                     written(folder, "b.vhd", "use work.pkg_a.all;\npackage pkg_b is end;\n")])
+            self.assertEqual([(d.severity, d.code) for d in cycle.diagnostics()], [("error", "no-valid-order")])
             self.assertEqual(len(cycle.order()), 2, "a cut order still lists every file")
             warnings = [m.text for m in cycle.messages() if m.severity == "warning"]
             self.assertTrue(any("circular dependency" in text for text in warnings))
@@ -145,11 +131,9 @@ class FixtureTest(unittest.TestCase):
 
     def test_strict_and_external_libraries_shape_the_findings(self):
         with tempfile.TemporaryDirectory() as folder:
-            top = written(folder, "top.vhd",
-                          "library vendor;\nuse vendor.parts.all;\nentity top is end;\n"
-                          "architecture rtl of top is\n"
-                          "  component mystery port (a : in bit); end component;\n  signal s : bit;\n"
-                          "begin\n  u : mystery port map (a => s);\nend;\n")
+            top = written(folder, "top.vhd", "library vendor;\nuse vendor.parts.all;\nentity top is end;\n"
+                          "architecture rtl of top is\n  component mystery port (a : in bit); end component;\n"
+                          "  signal s : bit;\nbegin\n  u : mystery port map (a => s);\nend;\n")
             found = lambda **options: [(d.severity, d.code, d.line) for d in
                                        quillon.Project(top, **options).diagnostics()]
             self.assertEqual(found(), [("warning", "black-box", 8), ("error", "unknown-library", 1)])
@@ -159,17 +143,14 @@ class FixtureTest(unittest.TestCase):
     def test_file_list_defines_and_include_dirs(self):
         with tempfile.TemporaryDirectory() as folder:
             written(folder, "width.vh", "`define WIDE\n")
-            source = written(folder, "switch.v",
-                             "`include \"width.vh\"\n`ifdef WIDE\nmodule wide; endmodule\n"
-                             "`else\nmodule narrow; endmodule\n`endif\n"
-                             "`ifdef EXTRA\nmodule extra; endmodule\n`endif\n")
+            source = written(folder, "switch.v", "`include \"width.vh\"\n`ifdef WIDE\nmodule wide; endmodule\n"
+                             "`else\nmodule narrow; endmodule\n`endif\n`ifdef EXTRA\nmodule extra; endmodule\n`endif\n")
             keys = lambda **options: {u.key for u in quillon.Project(**options).units() if u.type == "Module"}
             self.assertEqual(keys(files=[source], include_dirs=folder), {"Module|wide"})
-            self.assertEqual(keys(files=source, include_dirs=[folder], defines={"EXTRA": None}),
-                             {"Module|wide", "Module|extra"})
-            listed = written(folder, "sources.f",
-                             f"+incdir+{folder}\n+define+EXTRA=1\n// the design\n{source}\n")
-            self.assertEqual(keys(file_list=listed), {"Module|wide", "Module|extra"})
+            both = {"Module|wide", "Module|extra"}
+            self.assertEqual(keys(files=source, include_dirs=[folder], defines={"EXTRA": None}), both)
+            listed = written(folder, "sources.f", f"+incdir+{folder}\n+define+EXTRA=1\n// the design\n{source}\n")
+            self.assertEqual(keys(file_list=listed), both)
             with self.assertRaises(ValueError):
                 quillon.Project([source], defines=["A;B"])
 
@@ -188,12 +169,8 @@ class FixtureTest(unittest.TestCase):
         gc.collect()
         before = quillon._core._live_objects()
         results = []
-
-        def work():
-            project = quillon.Project(project=EXAMPLE)
-            results.append(len(project.order()))
-
-        threads = [threading.Thread(target=work) for _ in range(3)]
+        threads = [threading.Thread(target=lambda: results.append(len(quillon.Project(project=EXAMPLE).order())))
+                   for _ in range(3)]
         for thread in threads:
             thread.start()
         for thread in threads:

@@ -1,0 +1,3 @@
+architecture zeta of leaf is
+begin
+end architecture;

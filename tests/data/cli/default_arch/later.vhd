@@ -1,0 +1,3 @@
+architecture late of leaf is
+begin
+end architecture;

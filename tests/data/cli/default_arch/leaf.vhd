@@ -1,0 +1,2 @@
+entity leaf is
+end entity;

@@ -1,0 +1,3 @@
+architecture alpha of leaf is
+begin
+end architecture;

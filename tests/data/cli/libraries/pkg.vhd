@@ -1,0 +1,2 @@
+package pkg is
+end package;

@@ -1,0 +1,2 @@
+entity Other is
+end entity;

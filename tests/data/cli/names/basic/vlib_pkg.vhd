@@ -1,0 +1,2 @@
+package ScoreBoardPkg_slv is
+end package ScoreBoardPkg_slv;

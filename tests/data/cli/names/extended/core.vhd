@@ -1,0 +1,4 @@
+entity \Core\ is
+end entity;
+entity \CORE\ is
+end entity;

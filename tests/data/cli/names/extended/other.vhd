@@ -1,0 +1,3 @@
+use work.\TAB\.all;
+entity folded is
+end entity;

@@ -1,0 +1,2 @@
+package \Tab\ is
+end package;

@@ -1,0 +1,3 @@
+use work.\Tab\.all;
+entity exact is
+end entity;

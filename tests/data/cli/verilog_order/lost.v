@@ -1,0 +1,3 @@
+module top;
+  lost u_lost();
+endmodule

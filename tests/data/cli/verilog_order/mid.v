@@ -1,0 +1,6 @@
+`ifdef HAVE_TOP
+module mid;
+  leaf u_leaf();
+  vh u_vh();
+endmodule
+`endif

@@ -1,0 +1,6 @@
+`define HAVE_TOP 1
+module top;
+  mid u_mid();
+endmodule
+module leaf;
+endmodule
