@@ -37,14 +37,13 @@ Prjrep::AutoRelease<Vad::IHdlFileIterator> FilesOf(Vad::IHdlProject* project) {
 }
 
 // The records are listed first so that their large descriptions are built in place, never moved.
-std::vector<UnitInfo> UnitsOf(Vad::IHdlFile* file) {
+std::vector<UnitInfo> UnitsOf(Vad::IHdlFile* file, UnitRecordReader& reader) {
   std::vector<UnitInfo> units;
   Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> iterator;
   if (file->getDesignUnits(nullptr, iterator.Out()) != CitI::kOk) return units;
   std::vector<Vad::IHdlDesignUnit*> records;
   ForEachIn(iterator.Get(), [&](Vad::IHdlDesignUnit* unit) { records.push_back(unit); });
   units.resize(records.size());
-  UnitRecordReader reader;
   for (std::size_t i = 0; i < records.size(); ++i) reader.Read(records[i], units[i]);
   return units;
 }
@@ -128,12 +127,14 @@ CitI::Result ProjectReader::Parse(ParseCache* cache) {
   return result;
 }
 
-std::vector<FileInfo> ProjectReader::Files() const {
+std::vector<FileInfo> ProjectReader::Files(UnitFields fields) const {
   std::vector<FileInfo> infos;
+  infos.reserve(FileCount());
   auto files = FilesOf(project_);
+  UnitRecordReader reader(fields == UnitFields::kAll);
   ForEachIn(files.Get(), [&](Vad::IHdlFile* file) {
     OrderEntry facts = FileFacts::Describe(file);
-    infos.push_back({facts.path, facts.plugin, facts.library, UnitsOf(file)});
+    infos.push_back({std::move(facts.path), std::move(facts.plugin), std::move(facts.library), UnitsOf(file, reader)});
   });
   return infos;
 }

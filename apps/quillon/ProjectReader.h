@@ -28,8 +28,12 @@ class ProjectReader {
   CitI::Result Parse(ParseCache* cache = nullptr);
   // Entities, architectures, packages, package bodies, modules and generics of the last Parse.
   Vad::IHdlDesignUnitSet* designUnits() const { return designUnits_.Get(); }
+  enum class UnitFields {
+    kAll,
+    kWithoutLinks,  // no parent keys and use lists (UnitRecordReader)
+  };
   // Every file of the project's file set, with every record of its unit set. Does not parse.
-  std::vector<FileInfo> Files() const;
+  std::vector<FileInfo> Files(UnitFields fields = UnitFields::kAll) const;
 
   // The compile order of the whole project, or for `unit` (byUnit: the unit alone, else the unit
   // and what it needs).

@@ -30,6 +30,8 @@ class RecordingArchive final : public Prjrep::IArchive {
   static constexpr std::int32_t kVersion = 9;
 
   const std::vector<Value>& values() const { return values_; }
+  // Forgets the values but keeps their room, so that one archive serves many records.
+  void Clear() { values_.clear(); }
 
   // Lives on the caller's stack: it answers no reference-count interface.
   CitI::IInterface* QueryInterface(const Port::XUID& id) override;

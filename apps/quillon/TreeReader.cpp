@@ -34,14 +34,6 @@ std::optional<std::string> TypeOfKey(const std::optional<std::string>& key) {
   return key->substr(0, key->find('|'));
 }
 
-// The path and library of the element's file; both unset when it has none.
-void DescribeFileOf(Vad::IHdlElement* element, TreeNodeInfo& info) {
-  Prjrep::AutoRelease<Vad::IHdlFile> file;
-  if (!element || element->GetFile(file.Out()) != CitI::kOk || !file) return;
-  info.file = FileFacts::PathOf(file.Get());
-  info.library = FileFacts::LibraryOf(file.Get());
-}
-
 std::vector<Vad::IHdlNetListNode*> ChildrenOf(Vad::IHdlNetListNode* node) {
   std::vector<Vad::IHdlNetListNode*> children;
   Prjrep::AutoRelease<Vad::IHdlNetListNodeIterator> iterator;
@@ -52,36 +44,67 @@ std::vector<Vad::IHdlNetListNode*> ChildrenOf(Vad::IHdlNetListNode* node) {
   return children;
 }
 
+// Describes nodes; the path and library of each file are read once, as many nodes share a file.
+class NodeReader {
+ public:
+  explicit NodeReader(TreeReader::Detail detail) : detail_(detail) {}
+
+  TreeNodeInfo Describe(Vad::IHdlNetListNode* node) {
+    TreeNodeInfo info;
+    if (detail_ != TreeReader::Detail::kLinks) DescribeLabels(node, info);
+    info.unit = TextOf(node, &Vad::IHdlNetListNode::GetUnitName);
+    info.libraryCell = node->IsLibraryCell();
+    Vad::IHdlElement* element = node->GetElement();
+    info.elementKey = ElementKeyOf(element);
+    info.elementType = TypeOfKey(info.elementKey);
+    DescribeFileOf(element, info);
+    return info;
+  }
+
+ private:
+  struct FileFactsOf {
+    std::string path;
+    std::string library;
+  };
+
+  void DescribeLabels(Vad::IHdlNetListNode* node, TreeNodeInfo& info) const {
+    auto* internal = Prjrep::QueryAs<Vad::IHdlNetListNodeInternal>(node);
+    auto* tcl = Prjrep::QueryAs<UtilI::ITclCollectable>(node);
+    info.name = TextOf(internal, &Vad::IHdlNetListNodeInternal::GetName);
+    info.kind = TextOf(internal, &Vad::IHdlNetListNodeInternal::GetKind);
+    info.architecture = TextOf(node, &Vad::IHdlNetListNode::GetArchitectureName);
+    info.instance = TextOf(node, &Vad::IHdlNetListNode::GetInstanceName);
+    if (detail_ == TreeReader::Detail::kLabelsAndPaths) info.path = TextOf(tcl, &UtilI::ITclCollectable::GetName);
+    info.type = TextOf(tcl, &UtilI::ITclCollectable::GetType);
+    info.partition =
+        TextOf(Prjrep::QueryAs<Vad::IHdlPartitionData>(node), &Vad::IHdlPartitionData::GetPartition);
+  }
+
+  // The path and library of the element's file; both unset when it has none.
+  void DescribeFileOf(Vad::IHdlElement* element, TreeNodeInfo& info) {
+    Prjrep::AutoRelease<Vad::IHdlFile> file;
+    if (!element || element->GetFile(file.Out()) != CitI::kOk || !file) return;
+    auto [facts, added] = files_.try_emplace(file.Get());
+    if (added) facts->second = {FileFacts::PathOf(file.Get()), FileFacts::LibraryOf(file.Get())};
+    info.file = facts->second.path;
+    info.library = facts->second.library;
+  }
+
+  TreeReader::Detail detail_;
+  // The project holds its files while the tree is read.
+  std::unordered_map<Vad::IHdlFile*, FileFactsOf> files_;
+};
+
 }  // namespace
 
-TreeNodeInfo TreeReader::Describe(Vad::IHdlNetListNode* node, bool withPaths) {
-  TreeNodeInfo info;
-  auto* internal = Prjrep::QueryAs<Vad::IHdlNetListNodeInternal>(node);
-  auto* tcl = Prjrep::QueryAs<UtilI::ITclCollectable>(node);
-  info.name = TextOf(internal, &Vad::IHdlNetListNodeInternal::GetName);
-  info.kind = TextOf(internal, &Vad::IHdlNetListNodeInternal::GetKind);
-  info.unit = TextOf(node, &Vad::IHdlNetListNode::GetUnitName);
-  info.architecture = TextOf(node, &Vad::IHdlNetListNode::GetArchitectureName);
-  info.instance = TextOf(node, &Vad::IHdlNetListNode::GetInstanceName);
-  if (withPaths) info.path = TextOf(tcl, &UtilI::ITclCollectable::GetName);
-  info.type = TextOf(tcl, &UtilI::ITclCollectable::GetType);
-  info.libraryCell = node->IsLibraryCell();
-  info.partition =
-      TextOf(Prjrep::QueryAs<Vad::IHdlPartitionData>(node), &Vad::IHdlPartitionData::GetPartition);
-  Vad::IHdlElement* element = node->GetElement();
-  info.elementKey = ElementKeyOf(element);
-  info.elementType = TypeOfKey(info.elementKey);
-  DescribeFileOf(element, info);
-  return info;
-}
-
-TreeInfo TreeReader::ReadTree(Vad::IHdlNetListNode* root, bool withPaths) {
+TreeInfo TreeReader::ReadTree(Vad::IHdlNetListNode* root, Detail detail) {
   struct Pending {
     Vad::IHdlNetListNode* node;
     std::size_t parent;
     std::size_t position;
   };
   TreeInfo tree;
+  NodeReader reader(detail);
   // Where each node was met first; only nodes with several parents are met again.
   std::unordered_map<Vad::IHdlNetListNode*, std::size_t> first;
   std::vector<Pending> pending{{root, 0, 0}};
@@ -89,7 +112,7 @@ TreeInfo TreeReader::ReadTree(Vad::IHdlNetListNode* root, bool withPaths) {
     Pending next = pending.back();
     pending.pop_back();
     std::size_t index = tree.nodes.size();
-    tree.nodes.push_back(Describe(next.node, withPaths));
+    tree.nodes.push_back(reader.Describe(next.node));
     TreeNodeInfo& info = tree.nodes.back();
     info.parent = next.parent;
     info.position = next.position;
@@ -107,13 +130,21 @@ TreeInfo TreeReader::ReadTree(Vad::IHdlNetListNode* root, bool withPaths) {
 }
 
 CitI::Result TreeReader::Read(Vad::IHdlProject* project, TreeInfo& tree, bool withPaths) {
+  return ReadRoot(project, tree, withPaths ? Detail::kLabelsAndPaths : Detail::kLabels);
+}
+
+CitI::Result TreeReader::ReadLinks(Vad::IHdlProject* project, TreeInfo& tree) {
+  return ReadRoot(project, tree, Detail::kLinks);
+}
+
+CitI::Result TreeReader::ReadRoot(Vad::IHdlProject* project, TreeInfo& tree, Detail detail) {
   auto* elaboration = Prjrep::QueryAs<Vad::IHdlElaborationData>(project);
   if (!elaboration) return CitI::kFail;
   Prjrep::AutoRelease<Vad::IHdlNetListNode> node;
   CitI::Result result = elaboration->getHierarchyRoot(node.Out());
   if (result != CitI::kOk) return result;
   if (!node) return CitI::kFail;
-  tree = ReadTree(node.Get(), withPaths);
+  tree = ReadTree(node.Get(), detail);
   return CitI::kOk;
 }
 

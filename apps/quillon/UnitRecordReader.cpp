@@ -112,9 +112,9 @@ bool TakeOwnPart(ValueCursor& cursor, RecordFields& fields) {
   return true;
 }
 
-bool ReadFields(Prjrep::IPersist* record, RecordFields& fields) {
+bool ReadFields(Prjrep::IPersist* record, RecordingArchive& archive, RecordFields& fields) {
   if (!record) return false;
-  RecordingArchive archive;
+  archive.Clear();
   {
     // Saving a unit without a parent is reported as a developer text, which says nothing here.
     Port_DebugCapture silence;
@@ -212,7 +212,7 @@ const std::optional<std::string>& UnitRecordReader::ParentKeyOf(Prjrep::IPersist
   auto [entry, added] = parentKeys_.try_emplace(parent);
   if (added) {
     RecordFields fields;
-    if (ReadFields(parent, fields) || !fields.storeKey.empty()) entry->second = std::move(fields.storeKey);
+    if (ReadFields(parent, archive_, fields) || !fields.storeKey.empty()) entry->second = std::move(fields.storeKey);
   }
   return entry->second;
 }
@@ -220,7 +220,7 @@ const std::optional<std::string>& UnitRecordReader::ParentKeyOf(Prjrep::IPersist
 bool UnitRecordReader::Read(CitI::IInterface* unit, UnitInfo& info) {
   info.key = DesignUnitKeyOf(unit);
   RecordFields fields;
-  bool complete = ReadFields(Prjrep::QueryAs<Prjrep::IPersist>(unit), fields);
+  bool complete = ReadFields(Prjrep::QueryAs<Prjrep::IPersist>(unit), archive_, fields);
   info.type = TypeName(fields.type);
   info.name = std::move(fields.name);
   info.storeKey = std::move(fields.storeKey);
@@ -228,8 +228,10 @@ bool UnitRecordReader::Read(CitI::IInterface* unit, UnitInfo& info) {
   info.unitFlag = fields.unitFlag;
   info.inGenerate = fields.inGenerate;
   info.partition = std::move(fields.partition);
-  if (fields.parent) info.parent = ParentKeyOf(fields.parent);
-  info.uses = UseStoreKeysOf(unit);
+  if (withLinks_) {
+    if (fields.parent) info.parent = ParentKeyOf(fields.parent);
+    info.uses = UseStoreKeysOf(unit);
+  }
   TakeKindFields(fields, info);
   return complete;
 }
