@@ -273,13 +273,15 @@ int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount,
 }
 
 int CommandRunner::Units(ProjectReader& reader, std::ostream& out) {
-  const bool json = options_.format == Format::kJson;
-  std::vector<FileInfo> files = reader.Files(json ? ProjectReader::UnitFields::kAll : kUnitsWithoutLinks);
-  shownPaths_.Apply(files);
-  if (json) {
+  if (options_.format == Format::kJson) {
+    std::vector<FileInfo> files = reader.Files();
+    shownPaths_.Apply(files);
     JsonOutput::Units(files, Messages(), out);
   } else {
-    TextOutput::Units(files, out);
+    reader.VisitFiles(kUnitsWithoutLinks, [&](FileInfo& file) {
+      shownPaths_.Apply(file);
+      TextOutput::Units(file, out);
+    });
   }
   return Finished();
 }
