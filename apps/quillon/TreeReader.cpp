@@ -49,8 +49,7 @@ class NodeReader {
  public:
   explicit NodeReader(TreeReader::Detail detail) : detail_(detail) {}
 
-  TreeNodeInfo Describe(Vad::IHdlNetListNode* node) {
-    TreeNodeInfo info;
+  void Describe(Vad::IHdlNetListNode* node, TreeNodeInfo& info) {
     if (detail_ != TreeReader::Detail::kLinks) DescribeLabels(node, info);
     info.unit = TextOf(node, &Vad::IHdlNetListNode::GetUnitName);
     info.libraryCell = node->IsLibraryCell();
@@ -58,7 +57,6 @@ class NodeReader {
     info.elementKey = ElementKeyOf(element);
     info.elementType = TypeOfKey(info.elementKey);
     DescribeFileOf(element, info);
-    return info;
   }
 
  private:
@@ -97,34 +95,46 @@ class NodeReader {
 
 }  // namespace
 
+// The shape first (which node goes where), then every node described in its place: the
+// descriptions are large, and growing a list of them moved each one again and again.
 TreeInfo TreeReader::ReadTree(Vad::IHdlNetListNode* root, Detail detail) {
-  struct Pending {
+  struct Placed {
     Vad::IHdlNetListNode* node;
     std::size_t parent;
     std::size_t position;
+    std::size_t children = 0;
+    std::optional<std::size_t> sharedWith = std::nullopt;
   };
-  TreeInfo tree;
-  NodeReader reader(detail);
+  std::vector<Placed> placed;
   // Where each node was met first; only nodes with several parents are met again.
   std::unordered_map<Vad::IHdlNetListNode*, std::size_t> first;
-  std::vector<Pending> pending{{root, 0, 0}};
+  std::vector<Placed> pending{{root, 0, 0}};
   while (!pending.empty()) {
-    Pending next = pending.back();
+    placed.push_back(pending.back());
     pending.pop_back();
-    std::size_t index = tree.nodes.size();
-    tree.nodes.push_back(reader.Describe(next.node));
-    TreeNodeInfo& info = tree.nodes.back();
-    info.parent = next.parent;
-    info.position = next.position;
-    if (index > 0) tree.nodes[next.parent].children[next.position] = index;
-    auto [seen, isFirst] = first.try_emplace(next.node, index);
+    Placed& next = placed.back();
+    auto [seen, isFirst] = first.try_emplace(next.node, placed.size() - 1);
     if (!isFirst) {
-      info.sharedWith = seen->second;
+      next.sharedWith = seen->second;
       continue;
     }
     std::vector<Vad::IHdlNetListNode*> children = ChildrenOf(next.node);
-    info.children.resize(children.size());
-    for (std::size_t i = children.size(); i-- > 0;) pending.push_back({children[i], index, i});
+    next.children = children.size();
+    for (std::size_t i = children.size(); i-- > 0;) pending.push_back({children[i], placed.size() - 1, i});
+  }
+
+  TreeInfo tree;
+  tree.nodes.resize(placed.size());
+  NodeReader reader(detail);
+  for (std::size_t index = 0; index < placed.size(); ++index) {
+    const Placed& shape = placed[index];
+    TreeNodeInfo& info = tree.nodes[index];
+    reader.Describe(shape.node, info);
+    info.parent = shape.parent;
+    info.position = shape.position;
+    info.sharedWith = shape.sharedWith;
+    info.children.resize(shape.children);
+    if (index > 0) tree.nodes[shape.parent].children[shape.position] = index;
   }
   return tree;
 }
