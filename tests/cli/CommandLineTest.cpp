@@ -69,6 +69,12 @@ TEST(CommandLine, UnreadableSourcesAreRejectedWithStatusTwo) {
   }
 }
 
+TEST(CommandLine, ProjectEntryThatIsADirectoryIsRejected) {
+  ScopedTextFile project("{\"files\": [{\"path\": \"" + DataPath("mixed") + "\"}]}", "project.json");
+  ExpectOneLineNaming(RunQuillon({"units", "-P", project.path()}),
+                      DataPath("mixed") + " is a directory, not a source file");
+}
+
 TEST(CommandLine, FileListNamesTheLineOfAMissingSource) {
   ScopedTextFile list("lane.vhd\nnot_here.vhd\n");
   CliResult result = RunQuillon(CliRun{{"units", "-f", list.path()}, DataPath("mixed"), {}});

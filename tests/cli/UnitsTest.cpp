@@ -2,6 +2,7 @@
 // and the JSON and text answers.
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <fstream>
 #include <iterator>
 #include <map>
@@ -55,6 +56,33 @@ std::vector<std::string> KeysOf(const Json& file) {
 TEST(Units, ProjectFileGivesEveryRecordOfEveryFile) {
   Json units = UnitsOf({"-P", DataPath("mixed/project.json")});
   EXPECT_EQ(units, ParsedJson(ExpectedText("mixed/expected/units.json")));
+}
+
+// The text listing is written file by file while the JSON one reads every file first: both name
+// the same units of the same files, the text one in line order.
+TEST(Units, TextListingNamesWhatTheJsonListingHolds) {
+  const std::vector<std::string> sources{"-P", DataPath("mixed/project.json")};
+  std::vector<std::string> textArgs{"units"};
+  textArgs.insert(textArgs.end(), sources.begin(), sources.end());
+  CliResult text = RunQuillon(CliRun{textArgs, {}, {}});
+  ASSERT_EQ(text.status, 0) << text.err;
+
+  const Json listing = UnitsOf(sources);
+  std::string expected;
+  for (const Json& file : listing["files"]) {
+    std::vector<Json> units(file["units"].begin(), file["units"].end());
+    std::stable_sort(units.begin(), units.end(),
+                     [](const Json& a, const Json& b) { return a["line"] < b["line"]; });
+    for (const Json& unit : units) {
+      std::string key = unit["key"];
+      std::string shown = key.find('|') == std::string::npos ? unit["name"].get<std::string>() : key;
+      expected += file["path"].get<std::string>() + ":" + std::to_string(unit["line"].get<int>()) + ": " +
+                  unit["type"].get<std::string>() + " " + shown + " (library " +
+                  file["library"].get<std::string>() + ")\n";
+    }
+  }
+  EXPECT_GT(expected.size(), 0u);
+  EXPECT_EQ(text.out, expected);
 }
 
 TEST(Units, SourceWithAnUnknownExtensionIsOneUnitNamedAfterTheFile) {
