@@ -86,6 +86,13 @@ std::string FileOf(Vad::IHdlDesignUnit* unit) {
   return FileFacts::PathOf(file.Get());
 }
 
+// The hierarchy with what the diagnostics and the file graph need; null when there is none.
+const TreeInfo* ReadLinks(Vad::IHdlProject* project, TreeInfo& tree) {
+  return TreeReader::ReadLinks(project, tree) == CitI::kOk ? &tree : nullptr;
+}
+
+constexpr auto kUnitsWithoutLinks = ProjectReader::UnitFields::kWithoutLinks;
+
 // Every file the run reads: the sources and the project files and lists that named them.
 std::vector<std::string> InputPaths(const ProjectSources& sources, const Options& options) {
   std::vector<std::string> paths;
@@ -266,12 +273,15 @@ int CommandRunner::ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount,
 }
 
 int CommandRunner::Units(ProjectReader& reader, std::ostream& out) {
-  std::vector<FileInfo> files = reader.Files();
-  shownPaths_.Apply(files);
   if (options_.format == Format::kJson) {
+    std::vector<FileInfo> files = reader.Files();
+    shownPaths_.Apply(files);
     JsonOutput::Units(files, Messages(), out);
   } else {
-    TextOutput::Units(files, out);
+    reader.VisitFiles(kUnitsWithoutLinks, [&](FileInfo& file) {
+      shownPaths_.Apply(file);
+      TextOutput::Units(file, out);
+    });
   }
   return Finished();
 }
@@ -296,9 +306,10 @@ int CommandRunner::Tree(ProjectReader& reader, Vad::IHdlProject* project, std::o
       built = false;
     }
   }
-  if (built && !view.ShowsAll()) tree = TreeView::Select(tree, view);
   // The order is not asked for: its cycle messages belong to the order command.
-  std::vector<Diagnostic> diagnostics = DiagnosticReport::AsWarnings(Diagnose(reader, project, nullptr));
+  std::vector<Diagnostic> diagnostics = DiagnosticReport::AsWarnings(
+      Diagnose(reader.Files(kUnitsWithoutLinks), result == CitI::kOk ? &tree : nullptr, nullptr));
+  if (built && !view.ShowsAll()) tree = TreeView::Select(tree, view);
   shownPaths_.Apply(tree);
   shownPaths_.Apply(diagnostics);
   ShowDiagnostics(diagnostics);
@@ -340,16 +351,16 @@ int CommandRunner::Order(ProjectReader& reader, Vad::IHdlProject* project, std::
   int status = ComputeOrder(reader, order, ordered);
   if (status == kExitBadInput) return status;
 
-  std::vector<Diagnostic> diagnostics =
-      DiagnosticReport::AsWarnings(Diagnose(reader, project, ordered ? &order : nullptr));
+  TreeInfo tree;
+  const TreeInfo* links = ReadLinks(project, tree);
+  std::vector<Diagnostic> diagnostics = DiagnosticReport::AsWarnings(
+      Diagnose(reader.Files(kUnitsWithoutLinks), links, ordered ? &order : nullptr));
   shownPaths_.Apply(order);
   shownPaths_.Apply(diagnostics);
   ShowDiagnostics(diagnostics);
   if (options_.format == Format::kJson) {
     JsonOutput::Order(ordered ? &order : nullptr, verilog_, Messages(), out, diagnostics);
   } else if (ordered && options_.format == Format::kDot) {
-    TreeInfo tree;
-    TreeReader::Read(project, tree, false);
     shownPaths_.Apply(tree);
     DotOutput::Order(FileGraph::Build(tree, order), out);
   } else if (ordered) {
@@ -364,15 +375,16 @@ int CommandRunner::Export(ProjectReader& reader, Vad::IHdlProject* project, std:
   bool ordered = false;
   int status = ComputeOrder(reader, order, ordered);
   if (!ordered) return status;
-  ShowDiagnostics(DiagnosticReport::AsWarnings(Diagnose(reader, project, &order)));
-
   TreeInfo tree;
-  TreeReader::Read(project, tree, false);
+  const TreeInfo* links = ReadLinks(project, tree);
+  std::vector<FileInfo> files = reader.Files(kUnitsWithoutLinks);
+  ShowDiagnostics(DiagnosticReport::AsWarnings(Diagnose(files, links, &order)));
+
   std::string topKey = options_.top.empty() ? "" : KeyOf(UnitFinder(reader.designUnits()).Find(options_.top));
   ExportPlan plan;
   std::vector<std::string> warnings;
   std::string error;
-  if (!ExportPlanner::PlanProject(order, tree, reader.Files(), verilog_, topKey, plan, warnings, error)) {
+  if (!ExportPlanner::PlanProject(order, tree, files, verilog_, topKey, plan, warnings, error)) {
     log_->ReportError(error);
     return kExitFailed;
   }
@@ -425,9 +437,12 @@ int CommandRunner::Check(ProjectReader& reader, Vad::IHdlProject* project, std::
   std::vector<OrderEntry> order;
   CitI::Result result = reader.Order(order);
   int status = result == CitI::kOk ? Finished() : Failed("the compile order is not available", result);
-  std::vector<Diagnostic> diagnostics = Diagnose(reader, project, result == CitI::kOk ? &order : nullptr);
+  std::vector<FileInfo> files = reader.Files(kUnitsWithoutLinks);
+  TreeInfo tree;
+  std::vector<Diagnostic> diagnostics =
+      Diagnose(files, ReadLinks(project, tree), result == CitI::kOk ? &order : nullptr);
   if (result == CitI::kOk) {
-    for (Diagnostic& ambiguous : ArchitectureCheck::Find(reader.Files(), order))
+    for (Diagnostic& ambiguous : ArchitectureCheck::Find(files, order))
       diagnostics.push_back(std::move(ambiguous));
     if (log_->OrderWasCut() && !HasCode(diagnostics, DiagnosticCode::kNoValidOrder))
       diagnostics.push_back({Diagnostic::Severity::kError, DiagnosticCode::kNoValidOrder, kCutOrder, "", 0});
@@ -475,7 +490,7 @@ std::string CommandRunner::CacheInputs(const ProjectSources& sources, const std:
   return inputs;
 }
 
-std::vector<Diagnostic> CommandRunner::Diagnose(ProjectReader& reader, Vad::IHdlProject* project,
+std::vector<Diagnostic> CommandRunner::Diagnose(const std::vector<FileInfo>& files, const TreeInfo* tree,
                                                 const std::vector<OrderEntry>* order) const {
   DiagnosticFinder::Settings settings;
   for (const std::string& library : externalLibraries_) {
@@ -484,9 +499,7 @@ std::vector<Diagnostic> CommandRunner::Diagnose(ProjectReader& reader, Vad::IHdl
     settings.externalLibraries.insert(lower);
   }
   settings.strict = options_.strict;
-  TreeInfo tree;
-  bool built = TreeReader::Read(project, tree, false) == CitI::kOk;
-  return DiagnosticFinder(std::move(settings)).Find(reader.Files(), built ? &tree : nullptr, order);
+  return DiagnosticFinder(std::move(settings)).Find(files, tree, order);
 }
 
 void CommandRunner::ShowDiagnostics(const std::vector<Diagnostic>& diagnostics) const {

@@ -41,8 +41,8 @@ class CommandRunner {
   int Ports(ProjectReader& reader, std::ostream& out);
   int Check(ProjectReader& reader, Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out);
 
-  // quillon's own findings about the design; `order` may be null.
-  std::vector<Diagnostic> Diagnose(ProjectReader& reader, Vad::IHdlProject* project,
+  // quillon's own findings about the design; `tree` and `order` may be null.
+  std::vector<Diagnostic> Diagnose(const std::vector<FileInfo>& files, const TreeInfo* tree,
                                    const std::vector<OrderEntry>* order) const;
   bool ColorOnStandardError() const;
   // Writes the diagnostics to standard error unless quiet.

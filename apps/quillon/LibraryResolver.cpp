@@ -67,7 +67,7 @@ bool LibraryResolver::Scan(const std::vector<SourceFile>& files, std::vector<Fil
   ProjectReader reader(builder.project(), silent);
   // A file that does not parse is reported by the run proper; here it simply defines nothing.
   reader.Parse();
-  found = reader.Files();
+  found = reader.Files(ProjectReader::UnitFields::kWithoutLinks);
   return true;
 }
 

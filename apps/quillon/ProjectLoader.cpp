@@ -1,7 +1,9 @@
 #include "ProjectLoader.h"
 
+#include <fcntl.h>
 #include <glob.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <cctype>
@@ -29,13 +31,10 @@ std::string Formatted(const char* format, const std::string& path, std::uint64_t
   return Port::StringBase().Format(format, path.c_str(), static_cast<unsigned long long>(limit)).str();
 }
 
-// A regular file no larger than `maxBytes`: a pipe or device could block or never end. Empty
-// `error` when the file is not there at all, so that the caller can say so in its own words.
-bool IsReadableRegularFile(const std::string& path, std::uint64_t maxBytes, const char* tooLarge,
-                           std::string& error) {
-  struct stat facts {};
-  if (::stat(path.c_str(), &facts) != 0) return false;
-  if (S_ISDIR(facts.st_mode)) return false;
+// A regular file no larger than `maxBytes`, as `facts` (its stat) tell: a pipe or device could
+// block or never end.
+bool IsSmallRegularFile(const std::string& path, const struct stat& facts, std::uint64_t maxBytes,
+                        const char* tooLarge, std::string& error) {
   if (!S_ISREG(facts.st_mode)) {
     error = Formatted(Port::InputLimits::kNotRegularFile, path, 0);
     return false;
@@ -44,6 +43,22 @@ bool IsReadableRegularFile(const std::string& path, std::uint64_t maxBytes, cons
     error = Formatted(tooLarge, path, maxBytes);
     return false;
   }
+  return true;
+}
+
+// As IsSmallRegularFile; an empty `error` when the file is not there at all or is a directory, so
+// that the caller can say so in its own words.
+bool IsReadableRegularFile(const std::string& path, std::uint64_t maxBytes, const char* tooLarge,
+                           std::string& error) {
+  struct stat facts {};
+  if (::stat(path.c_str(), &facts) != 0 || S_ISDIR(facts.st_mode)) return false;
+  return IsSmallRegularFile(path, facts, maxBytes, tooLarge, error);
+}
+
+bool CanOpenForReading(const std::string& path) {
+  int descriptor = ::open(path.c_str(), O_RDONLY | O_CLOEXEC);
+  if (descriptor < 0) return false;
+  ::close(descriptor);
   return true;
 }
 
@@ -202,18 +217,19 @@ bool ProjectLoader::AddPathOrDirectory(const std::string& given, const std::stri
 bool ProjectLoader::AddSource(const std::string& given, std::string library, std::string plugin,
                               std::string& error) {
   std::string fullPath = Canonical(given, "");
-  if (!Port::File::exist(fullPath.c_str())) {
+  // One stat answers every question about the file: projects list thousands of them.
+  struct stat facts {};
+  if (fullPath.empty() || ::stat(fullPath.c_str(), &facts) != 0) {
     error = "no such source file: " + fullPath;
     return false;
   }
-  if (Port::File::isDirectory(fullPath.c_str())) {
+  if (S_ISDIR(facts.st_mode)) {
     error = fullPath + " is a directory, not a source file";
     return false;
   }
   using namespace Port::InputLimits;
-  if (!IsReadableRegularFile(fullPath, kMaxSourceBytes, kSourceTooLarge, error) && !error.empty())
-    return false;
-  if (!std::ifstream(fullPath)) {
+  if (!IsSmallRegularFile(fullPath, facts, kMaxSourceBytes, kSourceTooLarge, error)) return false;
+  if (!CanOpenForReading(fullPath)) {
     error = "cannot read source file " + fullPath;
     return false;
   }

@@ -36,17 +36,17 @@ Prjrep::AutoRelease<Vad::IHdlFileIterator> FilesOf(Vad::IHdlProject* project) {
   return files;
 }
 
-// The records are listed first so that their large descriptions are built in place, never moved.
-std::vector<UnitInfo> UnitsOf(Vad::IHdlFile* file) {
-  std::vector<UnitInfo> units;
+// The records are listed first (into `records`, scratch room) so that their large descriptions
+// are built in place, never moved. `units` keeps its room from the previous file.
+void ReadUnitsOf(Vad::IHdlFile* file, UnitRecordReader& reader, std::vector<Vad::IHdlDesignUnit*>& records,
+                 std::vector<UnitInfo>& units) {
+  records.clear();
+  units.clear();
   Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> iterator;
-  if (file->getDesignUnits(nullptr, iterator.Out()) != CitI::kOk) return units;
-  std::vector<Vad::IHdlDesignUnit*> records;
+  if (file->getDesignUnits(nullptr, iterator.Out()) != CitI::kOk) return;
   ForEachIn(iterator.Get(), [&](Vad::IHdlDesignUnit* unit) { records.push_back(unit); });
   units.resize(records.size());
-  UnitRecordReader reader;
   for (std::size_t i = 0; i < records.size(); ++i) reader.Read(records[i], units[i]);
-  return units;
 }
 
 // The project's Verilog files in the order it compiles them: largest order key first.
@@ -128,14 +128,27 @@ CitI::Result ProjectReader::Parse(ParseCache* cache) {
   return result;
 }
 
-std::vector<FileInfo> ProjectReader::Files() const {
+std::vector<FileInfo> ProjectReader::Files(UnitFields fields) const {
   std::vector<FileInfo> infos;
+  infos.reserve(FileCount());
+  VisitFiles(fields, [&](FileInfo& file) { infos.push_back(std::move(file)); });
+  return infos;
+}
+
+void ProjectReader::VisitFiles(UnitFields fields, const std::function<void(FileInfo&)>& visit) const {
   auto files = FilesOf(project_);
+  UnitRecordReader reader(fields == UnitFields::kAll);
+  std::vector<Vad::IHdlDesignUnit*> records;
+  FileInfo info;
   ForEachIn(files.Get(), [&](Vad::IHdlFile* file) {
     OrderEntry facts = FileFacts::Describe(file);
-    infos.push_back({facts.path, facts.plugin, facts.library, UnitsOf(file)});
+    info.path = std::move(facts.path);
+    info.plugin = std::move(facts.plugin);
+    info.library = std::move(facts.library);
+    info.fullPath.clear();
+    ReadUnitsOf(file, reader, records, info.units);
+    visit(info);
   });
-  return infos;
 }
 
 std::vector<OrderEntry> ProjectReader::Describe(Vad::IHdlFileIterator* files) {

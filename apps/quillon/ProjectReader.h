@@ -2,6 +2,7 @@
 // compile orders. Every operation hands back the module's result; the caller reports failures.
 #pragma once
 
+#include <functional>
 #include <optional>
 #include <vector>
 
@@ -28,8 +29,15 @@ class ProjectReader {
   CitI::Result Parse(ParseCache* cache = nullptr);
   // Entities, architectures, packages, package bodies, modules and generics of the last Parse.
   Vad::IHdlDesignUnitSet* designUnits() const { return designUnits_.Get(); }
+  enum class UnitFields {
+    kAll,
+    kWithoutLinks,  // no parent keys and use lists (UnitRecordReader)
+  };
   // Every file of the project's file set, with every record of its unit set. Does not parse.
-  std::vector<FileInfo> Files() const;
+  std::vector<FileInfo> Files(UnitFields fields = UnitFields::kAll) const;
+  // The same files one at a time: `visit` gets each in a FileInfo that is then reused for the
+  // next, so that listing a large project never holds all of its records at once.
+  void VisitFiles(UnitFields fields, const std::function<void(FileInfo&)>& visit) const;
 
   // The compile order of the whole project, or for `unit` (byUnit: the unit alone, else the unit
   // and what it needs).

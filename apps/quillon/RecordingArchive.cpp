@@ -27,7 +27,7 @@ CitI::Result RecordingArchive::WriteObjectRef(Prjrep::IPersist* object) {
 CitI::Result RecordingArchive::WriteInt(std::int32_t value) { return Keep(value); }
 CitI::Result RecordingArchive::WriteInt64(std::int64_t value) { return Keep(value); }
 CitI::Result RecordingArchive::WriteBool(bool value) { return Keep(value); }
-CitI::Result RecordingArchive::WriteString(const Port::StringBase& value) { return Keep(value); }
+CitI::Result RecordingArchive::WriteString(const Port::StringBase& value) { return Keep(value.str()); }
 CitI::Result RecordingArchive::WriteXUID(const Port::XUID& value) { return Keep(value); }
 
 CitI::Result RecordingArchive::ReadObject(CitI::IInterface**) { return CitI::kFail; }

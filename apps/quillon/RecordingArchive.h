@@ -5,6 +5,7 @@
 #pragma once
 
 #include <cstdint>
+#include <string>
 #include <variant>
 #include <vector>
 
@@ -23,13 +24,17 @@ class RecordingArchive final : public Prjrep::IArchive {
   struct ObjectReference {
     Prjrep::IPersist* object;
   };
-  using Value = std::variant<std::int32_t, std::int64_t, bool, Port::StringBase, Port::XUID, OwnedObject,
+  // Strings are kept as std::string so that a reader can move them out.
+  using Value = std::variant<std::int32_t, std::int64_t, bool, std::string, Port::XUID, OwnedObject,
                              ObjectReference>;
 
   // Archives of this version and later carry every field of a design-unit record.
   static constexpr std::int32_t kVersion = 9;
 
   const std::vector<Value>& values() const { return values_; }
+  std::vector<Value>& values() { return values_; }
+  // Forgets the values but keeps their room, so that one archive serves many records.
+  void Clear() { values_.clear(); }
 
   // Lives on the caller's stack: it answers no reference-count interface.
   CitI::IInterface* QueryInterface(const Port::XUID& id) override;

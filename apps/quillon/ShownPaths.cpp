@@ -12,11 +12,13 @@ std::string ShownPaths::Of(const std::string& fullPath) const {
   return given == given_.end() ? fullPath : given->second;
 }
 
+void ShownPaths::Apply(FileInfo& file) const {
+  file.fullPath = file.path;
+  file.path = Of(file.fullPath);
+}
+
 void ShownPaths::Apply(std::vector<FileInfo>& files) const {
-  for (FileInfo& file : files) {
-    file.fullPath = file.path;
-    file.path = Of(file.fullPath);
-  }
+  for (FileInfo& file : files) Apply(file);
 }
 
 void ShownPaths::Apply(std::vector<OrderEntry>& order) const {

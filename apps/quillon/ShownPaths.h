@@ -21,6 +21,7 @@ class ShownPaths {
   // The path to show for the full path of a file; the full path itself when it is no source.
   std::string Of(const std::string& fullPath) const;
 
+  void Apply(FileInfo& file) const;
   void Apply(std::vector<FileInfo>& files) const;
   void Apply(std::vector<OrderEntry>& order) const;
   void Apply(TreeInfo& tree) const;

@@ -25,12 +25,14 @@ std::vector<const UnitInfo*> InLineOrder(const std::vector<UnitInfo>& units) {
 }  // namespace
 
 void TextOutput::Units(const std::vector<FileInfo>& files, std::ostream& out) {
-  for (const FileInfo& file : files) {
-    for (const UnitInfo* unit : InLineOrder(file.units)) {
-      const std::string& shown = unit->key.find('|') == std::string::npos ? unit->name : unit->key;
-      out << file.path << ':' << unit->line << ": " << unit->type << ' ' << shown << " (library "
-          << file.library << ")\n";
-    }
+  for (const FileInfo& file : files) Units(file, out);
+}
+
+void TextOutput::Units(const FileInfo& file, std::ostream& out) {
+  for (const UnitInfo* unit : InLineOrder(file.units)) {
+    const std::string& shown = unit->key.find('|') == std::string::npos ? unit->name : unit->key;
+    out << file.path << ':' << unit->line << ": " << unit->type << ' ' << shown << " (library "
+        << file.library << ")\n";
   }
 }
 

@@ -13,6 +13,7 @@ class TextOutput {
   // One line a unit, in line order: FILE:LINE: TYPE KEY (library LIB). Records whose design-unit key is their
   // type name alone (libraries, uses, instances) show their name instead.
   static void Units(const std::vector<FileInfo>& files, std::ostream& out);
+  static void Units(const FileInfo& file, std::ostream& out);
   // The root's children and their subtrees, two blanks of indent a level: instance label, unit,
   // architecture, kind, file and the flags (library cell, not in the project, partition). A
   // shared subtree is printed in full once; later occurrences are one line ending in "(shared,

@@ -18,15 +18,15 @@ namespace {
 constexpr std::uint32_t kEntity = 2, kArchitecture = 4, kComponentInst = 8, kEntityInst = 16, kLibrary = 32,
                         kPackageDecl = 64, kPackageBody = 128, kUse = 256;
 
-// Walks the recorded values in the order the record wrote them.
+// Walks the recorded values in the order the record wrote them, moving each out once.
 class ValueCursor {
  public:
-  explicit ValueCursor(const std::vector<RecordingArchive::Value>& values) : values_(values) {}
+  explicit ValueCursor(std::vector<RecordingArchive::Value>& values) : values_(values) {}
 
   template <class T>
   bool Take(T& out) {
     if (next_ >= values_.size() || !std::holds_alternative<T>(values_[next_])) return false;
-    out = std::get<T>(values_[next_++]);
+    out = std::move(std::get<T>(values_[next_++]));
     return true;
   }
   template <class T>
@@ -43,7 +43,7 @@ class ValueCursor {
   }
 
  private:
-  const std::vector<RecordingArchive::Value>& values_;
+  std::vector<RecordingArchive::Value>& values_;
   std::size_t next_ = 0;
 };
 
@@ -60,12 +60,7 @@ struct RecordFields {
   std::vector<std::string> ownTexts;  // the strings of the record's own kind
 };
 
-bool TakeText(ValueCursor& cursor, std::string& out) {
-  Port::StringBase text;
-  if (!cursor.Take(text)) return false;
-  out = text.str();
-  return true;
-}
+bool TakeText(ValueCursor& cursor, std::string& out) { return cursor.Take(out); }
 
 bool TakeObjectPart(ValueCursor& cursor, RecordFields& fields) {
   std::int32_t type = 0, children = 0;
@@ -108,13 +103,13 @@ bool TakeOwnPart(ValueCursor& cursor, RecordFields& fields) {
     return false;
   }
   std::string text;
-  while (TakeText(cursor, text)) fields.ownTexts.push_back(text);
+  while (TakeText(cursor, text)) fields.ownTexts.push_back(std::move(text));
   return true;
 }
 
-bool ReadFields(Prjrep::IPersist* record, RecordFields& fields) {
+bool ReadFields(Prjrep::IPersist* record, RecordingArchive& archive, RecordFields& fields) {
   if (!record) return false;
-  RecordingArchive archive;
+  archive.Clear();
   {
     // Saving a unit without a parent is reported as a developer text, which says nothing here.
     Port_DebugCapture silence;
@@ -124,12 +119,12 @@ bool ReadFields(Prjrep::IPersist* record, RecordFields& fields) {
   return TakeObjectPart(cursor, fields) && TakeElementPart(cursor, fields) && TakeOwnPart(cursor, fields);
 }
 
-std::optional<std::string> OwnText(const RecordFields& fields, std::size_t index) {
+std::optional<std::string> OwnText(RecordFields& fields, std::size_t index) {
   if (index >= fields.ownTexts.size()) return std::nullopt;
-  return fields.ownTexts[index];
+  return std::move(fields.ownTexts[index]);
 }
 
-void TakeKindFields(const RecordFields& fields, UnitInfo& info) {
+void TakeKindFields(RecordFields& fields, UnitInfo& info) {
   switch (fields.type) {
     case kEntity:
       info.entity = OwnText(fields, 0);
@@ -212,7 +207,7 @@ const std::optional<std::string>& UnitRecordReader::ParentKeyOf(Prjrep::IPersist
   auto [entry, added] = parentKeys_.try_emplace(parent);
   if (added) {
     RecordFields fields;
-    if (ReadFields(parent, fields) || !fields.storeKey.empty()) entry->second = std::move(fields.storeKey);
+    if (ReadFields(parent, archive_, fields) || !fields.storeKey.empty()) entry->second = std::move(fields.storeKey);
   }
   return entry->second;
 }
@@ -220,7 +215,7 @@ const std::optional<std::string>& UnitRecordReader::ParentKeyOf(Prjrep::IPersist
 bool UnitRecordReader::Read(CitI::IInterface* unit, UnitInfo& info) {
   info.key = DesignUnitKeyOf(unit);
   RecordFields fields;
-  bool complete = ReadFields(Prjrep::QueryAs<Prjrep::IPersist>(unit), fields);
+  bool complete = ReadFields(Prjrep::QueryAs<Prjrep::IPersist>(unit), archive_, fields);
   info.type = TypeName(fields.type);
   info.name = std::move(fields.name);
   info.storeKey = std::move(fields.storeKey);
@@ -228,8 +223,10 @@ bool UnitRecordReader::Read(CitI::IInterface* unit, UnitInfo& info) {
   info.unitFlag = fields.unitFlag;
   info.inGenerate = fields.inGenerate;
   info.partition = std::move(fields.partition);
-  if (fields.parent) info.parent = ParentKeyOf(fields.parent);
-  info.uses = UseStoreKeysOf(unit);
+  if (withLinks_) {
+    if (fields.parent) info.parent = ParentKeyOf(fields.parent);
+    info.uses = UseStoreKeysOf(unit);
+  }
   TakeKindFields(fields, info);
   return complete;
 }

@@ -60,8 +60,10 @@ TEST(CommandLine, UnreadableSourcesAndListsAreRejectedNamingFileAndLine) {
   ScopedTextFile plus("+libext+.v\n+nosuch+1\n");
   ScopedTextFile library("rtl/top.v\n-y lib\n  -v cells/absent.v\n");
   ScopedTextFile unset("rtl/top.v\n$NOT_SET_ANYWHERE/a.v\n");
+  ScopedTextFile directoryEntry("{\"files\": [{\"path\": \"" + DataPath("mixed") + "\"}]}", "project.json");
   const std::string libsearch = DataPath("libsearch");
   ExpectAllRejected({
+      {{"units", "-P", directoryEntry.path()}, DataPath("mixed") + " is a directory, not a source file"},
       {{"units", DataPath("mixed/absent.vhd")}, "no such source file: " + DataPath("mixed/absent.vhd")},
       {{"units", "-P", DataPath("absent.json")}, "cannot read project file " + DataPath("absent.json")},
       {{"units", "-P", DataPath("mixed")}, "cannot read project file " + DataPath("mixed")},

@@ -2,6 +2,7 @@
 // reaches the parsers (targets, macros, include directories), and the JSON and text answers.
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <nlohmann/json.hpp>
 #include <string>
 #include <vector>
@@ -27,6 +28,30 @@ TEST(Units, AnswersGiveEveryRecordOfEveryFile) {
       {"units-uses.json", {"--format", "json", "units", DataPath("uses/e.vhd")}},
       {"units-top.txt", {"units", mixed + "/top.vhd"}},  // one line per unit in line order
   });
+}
+
+// The text listing is written file by file while the JSON one reads every file first: both name
+// the same units of the same files, the text one in line order.
+TEST(Units, TextListingNamesWhatTheJsonListingHolds) {
+  const std::string project = DataPath("mixed/project.json");
+  CliResult text = RunQuillon({"units", "-P", project});
+  CliResult json = RunQuillon({"--format", "json", "units", "-P", project});
+  ASSERT_EQ(text.status, 0) << text.err;
+  ASSERT_EQ(json.status, 0) << json.err;
+  std::string expected;
+  for (const auto& file : nlohmann::json::parse(json.out)["files"]) {
+    std::vector<nlohmann::json> units(file["units"].begin(), file["units"].end());
+    std::stable_sort(units.begin(), units.end(), [](const auto& a, const auto& b) { return a["line"] < b["line"]; });
+    for (const auto& unit : units) {
+      const std::string key = unit["key"];
+      const std::string shown = key.find('|') == std::string::npos ? unit["name"].get<std::string>() : key;
+      expected += file["path"].get<std::string>() + ":" + std::to_string(unit["line"].get<int>()) + ": " +
+                  unit["type"].get<std::string>() + " " + shown + " (library " +
+                  file["library"].get<std::string>() + ")\n";
+    }
+  }
+  EXPECT_GT(expected.size(), 0u);
+  EXPECT_EQ(text.out, expected);
 }
 
 // The design-unit keys of every file, in file order.
