@@ -220,7 +220,6 @@ IHdlElement* CElaborator::FindRegisteredElement(const CElabTables& tables, const
   for (auto entry = first; entry != last; ++entry) {
     if (exact && !SameUnitKey(entry->first, name)) continue;
     chosen = entry->second;
-    // The last candidate is chosen whatever its library.
     if (std::next(entry) == last || ModeOneEqual(LibraryOf(chosen), library)) break;
   }
   return chosen;
@@ -753,8 +752,6 @@ struct CElaborator::HierarchyBuild {
   std::unordered_map<std::string_view, IHdlNetListNode*> shared;
   // The units from the top node down to the node being built.
   NameSet chain;
-  // The element each reference target resolved to: many nodes name the same target.
-  std::unordered_map<std::string_view, IHdlElement*> resolved;
 };
 
 // A node whose references are being turned into children.
@@ -778,7 +775,7 @@ CitI::Result CElaborator::BuildHierarchy(CElabTables& tables, CLibRefs* libraryR
                    [](const auto& a, const auto& b) { return a.second < b.second; });
 
   MissingNodeList missing;
-  HierarchyBuild build{tables, visited, missing, shareSubtrees_, UnitsOnCycles(tables), {}, {}, {}};
+  HierarchyBuild build{tables, visited, missing, shareSubtrees_, UnitsOnCycles(tables), {}, {}};
   for (const auto& [name, count] : units) {
     if (visited[name]) continue;
     IHdlElement* element = nullptr;
@@ -814,7 +811,7 @@ CitI::Result CElaborator::BuildSubtree(CElabTables& tables, VisitedMap& visited,
                                        Port::StringBase& path) {
   if (!node) return CitI::kInvalidArg;
   if (!Prjrep::QueryAs<IHdlNetListNodeInternal>(node)) return CitI::kFail;
-  HierarchyBuild build{tables, visited, missing, shareSubtrees_, UnitsOnCycles(tables), {}, {}, {}};
+  HierarchyBuild build{tables, visited, missing, shareSubtrees_, UnitsOnCycles(tables), {}, {}};
   std::vector<std::string> above = UnitsOfMarkerPath(path.view());
   for (const std::string& unit : above) build.chain.insert(unit);
   return ExpandSubtree(build, node, name);
@@ -850,12 +847,6 @@ CitI::Result CElaborator::ExpandSubtree(HierarchyBuild& build, IHdlNetListNode* 
   return CitI::kOk;
 }
 
-IHdlElement* CElaborator::ResolveTarget(HierarchyBuild& build, const Port::StringBase& target) const {
-  auto [entry, added] = build.resolved.try_emplace(target.view(), nullptr);
-  if (added) FindElementByKey(build.tables, target, true, &entry->second);
-  return entry->second;
-}
-
 CitI::Result CElaborator::AddNextChild(HierarchyBuild& build, std::vector<BuildFrame>& frames) {
   // Taken out before a new frame may move the stack.
   IHdlNetListNode* parent = frames.back().node;
@@ -865,7 +856,8 @@ CitI::Result CElaborator::AddNextChild(HierarchyBuild& build, std::vector<BuildF
   const std::vector<Port::StringBase>* labels = frames.back().labels;
   const Port::StringBase* label = labels && index < labels->size() ? &(*labels)[index] : nullptr;
 
-  IHdlElement* element = ResolveTarget(build, target);
+  IHdlElement* element = nullptr;
+  FindElementByKey(build.tables, target, true, &element);
   // Such a subtree is the same under every parent: no ancestor's unit can occur in it.
   bool shared =
       build.share && element && (!label || label->IsEmpty()) && !build.onCycle.contains(target.view());

@@ -211,8 +211,6 @@ class CElaborator final : public CitI::IInterface {
   // Marks `name` visited and, unless it is on the chain (warning, false), opens its frame.
   bool EnterUnit(HierarchyBuild& build, std::vector<BuildFrame>& frames, IHdlNetListNode* node,
                  const Port::StringBase& name) const;
-  // FindElementByKey (exact) for a reference target, each target looked up once per build.
-  IHdlElement* ResolveTarget(HierarchyBuild& build, const Port::StringBase& target) const;
   // Makes or links the child of the top frame for its next reference.
   CitI::Result AddNextChild(HierarchyBuild& build, std::vector<BuildFrame>& frames);
   // Increments the count of `target`, or inserts it with count 0.
