@@ -254,14 +254,13 @@ CitI::Result CCompileOrder::ReportCycles(bool report) {
   FindBackEdges();
   if (!cycleFound_ || !report) return CitI::kOk;
   if (backEdges_.empty()) return CitI::kFail;
-  std::vector<std::vector<Vertex>> cycles;
-  std::vector<CitI::Result> results;
-  ListAllCycles(cycles, results);
-  for (std::size_t k = 0; k < backEdges_.size(); ++k) {
-    if (results[k] != CitI::kOk) return results[k];
-    if (cycles[k].empty()) return CitI::kFail;
+  std::vector<ListedCycle> cycles;
+  ListAllCycles(cycles);
+  for (const ListedCycle& cycle : cycles) {
+    if (cycle.result != CitI::kOk) return cycle.result;
+    if (cycle.files.empty()) return CitI::kFail;
     Message(__LINE__)->issueWarning("%s", CompileOrderText::kCycleHeader);
-    for (Vertex vertex : cycles[k]) {
+    for (Vertex vertex : cycle.files) {
       Message(__LINE__)->issueWarning(CompileOrderText::kCycleFileFormat, graph_[vertex].displayName.c_str());
     }
     Message(__LINE__)->issueWarning("%s", CompileOrderText::kCycleEnd);
@@ -270,10 +269,8 @@ CitI::Result CCompileOrder::ReportCycles(bool report) {
 }
 
 // Back edges that end at one file share its search: many cycles through one file cost one search.
-void CCompileOrder::ListAllCycles(std::vector<std::vector<Vertex>>& cycles,
-                                  std::vector<CitI::Result>& results) const {
-  cycles.assign(backEdges_.size(), {});
-  results.assign(backEdges_.size(), CitI::kOk);
+void CCompileOrder::ListAllCycles(std::vector<ListedCycle>& cycles) const {
+  cycles.assign(backEdges_.size(), ListedCycle{});
   std::vector<std::size_t> byTarget(backEdges_.size());
   for (std::size_t k = 0; k < byTarget.size(); ++k) byTarget[k] = k;
   std::stable_sort(byTarget.begin(), byTarget.end(),
@@ -282,13 +279,13 @@ void CCompileOrder::ListAllCycles(std::vector<std::vector<Vertex>>& cycles,
   for (std::size_t k : byTarget) {
     const BackEdge& backEdge = backEdges_[k];
     if (paths.predecessor.empty() || paths.start != backEdge.second) {
-      results[k] = SearchFrom(backEdge.second, paths);
-      if (results[k] != CitI::kOk) {
+      cycles[k].result = SearchFrom(backEdge.second, paths);
+      if (cycles[k].result != CitI::kOk) {
         paths.predecessor.clear();
         continue;
       }
     }
-    results[k] = WalkCycle(backEdge, paths, cycles[k]);
+    cycles[k].result = WalkCycle(backEdge, paths, cycles[k].files);
   }
 }
 

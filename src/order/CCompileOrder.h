@@ -101,7 +101,11 @@ class CCompileOrder {
   // direction back to t. 0 (with a debug text) when no path from t to s exists.
   CitI::Result ListCycleFiles(const BackEdge& backEdge, std::vector<Vertex>& out) const;
   // ListCycleFiles for every recorded back edge, by index; each cycle start is searched once.
-  void ListAllCycles(std::vector<std::vector<Vertex>>& cycles, std::vector<CitI::Result>& results) const;
+  struct ListedCycle {
+    std::vector<Vertex> files;
+    CitI::Result result = CitI::kOk;
+  };
+  void ListAllCycles(std::vector<ListedCycle>& cycles) const;
   // Removes every edge s->t of each recorded back edge; vertices and other edges stay.
   CitI::Result BreakCycles();
   // The files by level (length of the longest chain of files that use it), highest first, equal
