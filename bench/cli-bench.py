@@ -8,8 +8,9 @@ The projects (written once into the work folder, default /tmp/quillon-cli-bench)
   vhdl-N         N files (~5 KB each): a package using two later packages, an entity and an
                  architecture with processes, one instance of a child entity per four files
                  (a tree of instances) and library-cell instances
-  verilog-N      N files: modules in a tree of instances, a shared `include header and a
-                 `define in every tenth file that later files use
+  verilog-N      N files (~7 KB each): modules with parameters, assigns, always blocks and a
+                 generate loop in a tree of instances, a shared `include header and a `define
+                 in every tenth file that later files use
   mixed-N        half of vhdl-N and half of verilog-N
   vchain-N       a VHDL chain of N entities, each architecture instantiating the next
   mchain-N       a Verilog chain of N modules, each instantiating the next
@@ -100,19 +101,52 @@ def vhdl_project(folder, count, seed=7):
 HEADER = "`ifndef BENCH_DEFS_VH\n`define BENCH_DEFS_VH\n`define BUS_WIDTH 32\n`define PICK(s, a, b) ((s) ? (a) : (b))\n`endif\n"
 
 
+VERILOG_BLOCK = """  // stage {n}: registered datapath with a saturating counter and a small state machine
+  reg [{width}-1:0] r_{n};
+  reg [7:0] cnt_{n};
+  reg [1:0] st_{n};
+  wire [{width}-1:0] w_{n} = r_{n} ^ {{ {{({width}-8){{1'b0}}}}, cnt_{n} }};
+  assign sum_{n} = `PICK(en_{n}, r_{n} + w_{n}, r_{n} - LIMIT);
+  always @(posedge clk or negedge rst_n) begin
+    if (!rst_n) begin
+      r_{n} <= {{{width}{{1'b0}}}};
+      cnt_{n} <= 8'd0;
+      st_{n} <= 2'd0;
+    end else begin
+      /* the counter saturates at LIMIT and the state follows it */
+      if (cnt_{n} != LIMIT[7:0])
+        cnt_{n} <= cnt_{n} + 8'd1;
+      case (st_{n})
+        2'd0: if (d[{bit}]) st_{n} <= 2'd1;
+        2'd1: st_{n} <= cnt_{n}[0] ? 2'd2 : 2'd1;
+        2'd2: begin r_{n} <= `PICK(d[0], d + {n}, r_{n} ^ {mask}); st_{n} <= 2'd3; end
+        default: st_{n} <= 2'd0;
+      endcase
+    end
+  end
+"""
+
+
 def verilog_file(index, count, rng):
-    text = '`include "bench_defs.vh"\n'
+    """About 7 KB of RTL: parameters, wires and assigns, always blocks, a generate loop, comments."""
+    text = f'// generated module {index}: a stage of the benchmark tree\n`include "bench_defs.vh"\n'
     if index % 10 == 0:
         text += f"`define W_{index} {8 + index % 24}\n"
     width = f"`W_{(index // 10) * 10}"
-    text += f"module mod_{index} (input clk, input [{width}-1:0] d, output reg [`BUS_WIDTH-1:0] q);\n"
-    for n in range(10):
-        text += f"  reg [{width}-1:0] r_{n};\n"
-        text += f"  always @(posedge clk) begin\n    r_{n} <= `PICK(d[0], d + {n}, r_{n} ^ {rng.randrange(255)});\n  end\n"
+    text += (f"module mod_{index} #(parameter LIMIT = {rng.randrange(16, 200)}, parameter DEPTH = 4)\n"
+             f"  (input clk, input rst_n, input [{width}-1:0] d, output reg [`BUS_WIDTH-1:0] q);\n")
+    blocks = 8
+    text += "".join(f"  wire en_{n} = d[{n % 8}] & rst_n;\n  wire [{width}-1:0] sum_{n};\n" for n in range(blocks))
+    for n in range(blocks):
+        text += VERILOG_BLOCK.format(n=n, width=width, bit=n % 8, mask=rng.randrange(255))
+    text += (f"  // a delay line built by a generate loop\n  reg [{width}-1:0] dl [0:DEPTH-1];\n"
+             "  genvar g;\n  generate\n    for (g = 1; g < DEPTH; g = g + 1) begin : delay\n"
+             "      always @(posedge clk) dl[g] <= dl[g-1];\n    end\n  endgenerate\n"
+             "  always @(posedge clk) dl[0] <= sum_0;\n")
     for c in range(4 * index + 1, 4 * index + 5):
         if c < count:
-            text += f"  mod_{c} #(.P({c % 7})) u_{c} (.clk(clk), .d(d), .q());\n"
-    text += "  always @(posedge clk) q <= r_0;\nendmodule\n"
+            text += f"  mod_{c} #(.LIMIT({c % 7 + 16})) u_{c} (.clk(clk), .rst_n(rst_n), .d(d), .q());\n"
+    text += "  always @(posedge clk) q <= sum_1 ^ dl[DEPTH-1];\nendmodule\n"
     return text
 
 
@@ -166,9 +200,11 @@ GENERATORS = {
 
 DEFAULT_RUNS = [
     ("diamond", 20, ["order"]), ("diamond", 40, ["order"]), ("diamond", 400, ["order"]),
-    ("vhdl", 1000, ["units", "order"]), ("vhdl", 2000, ["order"]), ("vhdl", 10000, ["units", "order", "tree"]),
-    ("verilog", 1000, ["order"]), ("verilog", 2000, ["order"]), ("verilog", 10000, ["units", "order"]),
-    ("mixed", 10000, ["order"]),
+    ("vhdl", 1000, ["units", "order"]), ("vhdl", 2000, ["order"]), ("vhdl", 2500, ["order"]),
+    ("vhdl", 5000, ["order"]), ("vhdl", 10000, ["units", "order", "tree"]),
+    ("verilog", 1000, ["order"]), ("verilog", 2000, ["order"]), ("verilog", 2500, ["order"]),
+    ("verilog", 5000, ["order"]), ("verilog", 10000, ["units", "order"]),
+    ("mixed", 2500, ["order"]), ("mixed", 5000, ["order"]), ("mixed", 10000, ["order"]),
     ("vchain", 50000, ["order", "tree"]), ("vchain", 100000, ["order", "tree"]), ("vchain", 200000, ["order", "tree"]),
     ("mchain", 50000, ["order", "tree"]), ("mchain", 100000, ["order", "tree"]), ("mchain", 200000, ["order", "tree"]),
     ("pchain", 50000, ["order", "tree"]), ("pchain", 100000, ["order", "tree"]), ("pchain", 200000, ["order", "tree"]),

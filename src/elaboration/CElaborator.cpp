@@ -220,7 +220,7 @@ IHdlElement* CElaborator::FindRegisteredElement(const CElabTables& tables, const
   for (auto entry = first; entry != last; ++entry) {
     if (exact && !SameUnitKey(entry->first, name)) continue;
     chosen = entry->second;
-    if (ModeOneEqual(LibraryOf(chosen), library)) break;
+    if (std::next(entry) == last || ModeOneEqual(LibraryOf(chosen), library)) break;
   }
   return chosen;
 }

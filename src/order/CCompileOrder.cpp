@@ -254,13 +254,13 @@ CitI::Result CCompileOrder::ReportCycles(bool report) {
   FindBackEdges();
   if (!cycleFound_ || !report) return CitI::kOk;
   if (backEdges_.empty()) return CitI::kFail;
-  for (const BackEdge& backEdge : backEdges_) {
-    std::vector<Vertex> cycle;
-    CitI::Result status = ListCycleFiles(backEdge, cycle);
-    if (status != CitI::kOk) return status;
-    if (cycle.empty()) return CitI::kFail;
+  std::vector<ListedCycle> cycles;
+  ListAllCycles(cycles);
+  for (const ListedCycle& cycle : cycles) {
+    if (cycle.result != CitI::kOk) return cycle.result;
+    if (cycle.files.empty()) return CitI::kFail;
     Message(__LINE__)->issueWarning("%s", CompileOrderText::kCycleHeader);
-    for (Vertex vertex : cycle) {
+    for (Vertex vertex : cycle.files) {
       Message(__LINE__)->issueWarning(CompileOrderText::kCycleFileFormat, graph_[vertex].displayName.c_str());
     }
     Message(__LINE__)->issueWarning("%s", CompileOrderText::kCycleEnd);
@@ -268,24 +268,51 @@ CitI::Result CCompileOrder::ReportCycles(bool report) {
   return CitI::kOk;
 }
 
-CitI::Result CCompileOrder::ListCycleFiles(const BackEdge& backEdge, std::vector<Vertex>& out) const {
+// Back edges that end at one file share its search: many cycles through one file cost one search.
+void CCompileOrder::ListAllCycles(std::vector<ListedCycle>& cycles) const {
+  cycles.assign(backEdges_.size(), ListedCycle{});
+  std::vector<std::size_t> byTarget(backEdges_.size());
+  for (std::size_t k = 0; k < byTarget.size(); ++k) byTarget[k] = k;
+  std::stable_sort(byTarget.begin(), byTarget.end(),
+                   [&](std::size_t a, std::size_t b) { return backEdges_[a].second < backEdges_[b].second; });
+  PathsToCycleStart paths;
+  for (std::size_t k : byTarget) {
+    const BackEdge& backEdge = backEdges_[k];
+    if (paths.predecessor.empty() || paths.start != backEdge.second) {
+      cycles[k].result = SearchFrom(backEdge.second, paths);
+      if (cycles[k].result != CitI::kOk) {
+        paths.predecessor.clear();
+        continue;
+      }
+    }
+    cycles[k].result = WalkCycle(backEdge, paths, cycles[k].files);
+  }
+}
+
+CitI::Result CCompileOrder::SearchFrom(Vertex start, PathsToCycleStart& paths) const {
+  const std::size_t count = boost::num_vertices(graph_);
+  if (start >= count) return CitI::kInvalidArg;
+  paths.start = start;
+  paths.predecessor.assign(count, 0);
+  paths.distance.assign(count, 0);
+  auto index = boost::get(boost::vertex_index, graph_);
+  boost::dijkstra_shortest_paths(
+      graph_, start,
+      boost::predecessor_map(boost::make_iterator_property_map(paths.predecessor.begin(), index))
+          .distance_map(boost::make_iterator_property_map(paths.distance.begin(), index))
+          .weight_map(boost::get(boost::edge_weight, graph_)));
+  return CitI::kOk;
+}
+
+CitI::Result CCompileOrder::WalkCycle(const BackEdge& backEdge, const PathsToCycleStart& paths,
+                                      std::vector<Vertex>& out) const {
   out.clear();
   const std::size_t count = boost::num_vertices(graph_);
   const auto [source, target] = backEdge;
   if (source >= count || target >= count) return CitI::kInvalidArg;
-
-  std::vector<Vertex> predecessor(count);
-  std::vector<std::int32_t> distance(count);
-  auto index = boost::get(boost::vertex_index, graph_);
-  boost::dijkstra_shortest_paths(
-      graph_, target,
-      boost::predecessor_map(boost::make_iterator_property_map(predecessor.begin(), index))
-          .distance_map(boost::make_iterator_property_map(distance.begin(), index))
-          .weight_map(boost::get(boost::edge_weight, graph_)));
-
   // An unreached vertex is its own predecessor, so the walk also stops there rather than loop.
-  for (Vertex current = source; current != target; current = predecessor[current]) {
-    if (distance[current] < 0 || distance[current] == kUnreached || out.size() >= count) {
+  for (Vertex current = source; current != target; current = paths.predecessor[current]) {
+    if (paths.distance[current] < 0 || paths.distance[current] == kUnreached || out.size() >= count) {
       Port_MsgManData::debugStub("%s", CompileOrderText::kNoShortestPath);
       out.clear();
       return CitI::kFail;
@@ -294,6 +321,15 @@ CitI::Result CCompileOrder::ListCycleFiles(const BackEdge& backEdge, std::vector
   }
   out.push_back(target);
   return CitI::kOk;
+}
+
+CitI::Result CCompileOrder::ListCycleFiles(const BackEdge& backEdge, std::vector<Vertex>& out) const {
+  out.clear();
+  const std::size_t count = boost::num_vertices(graph_);
+  if (backEdge.first >= count || backEdge.second >= count) return CitI::kInvalidArg;
+  PathsToCycleStart paths;
+  CitI::Result status = SearchFrom(backEdge.second, paths);
+  return status == CitI::kOk ? WalkCycle(backEdge, paths, out) : status;
 }
 
 CitI::Result CCompileOrder::BreakCycles() {

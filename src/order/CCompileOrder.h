@@ -100,11 +100,27 @@ class CCompileOrder {
   // The files of the shortest cycle through `backEdge` s->t: s first, then against the edge
   // direction back to t. 0 (with a debug text) when no path from t to s exists.
   CitI::Result ListCycleFiles(const BackEdge& backEdge, std::vector<Vertex>& out) const;
+  // ListCycleFiles for every recorded back edge, by index; each cycle start is searched once.
+  struct ListedCycle {
+    std::vector<Vertex> files;
+    CitI::Result result = CitI::kOk;
+  };
+  void ListAllCycles(std::vector<ListedCycle>& cycles) const;
   // Removes every edge s->t of each recorded back edge; vertices and other edges stay.
   CitI::Result BreakCycles();
   // The files by level (length of the longest chain of files that use it), highest first, equal
   // levels by descending display name (letter case folded). 0 when the graph has a cycle.
   CitI::Result EmitOrder(IHdlFileIterator** out) const;
+
+  // The shortest paths from one cycle start t, which every back edge s->t walks back to t.
+  struct PathsToCycleStart {
+    Vertex start = 0;
+    std::vector<Vertex> predecessor;
+    std::vector<std::int32_t> distance;
+  };
+  CitI::Result SearchFrom(Vertex start, PathsToCycleStart& paths) const;
+  CitI::Result WalkCycle(const BackEdge& backEdge, const PathsToCycleStart& paths,
+                         std::vector<Vertex>& out) const;
 
   // ---- for tests ----
   const Graph& GetGraph() const { return graph_; }

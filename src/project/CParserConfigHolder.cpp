@@ -210,17 +210,20 @@ Library* CParserConfigHolder::AddLibrary(const Port::StringBase& name, std::uint
   ResetForNextUnit();
   // Library clauses inside a context declaration belong to it.
   if (!openContext_ || currentUnit_ != openContext_) currentUnit_ = nullptr;
-  Prjrep::AutoRelease<Library> library(new Library(name.view(), nullptr));
-  const Port::StringBase key = StoreKeyOf(library.Get());
+  // A repeated clause finds its record by key before a new one is made.
+  Port::StringBase key;
+  Library::ComposeStoreKeyFor(name.view(), key);
   if (auto* existing = dynamic_cast<Library*>(FindRecorded(key))) return existing;
+  Prjrep::AutoRelease<Library> library(new Library(name.view(), nullptr));
   return Enter(library.Get(), key, line, type) ? library.Get() : nullptr;
 }
 
 Use* CParserConfigHolder::RecordUse(const Port::StringBase& dottedName, std::uint32_t line,
                                     const Port::XUID& type) {
-  Prjrep::AutoRelease<Use> use(new Use(dottedName.view(), nullptr));
-  const Port::StringBase key = StoreKeyOf(use.Get());
+  Port::StringBase key;
+  Use::ComposeStoreKeyFor(dottedName.view(), key);
   if (auto* existing = dynamic_cast<Use*>(FindRecorded(key))) return existing;
+  Prjrep::AutoRelease<Use> use(new Use(dottedName.view(), nullptr));
   return Enter(use.Get(), key, line, type) ? use.Get() : nullptr;
 }
 

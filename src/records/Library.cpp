@@ -26,8 +26,12 @@ CitI::Result Library::Save(Prjrep::IArchive* archive) {
 }
 
 void Library::ComposeStoreKey(Port::StringBase& key) {
-  JoinKeyFields(key, {"", "", GetTypeName(), libraryName_.view(), ""});
+  ComposeStoreKeyFor(libraryName_.view(), key);
   SetKey(key.view());
+}
+
+void Library::ComposeStoreKeyFor(std::string_view name, Port::StringBase& key) {
+  JoinKeyFields(key, {"", "", TypeNameOf(DbType::kLibrary), name, ""});
 }
 
 }  // namespace Vad

@@ -27,6 +27,8 @@ class Library : public CHdlElement {
   const Port::StringBase& GetLibraryText() const { return libraryName_; }
   // "||Library|<library name>|", also kept as the store key.
   void ComposeStoreKey(Port::StringBase& key);
+  // The store key a library of that name gets, without making the record.
+  static void ComposeStoreKeyFor(std::string_view name, Port::StringBase& key);
 
  private:
   TPersistHelper<Library> persist_{this};

@@ -10,10 +10,19 @@ Use::Use() : CHdlElement({}, nullptr) {}
 
 Use::Use(std::string_view name, DbObject* parent) : CHdlElement(name, parent) {
   SetType(DbType::kUse);
+  Parts parts = PartsOf(name);
+  library_ = std::move(parts.library);
+  package_ = std::move(parts.package);
+  item_ = std::move(parts.item);
+}
+
+Use::Parts Use::PartsOf(std::string_view name) {
   std::vector<Port::StringBase> pieces;
   Port::StringBase(name).Split(pieces, ".", false, "\"", "\"");
-  Port::StringBase* parts[] = {&library_, &package_, &item_};
-  for (std::size_t i = 0; i < pieces.size() && i < std::size(parts); ++i) *parts[i] = std::move(pieces[i]);
+  Parts parts;
+  Port::StringBase* fields[] = {&parts.library, &parts.package, &parts.item};
+  for (std::size_t i = 0; i < pieces.size() && i < std::size(fields); ++i) *fields[i] = std::move(pieces[i]);
+  return parts;
 }
 
 CitI::IInterface* Use::QueryInterface(const Port::XUID& id) {
@@ -45,6 +54,12 @@ void Use::SetParts(std::string_view library, std::string_view package, std::stri
 void Use::ComposeStoreKey(Port::StringBase& key) {
   JoinKeyFields(key, {"", "", GetTypeName(), library_.view(), package_.view(), item_.view(), ""});
   SetKey(key.view());
+}
+
+void Use::ComposeStoreKeyFor(std::string_view name, Port::StringBase& key) {
+  Parts parts = PartsOf(name);
+  JoinKeyFields(key, {"", "", TypeNameOf(DbType::kUse), parts.library.view(), parts.package.view(),
+                      parts.item.view(), ""});
 }
 
 }  // namespace Vad

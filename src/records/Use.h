@@ -32,8 +32,18 @@ class Use : public CHdlElement {
   const Port::StringBase& GetItemPart() const { return item_; }
   // "||Use|<library>|<package>|<item>|", also kept as the store key.
   void ComposeStoreKey(Port::StringBase& key);
+  // The store key a use clause of that selected name gets, without making the record.
+  static void ComposeStoreKeyFor(std::string_view name, Port::StringBase& key);
 
  private:
+  struct Parts {
+    Port::StringBase library;
+    Port::StringBase package;
+    Port::StringBase item;
+  };
+  static Parts PartsOf(std::string_view name);
+  static void JoinStoreKey(const Parts& parts, Port::StringBase& key);
+
   CitI::Result PersistParts(Prjrep::IArchive* archive, bool saving);
 
   TPersistHelper<Use> persist_{this};

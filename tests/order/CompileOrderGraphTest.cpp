@@ -2,6 +2,7 @@
 // cutting, and trees put together by hand.
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <utility>
 
 #include "OrderFixtures.h"
@@ -109,6 +110,34 @@ TEST_F(CompileOrderGraph, ACycleWithoutAPathBackIsNotListed) {
 
   ASSERT_EQ(order.ListCycleFiles({1, 0}, cycle), CitI::kOk);
   EXPECT_EQ(cycle, (std::vector<Vad::CCompileOrder::Vertex>{1, 0}));
+}
+
+TEST_F(CompileOrderGraph, CyclesThroughOneFileAreListedAsOneByOne) {
+  // hub uses a, b and c, each of which uses hub; c and d use each other.
+  AddFiles("hub", {"hub.vhd", "a.vhd", "b.vhd", "c.vhd", "d.vhd"});
+  auto root = Root();
+  Vad::CCompileOrder order;
+  ASSERT_EQ(order.BuildFileGraph(root.Get(), false), CitI::kOk);
+  ASSERT_TRUE(order.FindBackEdges());
+  const auto& backEdges = order.GetBackEdges();
+  ASSERT_EQ(backEdges.size(), 4u);
+
+  std::vector<Vad::CCompileOrder::ListedCycle> cycles;
+  order.ListAllCycles(cycles);
+  ASSERT_EQ(cycles.size(), backEdges.size());
+  Strings names = VertexNames(order.GetGraph());
+  Strings listed;
+  for (std::size_t k = 0; k < backEdges.size(); ++k) {
+    std::vector<Vad::CCompileOrder::Vertex> alone;
+    ASSERT_EQ(order.ListCycleFiles(backEdges[k], alone), CitI::kOk);
+    EXPECT_EQ(cycles[k].result, CitI::kOk);
+    EXPECT_EQ(cycles[k].files, alone) << "back edge " << k;
+    std::string cycle;
+    for (auto vertex : cycles[k].files) cycle += names[vertex] + " ";
+    listed.push_back(cycle);
+  }
+  std::sort(listed.begin(), listed.end());
+  EXPECT_EQ(listed, (Strings{"b.vhd hub.vhd ", "c.vhd hub.vhd ", "d.vhd c.vhd ", "hub.vhd a.vhd "}));
 }
 
 TEST_F(CompileOrderGraph, OnlyTheUnnamedRootStandsForTheSubtreesOfItsChildren) {

@@ -1,0 +1,3 @@
+use work.hub.all;
+package a is
+end package a;

@@ -1,0 +1,3 @@
+use work.hub.all;
+package b is
+end package b;

@@ -1,0 +1,3 @@
+use work.c.all;
+package d is
+end package d;
