@@ -164,24 +164,31 @@ int CommandRunner::RunOn(Vad::IHdlProject* project, const ProjectSources& source
   return status;
 }
 
+// Without a stored answer, the sources are gathered and the command runs; with one, neither.
+// An answer is kept only when the sources could be gathered: what was missing has no stamp.
 int CommandRunner::RunOnProject() {
+  std::string directory = CacheDirectory();
+  if (directory.empty() || !ResultCache::Applies(options_)) return LoadAndRun();
+  ResultCache results(directory, options_);
+  if (std::optional<ResultCache::Answer> stored = results.Lookup()) return Emit(stored->output, stored->status);
+
+  std::int64_t start = InputStamp::Now();
+  OutputCapture capture;
+  if (!capture.Begin()) return LoadAndRun();
+  ProjectSources sources;
+  std::string error;
+  bool loaded = ProjectLoader(sources).Load(options_, error);
+  int status = loaded ? RunOnSources(sources) : BadInput(error);
+  OutputCapture::Captured output = capture.End();
+  if (loaded) results.Store(sources, start, status, output);
+  return Emit(output, status);
+}
+
+int CommandRunner::LoadAndRun() {
   ProjectSources sources;
   std::string error;
   if (!ProjectLoader(sources).Load(options_, error)) return BadInput(error);
-  TakeSettings(sources);
-  std::string directory = CacheDirectory();
-  if (directory.empty() || !ResultCache::Applies(options_)) return RunOnSources(sources);
-
-  ResultCache results(directory, options_, sources);
-  if (std::optional<ResultCache::Answer> stored = results.Lookup())
-    return Emit(stored->output, stored->status);
-  std::int64_t start = InputStamp::Now();
-  OutputCapture capture;
-  if (!capture.Begin()) return RunOnSources(sources);
-  int status = RunOnSources(sources);
-  OutputCapture::Captured output = capture.End();
-  results.Store(sources, start, status, output);
-  return Emit(output, status);
+  return RunOnSources(sources);
 }
 
 int CommandRunner::Emit(const OutputCapture::Captured& output, int status) {
@@ -191,6 +198,7 @@ int CommandRunner::Emit(const OutputCapture::Captured& output, int status) {
 }
 
 int CommandRunner::RunOnSources(ProjectSources& sources) {
+  TakeSettings(sources);
   std::string error;
   OutputFile file;
   const bool toFile = !options_.outputPath.empty();

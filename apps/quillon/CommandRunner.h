@@ -31,7 +31,9 @@ class CommandRunner {
   // The external libraries and the Verilog settings of the sources.
   void TakeSettings(const ProjectSources& sources);
   int RunOnProject();
-  // The command on loaded sources, from the library search on.
+  // Gathers the sources and runs the command on them.
+  int LoadAndRun();
+  // The command on gathered sources, from the library search on.
   int RunOnSources(ProjectSources& sources);
   // Writes a captured or stored answer; `status`, or kExitFailed when the output cannot take it.
   static int Emit(const OutputCapture::Captured& output, int status);

@@ -1,6 +1,10 @@
 #include "InputStamp.h"
 
+#include <dirent.h>
 #include <time.h>
+
+#include <algorithm>
+#include <vector>
 
 #include "CacheEntry.h"
 #include "CacheFiles.h"
@@ -23,9 +27,11 @@ std::int64_t InputStamp::Now() {
 
 std::optional<InputStamp> InputStamp::Take(const std::string& path, std::int64_t runStart) {
   struct stat facts {};
-  if (::stat(path.c_str(), &facts) != 0 || !S_ISREG(facts.st_mode)) return std::nullopt;
+  if (::stat(path.c_str(), &facts) != 0 || !(S_ISREG(facts.st_mode) || S_ISDIR(facts.st_mode)))
+    return std::nullopt;
   InputStamp stamp;
   stamp.path = path;
+  stamp.directory = S_ISDIR(facts.st_mode);
   stamp.size = static_cast<std::uint64_t>(facts.st_size);
   stamp.device = static_cast<std::uint64_t>(facts.st_dev);
   stamp.inode = static_cast<std::uint64_t>(facts.st_ino);
@@ -35,23 +41,41 @@ std::optional<InputStamp> InputStamp::Take(const std::string& path, std::int64_t
   if (latest >= runStart - kTickNanoseconds) return std::nullopt;
   stamp.racy = latest >= runStart - kRacyNanoseconds;
   if (stamp.racy) {
-    std::string text;
-    if (!CacheFiles::Read(path, text) || text.size() != stamp.size) return std::nullopt;
-    stamp.hash = CacheEntry::Hash(text);
+    std::optional<std::string> content = stamp.Content();
+    if (!content) return std::nullopt;
+    stamp.hash = CacheEntry::Hash(*content);
   }
   return stamp;
 }
 
+std::optional<std::string> InputStamp::Content() const {
+  if (!directory) {
+    std::string text;
+    if (!CacheFiles::Read(path, text) || text.size() != size) return std::nullopt;
+    return text;
+  }
+  DIR* listing = ::opendir(path.c_str());
+  if (!listing) return std::nullopt;
+  std::vector<std::string> names;
+  while (const dirent* entry = ::readdir(listing)) names.emplace_back(entry->d_name);
+  ::closedir(listing);
+  std::sort(names.begin(), names.end());
+  std::string text;
+  for (const std::string& name : names) text.append(name).append(1, '\0');
+  return text;
+}
+
 bool InputStamp::SameStat(const struct stat& now) const {
-  return S_ISREG(now.st_mode) && static_cast<std::uint64_t>(now.st_size) == size &&
+  return (directory ? S_ISDIR(now.st_mode) : S_ISREG(now.st_mode)) &&
+         static_cast<std::uint64_t>(now.st_size) == size &&
          static_cast<std::uint64_t>(now.st_dev) == device &&
          static_cast<std::uint64_t>(now.st_ino) == inode && Nanoseconds(now.st_mtim) == modified &&
          Nanoseconds(now.st_ctim) == changed;
 }
 
 bool InputStamp::SameContent() const {
-  std::string text;
-  return CacheFiles::Read(path, text) && text.size() == size && CacheEntry::Hash(text) == hash;
+  std::optional<std::string> content = Content();
+  return content && CacheEntry::Hash(*content) == hash;
 }
 
 bool InputStamp::Holds(const struct stat& now) const { return SameStat(now) && (!racy || SameContent()); }
@@ -63,13 +87,14 @@ bool InputStamp::Holds() const {
 
 void InputStamp::Encode(Port::ArchiveEncoder& out) const {
   CacheEntry::PutText(out, path);
-  for (std::uint64_t value : {size, device, inode, static_cast<std::uint64_t>(modified),
-                              static_cast<std::uint64_t>(changed), std::uint64_t{racy}, hash})
+  for (std::uint64_t value :
+       {size, device, inode, static_cast<std::uint64_t>(modified), static_cast<std::uint64_t>(changed),
+        std::uint64_t{directory}, std::uint64_t{racy}, hash})
     out.PutUInt64(value);
 }
 
 bool InputStamp::Decode(Port::ArchiveDecoder& in) {
-  std::uint64_t values[7] = {};
+  std::uint64_t values[kNumbers] = {};
   if (!CacheEntry::TakeText(in, path)) return false;
   for (std::uint64_t& value : values)
     if (!in.TakeUInt64(&value)) return false;
@@ -78,9 +103,10 @@ bool InputStamp::Decode(Port::ArchiveDecoder& in) {
   inode = values[2];
   modified = static_cast<std::int64_t>(values[3]);
   changed = static_cast<std::int64_t>(values[4]);
-  racy = values[5] != 0;
-  hash = values[6];
-  return values[5] <= 1;
+  directory = values[5] != 0;
+  racy = values[6] != 0;
+  hash = values[7];
+  return values[5] <= 1 && values[6] <= 1;
 }
 
 }  // namespace quillon

@@ -1,7 +1,8 @@
-// What a run knew of one input file: enough to tell later, by stat alone where that is safe,
-// whether the file still holds what the run read. A file modified shortly before the run may be
-// modified again within the same tick of the file system's clock without any stat field moving
-// (the racy case); such a file keeps its content hash, and its content is compared on every check.
+// What a run knew of one input file or directory: enough to tell later, by stat alone where that
+// is safe, whether the file still holds what the run read (for a directory: the names in it). A file modified
+// shortly before the run may be modified again within the same tick of the file system's clock without any
+// stat field moving (the racy case); such a file keeps its content hash, and its content is compared on every
+// check.
 #pragma once
 
 #include <sys/stat.h>
@@ -27,12 +28,13 @@ struct InputStamp {
   std::uint64_t inode = 0;
   std::int64_t modified = 0;  // nanoseconds
   std::int64_t changed = 0;   // nanoseconds
+  bool directory = false;
   bool racy = false;
   std::uint64_t hash = 0;  // of the content, when racy
 
   // The stamp of `path` for a run that started at `runStart` (nanoseconds of the real-time
-  // clock). Nothing for what is not a readable regular file and for a file modified since the
-  // run started: which content the run read is not known then.
+  // clock). Nothing for what is neither a readable regular file nor a directory, and for one
+  // modified since the run started: which content the run read is not known then.
   static std::optional<InputStamp> Take(const std::string& path, std::int64_t runStart);
   // Whether the file, whose stat today is `now`, still holds what was stamped.
   bool Holds(const struct stat& now) const;
@@ -40,12 +42,16 @@ struct InputStamp {
 
   static std::int64_t Now();
 
+  // The numbers of an encoded stamp, after its path.
+  static constexpr std::size_t kNumbers = 8;
   void Encode(Port::ArchiveEncoder& out) const;
   bool Decode(Port::ArchiveDecoder& in);
 
  private:
   bool SameStat(const struct stat& now) const;
   bool SameContent() const;
+  // The file's text or the directory's sorted names; nothing when it cannot be read.
+  std::optional<std::string> Content() const;
 };
 
 }  // namespace quillon

@@ -1,6 +1,5 @@
 #include "ResultCache.h"
 
-#include <dirent.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -62,46 +61,39 @@ void AddEnvironment(std::string& key) {
   for (std::string_view variable : variables) AddLine(key, "env", variable);
 }
 
-void AddFile(std::string& key, const SourceFile& file) {
-  AddLine(key, "file", file.path + '\t' + file.givenPath + '\t' + file.library + '\t' + file.plugin);
-}
-
-// The names in a -y directory: a file added there may become the one a module is taken from.
-void AddListing(std::string& key, const std::string& directory) {
-  std::set<std::string> names;
-  if (DIR* listing = ::opendir(directory.c_str())) {
-    while (const dirent* entry = ::readdir(listing)) names.insert(entry->d_name);
-    ::closedir(listing);
-  }
-  for (const std::string& name : names) AddLine(key, "listed", name);
-}
-
 bool MentionsInclude(const std::string& path) {
   std::string text;
   return !CacheFiles::Read(path, text) || text.find("`include") != std::string::npos;
 }
 
-// Every file whose content the run's answer depends on, each once; empty when the answer depends
-// on more than the key and these files can tell.
+void AddOnce(std::vector<std::string>& paths, std::set<std::string>& seen, const std::string& path) {
+  if (seen.insert(path).second) paths.push_back(path);
+}
+
+// Every file and directory whose content the run's answer depends on, each once; empty when the
+// answer depends on more than the key and these can tell.
 std::vector<std::string> InputsOf(const ProjectSources& resolved) {
+  if (resolved.consulted.patterns) return {};
   std::vector<std::string> paths;
   std::set<std::string> seen;
   for (const SourceFile& file : resolved.files) {
     if (!ParseCache::Keeps(file.plugin)) return {};
     if (ParseCache::IsVerilog(file.plugin) && MentionsInclude(file.path)) return {};
-    if (seen.insert(file.path).second) paths.push_back(file.path);
+    AddOnce(paths, seen, file.path);
   }
-  for (const SourceFile& file : resolved.librarySearch.files) {
-    std::string path = FileList::Resolved(file.path, "");
-    if (seen.insert(path).second) paths.push_back(path);
-  }
+  for (const std::string& path : resolved.consulted.files) AddOnce(paths, seen, path);
+  for (const std::string& path : resolved.consulted.directories) AddOnce(paths, seen, path);
+  for (const SourceFile& file : resolved.librarySearch.files)
+    AddOnce(paths, seen, FileList::Resolved(file.path, ""));
+  for (const SourceFile& directory : resolved.librarySearch.directories)
+    AddOnce(paths, seen, FileList::Resolved(directory.path, ""));
   return paths;
 }
 
 }  // namespace
 
-ResultCache::ResultCache(std::string directory, const Options& options, const ProjectSources& sources)
-    : directory_(std::move(directory)), key_(KeyOf(options, sources)) {}
+ResultCache::ResultCache(std::string directory, const Options& options)
+    : directory_(std::move(directory)), key_(KeyOf(options)) {}
 
 bool ResultCache::Applies(const Options& options) {
   bool answers = options.command != Command::kWatch && options.command != Command::kFactories;
@@ -111,7 +103,7 @@ bool ResultCache::Applies(const Options& options) {
   return answers && !fromStandardInput && options.outputPath.empty() && !options.arguments.empty();
 }
 
-std::string ResultCache::KeyOf(const Options& options, const ProjectSources& sources) {
+std::string ResultCache::KeyOf(const Options& options) {
   std::string key;
   std::string program = ProgramPath(), module = InstallLayout::ModulePath();
   AddLine(key, "program", program + ' ' + StatOf(program));
@@ -123,16 +115,6 @@ std::string ResultCache::KeyOf(const Options& options, const ProjectSources& sou
   AddLine(key, "terminals",
           std::to_string(::isatty(STDOUT_FILENO)) + std::to_string(::isatty(STDERR_FILENO)) +
               std::to_string(OutputCapture::OutputsShared()));
-  for (const auto& [name, value] : sources.properties) AddLine(key, "property", name + '=' + value);
-  for (const std::string& library : sources.externalLibraries) AddLine(key, "external", library);
-  for (const std::string& warning : sources.warnings) AddLine(key, "warning", warning);
-  for (const SourceFile& file : sources.files) AddFile(key, file);
-  for (const SourceFile& file : sources.librarySearch.files) AddLine(key, "library-file", file.path);
-  for (const std::string& extension : sources.librarySearch.extensions) AddLine(key, "extension", extension);
-  for (const SourceFile& directory : sources.librarySearch.directories) {
-    AddLine(key, "library-dir", directory.path + '\t' + directory.library);
-    AddListing(key, FileList::Resolved(directory.path, ""));
-  }
   return key;
 }
 

@@ -1,13 +1,15 @@
 // The answers of whole runs, kept in the cache directory beside the parse cache. An entry is
-// keyed by everything that shapes a run's answer apart from the sources' contents: the program
-// and its module, the arguments, the current directory, the environment, which outputs are
-// terminals, the loaded file set with its libraries, plug-ins and properties, and the listings
-// of the -y directories. It holds the stamps of every source and -v file the run read, the exit
-// status and the bytes written to standard output and error. An entry is trusted when its key
-// matches and every stamp holds (InputStamp); the stored bytes are then the answer.
+// keyed by everything that shapes a run's answer apart from the files it reads: the program and
+// its module, the arguments, the current directory, the environment and which outputs are
+// terminals. It holds the stamps of every file and directory the run read (project files and
+// lists, the directories given as sources, sources, -v files, -y directories), the exit status
+// and the bytes written to standard output and error. An entry is trusted when its key matches
+// and every stamp holds (InputStamp); the stored bytes are then the answer, found without reading
+// the project at all.
 //
-// Runs whose answer depends on files the key cannot see are not kept: sources of plug-ins other
-// than VHDL and Verilog (converters, other programs) and Verilog that uses `include.
+// Runs whose answer depends on files the stamps cannot see are not kept: sources of plug-ins
+// other than VHDL and Verilog (converters, other programs), Verilog that uses `include, and
+// patterns matched against the file system.
 #pragma once
 
 #include <optional>
@@ -21,8 +23,7 @@ namespace quillon {
 
 class ResultCache {
  public:
-  // `sources` as loaded, before the library search adds to them.
-  ResultCache(std::string directory, const Options& options, const ProjectSources& sources);
+  ResultCache(std::string directory, const Options& options);
 
   // Whether a run of these options can be kept: a command that only writes its answer, to
   // standard output, and sources that are not read from standard input.
@@ -34,13 +35,13 @@ class ResultCache {
   };
   // The stored answer, when the entry is trusted.
   std::optional<Answer> Lookup() const;
-  // Keeps the answer of a run that started at `runStart` on `resolved` (the sources after the
-  // library search). Silent when it cannot: the next run just works again.
+  // Keeps the answer of a run that started at `runStart` on `resolved` (the sources as gathered,
+  // after the library search). Silent when it cannot: the next run just works again.
   void Store(const ProjectSources& resolved, std::int64_t runStart, int status,
              const OutputCapture::Captured& output) const;
 
  private:
-  static std::string KeyOf(const Options& options, const ProjectSources& sources);
+  static std::string KeyOf(const Options& options);
   std::string EntryPath() const;
 
   std::string directory_;

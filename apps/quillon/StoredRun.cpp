@@ -7,8 +7,8 @@ namespace quillon {
 namespace {
 
 constexpr std::string_view kRunMagic{"\x89QLNRUN\n", 8};
-// The fewest bytes a stamp takes: an empty path's length and seven numbers.
-constexpr std::size_t kSmallestStamp = 4 + 7 * 8;
+// The fewest bytes a stamp takes: an empty path's length and its numbers.
+constexpr std::size_t kSmallestStamp = 4 + InputStamp::kNumbers * 8;
 
 }  // namespace
 

@@ -267,7 +267,16 @@ TEST(ResultCache, DoesNotTrustTheStatOfARecentlyModifiedFile) {
 
   // Modified since the run started: what the run read is not known, nothing is stamped.
   EXPECT_FALSE(InputStamp::Take(path, modified));
-  EXPECT_FALSE(InputStamp::Take(dir.path(), modified + 2 * InputStamp::kRacyNanoseconds));
+
+  // A directory's content is its names.
+  struct stat listed {};
+  ASSERT_EQ(::stat(dir.path().c_str(), &listed), 0);
+  std::int64_t changed = listed.st_ctim.tv_sec * 1'000'000'000LL + listed.st_ctim.tv_nsec;
+  std::optional<InputStamp> folder = InputStamp::Take(dir.path(), changed + InputStamp::kRacyNanoseconds / 2);
+  ASSERT_TRUE(folder && folder->directory && folder->racy);
+  EXPECT_TRUE(folder->Holds(listed));
+  WriteText(dir.Path("b.vhd"), "");
+  EXPECT_FALSE(folder->Holds(listed));
 }
 
 }  // namespace
