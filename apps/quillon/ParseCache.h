@@ -40,9 +40,6 @@ class ParseCache {
   static bool Keeps(const std::string& plugin);
   static bool IsVerilog(const std::string& plugin);
 
-  // The file's design-unit records in the module's archive format; false when it has none to give.
-  static bool RecordsOf(Vad::IHdlFile* file, std::string& records);
-
   std::size_t hits() const { return hits_; }
   std::size_t misses() const { return misses_; }
 
@@ -60,6 +57,8 @@ class ParseCache {
   std::string EntryPath(const std::string& sourcePath) const;
   bool ReadEntry(Vad::IHdlFile* file, const std::string& key, CacheEntry& entry);
   static bool Load(Vad::IHdlFile* file, const CacheEntry& entry);
+  // The file's design-unit records in the module's archive format; false when it has none to give.
+  static bool RecordsOf(Vad::IHdlFile* file, std::string& records);
   void Replay(const CacheEntry& entry);
   void Store(Vad::IHdlFile* file, const std::string& key, std::vector<Port_MsgRecord> messages);
   std::vector<Port_MsgRecord> ReceivedSince(std::size_t mark) const;

@@ -36,19 +36,6 @@ Prjrep::AutoRelease<Vad::IHdlFileIterator> FilesOf(Vad::IHdlProject* project) {
   return files;
 }
 
-// The records are listed first so that their large descriptions are built in place, never moved.
-std::vector<UnitInfo> UnitsOf(Vad::IHdlFile* file) {
-  std::vector<UnitInfo> units;
-  Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> iterator;
-  if (file->getDesignUnits(nullptr, iterator.Out()) != CitI::kOk) return units;
-  std::vector<Vad::IHdlDesignUnit*> records;
-  ForEachIn(iterator.Get(), [&](Vad::IHdlDesignUnit* unit) { records.push_back(unit); });
-  units.resize(records.size());
-  UnitRecordReader reader;
-  for (std::size_t i = 0; i < records.size(); ++i) reader.Read(records[i], units[i]);
-  return units;
-}
-
 // The project's Verilog files in the order it compiles them: largest order key first.
 std::vector<Vad::IHdlFile*> VerilogFilesOf(Vad::IHdlProject* project) {
   std::vector<std::pair<std::uint64_t, Vad::IHdlFile*>> keyed;
@@ -95,6 +82,19 @@ PortInfo PortInfoOf(Vad::IHdlPort* port) {
 }
 
 }  // namespace
+
+// The records are listed first so that their large descriptions are built in place, never moved.
+std::vector<UnitInfo> ProjectReader::UnitsOf(Vad::IHdlFile* file) {
+  std::vector<UnitInfo> units;
+  Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> iterator;
+  if (file->getDesignUnits(nullptr, iterator.Out()) != CitI::kOk) return units;
+  std::vector<Vad::IHdlDesignUnit*> records;
+  ForEachIn(iterator.Get(), [&](Vad::IHdlDesignUnit* unit) { records.push_back(unit); });
+  units.resize(records.size());
+  UnitRecordReader reader;
+  for (std::size_t i = 0; i < records.size(); ++i) reader.Read(records[i], units[i]);
+  return units;
+}
 
 std::size_t ProjectReader::FileCount() const {
   auto* set = Prjrep::QueryAs<Vad::IHdlFileSet>(project_);

@@ -11,6 +11,7 @@
 #include <cstring>
 #include <nlohmann/json.hpp>
 #include <sstream>
+#include <tuple>
 
 #include "CommandRunner.h"
 #include "ExitStatus.h"
@@ -24,6 +25,7 @@
 #include "Port/File.h"
 #include "Port/FileName.h"
 #include "ProjectLoader.h"
+#include "ProjectReader.h"
 
 namespace quillon {
 
@@ -60,6 +62,29 @@ std::string DirectoryOf(const std::string& path) {
 bool SameMessage(const Port_MsgRecord& a, const Port_MsgRecord& b) {
   return a.type == b.type && a.text == b.text && a.category == b.category && a.sourceFile == b.sourceFile &&
          a.line == b.line && a.revision == b.revision && a.number == b.number;
+}
+
+auto FieldsOf(const UnitInfo& u) {
+  return std::tie(u.type, u.name, u.key, u.storeKey, u.line, u.parent, u.inGenerate, u.unitFlag, u.partition,
+                  u.entity, u.architecture, u.component, u.library, u.package, u.item, u.uses);
+}
+
+bool SameUnit(const UnitInfo& a, const UnitInfo& b) { return FieldsOf(a) == FieldsOf(b); }
+
+// The file's records with their store keys replaced by numbers in order of first appearance.
+std::vector<UnitInfo> UnitsWithNumberedKeys(Vad::IHdlFile* file) {
+  std::vector<UnitInfo> units = ProjectReader::UnitsOf(file);
+  std::map<std::string, std::string> numbers;
+  auto renumber = [&](std::string& key) {
+    key = numbers.emplace(key, std::to_string(numbers.size())).first->second;
+  };
+  for (UnitInfo& unit : units) renumber(unit.storeKey);
+  for (UnitInfo& unit : units) {
+    if (unit.parent) renumber(*unit.parent);
+    if (unit.uses)
+      for (std::string& used : *unit.uses) renumber(used);
+  }
+  return units;
 }
 
 // The messages of a refresh's standard error: a line with the indented lines that continue it.
@@ -289,7 +314,8 @@ std::vector<Vad::IHdlFile*> Watcher::FilesAt(const std::set<std::string>& paths)
 }
 
 bool Watcher::Parsed::operator==(const Parsed& other) const {
-  return records == other.records && messages.size() == other.messages.size() &&
+  return std::equal(units.begin(), units.end(), other.units.begin(), other.units.end(), SameUnit) &&
+         messages.size() == other.messages.size() &&
          std::equal(messages.begin(), messages.end(), other.messages.begin(), SameMessage);
 }
 
@@ -312,7 +338,7 @@ bool Watcher::ParseChanged(const std::set<std::string>& paths) {
       file->parseIfNeeded();
       now.messages = hidden.received();
     }
-    ParseCache::RecordsOf(file, now.records);
+    now.units = UnitsWithNumberedKeys(file);
     auto before = parsed_.find(described.path);
     if (before == parsed_.end() || !(before->second == now)) changed = true;
     parsed_[described.path] = std::move(now);

@@ -12,6 +12,7 @@
 #include <string>
 #include <vector>
 
+#include "DesignModel.h"
 #include "IHdlFile.h"
 #include "ModuleLoader.h"
 #include "Options.h"
@@ -40,9 +41,10 @@ class Watcher {
     bool stop = false;
   };
 
-  // What a file's last parse here gave: its records and its messages.
+  // What a file's last parse here gave: its records (store keys numbered in order of appearance,
+  // as every parse makes new ones) and its messages.
   struct Parsed {
-    std::string records;
+    std::vector<UnitInfo> units;
     std::vector<Port_MsgRecord> messages;
     bool operator==(const Parsed&) const;
   };
