@@ -6,11 +6,13 @@ Usage: bench/cache-bench.py [--quillon PATH] [--work DIR] [--count N] [--command
 
 Rows: cold without cache (--no-cache), cold with an empty cache (parses and writes every entry),
 nothing changed, one file changed; then watch: the time from writing one file to the new answer
-(median of several edits).
+(median of several edits). Each row gives the best wall time and the best processor time (user
+and system) of its runs: on a shared machine the processor time is the steadier measure.
 """
 import argparse
 import importlib.util
 import os
+import resource
 import select
 import shutil
 import statistics
@@ -23,20 +25,27 @@ cli_bench = importlib.util.module_from_spec(module_file)
 module_file.loader.exec_module(cli_bench)
 
 
+def processor_time():
+    used = resource.getrusage(resource.RUSAGE_CHILDREN)
+    return used.ru_utime + used.ru_stime
+
+
 def timed(args):
-    start = time.monotonic()
+    start, cpu = time.monotonic(), processor_time()
     proc = subprocess.run(args, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
-    return time.monotonic() - start, proc.returncode
+    return time.monotonic() - start, processor_time() - cpu, proc.returncode
 
 
+# The best wall time and the best processor time of the runs.
 def best(args, runs, before=None):
-    times = []
+    walls, cpus = [], []
     for _ in range(runs):
         if before:
             before()
-        wall, status = timed(args)
-        times.append(wall)
-    return min(times), status
+        wall, cpu, _ = timed(args)
+        walls.append(wall)
+        cpus.append(cpu)
+    return min(walls), min(cpus)
 
 
 def edit(path, counter=[0]):
@@ -77,15 +86,15 @@ def main():
     cache = os.path.join(args.work, f"cache-vhdl-{args.count}")
     base = [args.quillon, "-q", "--cache", cache, args.command, "-f", listing]
 
-    cold_plain, _ = best([args.quillon, "-q", "--no-cache", args.command, "-f", listing], args.runs)
-    cold, _ = best(base, args.runs, before=lambda: shutil.rmtree(cache, ignore_errors=True))
-    unchanged, _ = best(base, args.runs)
-    one, _ = best(base, args.runs, before=lambda: edit(changed))
+    rows = [("cold, no cache", best([args.quillon, "-q", "--no-cache", args.command, "-f", listing], args.runs)),
+            ("cold, empty cache", best(base, args.runs, before=lambda: shutil.rmtree(cache, ignore_errors=True))),
+            ("nothing changed", best(base, args.runs)),
+            ("one file changed", best(base, args.runs, before=lambda: edit(changed)))]
+    cold_wall, cold_cpu = rows[0][1]
     print(f"vhdl-{args.count} {args.command}")
-    print(f"  cold, no cache        {cold_plain:8.3f} s")
-    print(f"  cold, empty cache     {cold:8.3f} s")
-    print(f"  nothing changed       {unchanged:8.3f} s  {100 * unchanged / cold_plain:5.1f} % of cold")
-    print(f"  one file changed      {one:8.3f} s  {100 * one / cold_plain:5.1f} % of cold")
+    for name, (wall, cpu) in rows:
+        print(f"  {name:20s} {wall:8.3f} s wall {100 * wall / cold_wall:6.1f} %   "
+              f"{cpu:8.3f} s cpu {100 * cpu / cold_cpu:6.1f} %")
     reactions, status = watch_reaction(args.quillon, listing, changed, 5)
     if reactions:
         print(f"  watch, one file       {statistics.median(reactions) * 1000:8.1f} ms (median of {len(reactions)}), "

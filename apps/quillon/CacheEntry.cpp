@@ -7,21 +7,7 @@ namespace quillon {
 namespace {
 
 constexpr std::string_view kEntryMagic{"\x89QLNPCE\n", 8};
-constexpr std::size_t kEntryHeaderSize = kEntryMagic.size() + 4 + 8 + 8;  // magic, version, length, sum
 constexpr std::uint32_t kMaxMessages = 1u << 20;
-
-void PutString(Port::ArchiveEncoder& out, std::string_view text) {
-  out.PutUInt32(static_cast<std::uint32_t>(text.size()));
-  out.PutBytes(text);
-}
-
-bool TakeString(Port::ArchiveDecoder& in, std::string& text) {
-  std::uint32_t size = 0;
-  std::string_view bytes;
-  if (!in.TakeUInt32(&size) || !in.TakeBytes(size, &bytes)) return false;
-  text.assign(bytes);
-  return true;
-}
 
 bool TakeInt(Port::ArchiveDecoder& in, int& value) {
   std::uint32_t raw = 0;
@@ -41,58 +27,79 @@ std::uint64_t CacheEntry::Hash(std::string_view bytes) {
   return hash;
 }
 
-std::string CacheEntry::Encode() const {
-  Port::ArchiveEncoder payload;
-  PutString(payload, key);
-  payload.PutUInt32(static_cast<std::uint32_t>(messages.size()));
-  for (const Port_MsgRecord& message : messages) {
-    payload.PutUInt32(static_cast<std::uint32_t>(message.type));
-    PutString(payload, message.text);
-    PutString(payload, message.category);
-    PutString(payload, message.sourceFile);
-    payload.PutUInt32(static_cast<std::uint32_t>(message.line));
-    PutString(payload, message.revision);
-    payload.PutUInt32(static_cast<std::uint32_t>(message.number));
-  }
-  PutString(payload, records);
+void CacheEntry::PutText(Port::ArchiveEncoder& out, std::string_view text) {
+  out.PutUInt32(static_cast<std::uint32_t>(text.size()));
+  out.PutBytes(text);
+}
 
+bool CacheEntry::TakeText(Port::ArchiveDecoder& in, std::string& text) {
+  std::uint32_t size = 0;
+  std::string_view bytes;
+  if (!in.TakeUInt32(&size) || !in.TakeBytes(size, &bytes)) return false;
+  text.assign(bytes);
+  return true;
+}
+
+std::string CacheEntry::Framed(std::string_view magic, std::uint32_t version, std::string_view payload) {
   Port::ArchiveEncoder whole;
-  whole.PutBytes(kEntryMagic);
-  whole.PutUInt32(kFormatVersion);
-  whole.PutUInt64(payload.Bytes().size());
-  whole.PutUInt64(Hash(payload.Bytes()));
-  whole.PutBytes(payload.Bytes());
+  whole.PutBytes(magic);
+  whole.PutUInt32(version);
+  whole.PutUInt64(payload.size());
+  whole.PutUInt64(Hash(payload));
+  whole.PutBytes(payload);
   return whole.Bytes();
 }
 
-bool CacheEntry::Decode(std::string_view bytes) {
+std::optional<std::string_view> CacheEntry::Unframed(std::string_view bytes, std::string_view magic,
+                                                     std::uint32_t version) {
   Port::ArchiveDecoder header(bytes);
-  std::string_view magic;
-  std::uint32_t version = 0;
+  std::string_view found;
+  std::uint32_t foundVersion = 0;
   std::uint64_t length = 0, sum = 0;
-  if (!header.TakeBytes(kEntryMagic.size(), &magic) || magic != kEntryMagic || !header.TakeUInt32(&version) ||
-      version != kFormatVersion || !header.TakeUInt64(&length) || !header.TakeUInt64(&sum) ||
+  if (!header.TakeBytes(magic.size(), &found) || found != magic || !header.TakeUInt32(&foundVersion) ||
+      foundVersion != version || !header.TakeUInt64(&length) || !header.TakeUInt64(&sum) ||
       length != header.Remaining())
-    return false;
-  std::string_view payloadBytes = bytes.substr(kEntryHeaderSize);
-  if (Hash(payloadBytes) != sum) return false;
+    return std::nullopt;
+  std::string_view payload = bytes.substr(header.Position());
+  if (Hash(payload) != sum) return std::nullopt;
+  return payload;
+}
 
-  Port::ArchiveDecoder in(payloadBytes);
+std::string CacheEntry::Encode() const {
+  Port::ArchiveEncoder payload;
+  PutText(payload, key);
+  payload.PutUInt32(static_cast<std::uint32_t>(messages.size()));
+  for (const Port_MsgRecord& message : messages) {
+    payload.PutUInt32(static_cast<std::uint32_t>(message.type));
+    PutText(payload, message.text);
+    PutText(payload, message.category);
+    PutText(payload, message.sourceFile);
+    payload.PutUInt32(static_cast<std::uint32_t>(message.line));
+    PutText(payload, message.revision);
+    payload.PutUInt32(static_cast<std::uint32_t>(message.number));
+  }
+  PutText(payload, records);
+  return Framed(kEntryMagic, kFormatVersion, payload.Bytes());
+}
+
+bool CacheEntry::Decode(std::string_view bytes) {
+  std::optional<std::string_view> payload = Unframed(bytes, kEntryMagic, kFormatVersion);
+  if (!payload) return false;
+  Port::ArchiveDecoder in(*payload);
   std::uint32_t count = 0;
-  if (!TakeString(in, key) || !in.TakeUInt32(&count) || count > kMaxMessages) return false;
+  if (!TakeText(in, key) || !in.TakeUInt32(&count) || count > kMaxMessages) return false;
   messages.clear();
   for (std::uint32_t i = 0; i < count; ++i) {
     Port_MsgRecord message;
     int type = 0;
     if (!TakeInt(in, type) || type < Port_MsgMan::kError || type > Port_MsgMan::kUserFatal ||
-        !TakeString(in, message.text) || !TakeString(in, message.category) ||
-        !TakeString(in, message.sourceFile) || !TakeInt(in, message.line) ||
-        !TakeString(in, message.revision) || !TakeInt(in, message.number))
+        !TakeText(in, message.text) || !TakeText(in, message.category) || !TakeText(in, message.sourceFile) ||
+        !TakeInt(in, message.line) || !TakeText(in, message.revision) || !TakeInt(in, message.number))
       return false;
     message.type = static_cast<Port_MsgMan::MsgType>(type);
     messages.push_back(std::move(message));
   }
-  return TakeString(in, records) && in.Remaining() == 0;
+  return TakeText(in, records) && in.Remaining() == 0;
 }
 
 }  // namespace quillon

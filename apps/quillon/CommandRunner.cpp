@@ -25,9 +25,11 @@
 #include "Host/HostComponents.h"
 #include "IHdlElement.h"
 #include "IName.h"
+#include "InputStamp.h"
 #include "JsonOutput.h"
 #include "LibraryResolver.h"
 #include "ModuleLoader.h"
+#include "OutputCapture.h"
 #include "OutputFile.h"
 #include "ParseCache.h"
 #include "Port/Env.h"
@@ -37,6 +39,7 @@
 #include "ProjectBuilder.h"
 #include "ProjectLoader.h"
 #include "RavA/Factory.h"
+#include "ResultCache.h"
 #include "TerminalColor.h"
 #include "TextOutput.h"
 #include "TreeReader.h"
@@ -103,6 +106,9 @@ std::vector<std::string> InputPaths(const ProjectSources& sources, const Options
 
 }  // namespace
 
+CommandRunner::CommandRunner(const Options& options)
+    : options_(options), colorOnError_(TerminalColor::Wanted(options.color, STDERR_FILENO)) {}
+
 int CommandRunner::Run() {
   if (options_.command == Command::kFactories) return ListFactories();
   if (options_.command == Command::kWatch) return Watcher(options_).Run();
@@ -113,9 +119,7 @@ int CommandRunner::Run() {
   return status;
 }
 
-bool CommandRunner::ColorOnStandardError() const {
-  return TerminalColor::Wanted(options_.color, STDERR_FILENO);
-}
+bool CommandRunner::ColorOnStandardError() const { return colorOnError_; }
 
 int CommandRunner::BadInput(const std::string& text) {
   std::fprintf(stderr, "quillon: %s\n", text.c_str());
@@ -167,12 +171,42 @@ int CommandRunner::RunOn(Vad::IHdlProject* project, const ProjectSources& source
   return status;
 }
 
+// Without a stored answer, the sources are gathered and the command runs; with one, neither.
+// An answer is kept only when the sources could be gathered: what was missing has no stamp.
 int CommandRunner::RunOnProject() {
+  std::string directory = CacheDirectory();
+  if (directory.empty() || !ResultCache::Applies(options_)) return LoadAndRun();
+  ResultCache results(directory, options_);
+  if (std::optional<ResultCache::Answer> stored = results.Lookup()) return Emit(stored->output, stored->status);
+
+  std::int64_t start = InputStamp::Now();
+  OutputCapture capture;
+  if (!capture.Begin()) return LoadAndRun();
+  ProjectSources sources;
+  std::string error;
+  bool loaded = ProjectLoader(sources).Load(options_, error);
+  int status = loaded ? RunOnSources(sources) : BadInput(error);
+  OutputCapture::Captured output = capture.End();
+  if (loaded) results.Store(sources, start, status, output);
+  return Emit(output, status);
+}
+
+int CommandRunner::LoadAndRun() {
   ProjectSources sources;
   std::string error;
   if (!ProjectLoader(sources).Load(options_, error)) return BadInput(error);
-  TakeSettings(sources);
+  return RunOnSources(sources);
+}
 
+int CommandRunner::Emit(const OutputCapture::Captured& output, int status) {
+  if (OutputCapture::Emit(output)) return status;
+  std::fprintf(stderr, "quillon: the output could not be written\n");
+  return kExitFailed;
+}
+
+int CommandRunner::RunOnSources(ProjectSources& sources) {
+  TakeSettings(sources);
+  std::string error;
   OutputFile file;
   const bool toFile = !options_.outputPath.empty();
   if (toFile) {

@@ -9,6 +9,7 @@
 #include "Diagnostic.h"
 #include "MessageLog.h"
 #include "Options.h"
+#include "OutputCapture.h"
 #include "ProjectReader.h"
 #include "ProjectSources.h"
 #include "ShownPaths.h"
@@ -17,7 +18,8 @@ namespace quillon {
 
 class CommandRunner {
  public:
-  explicit CommandRunner(const Options& options) : options_(options) {}
+  // Whether standard error takes colour is settled here, before any output is captured.
+  explicit CommandRunner(const Options& options);
 
   // The exit status (ExitStatus.h).
   int Run();
@@ -29,6 +31,12 @@ class CommandRunner {
   // The external libraries and the Verilog settings of the sources.
   void TakeSettings(const ProjectSources& sources);
   int RunOnProject();
+  // Gathers the sources and runs the command on them.
+  int LoadAndRun();
+  // The command on gathered sources, from the library search on.
+  int RunOnSources(ProjectSources& sources);
+  // Writes a captured or stored answer; `status`, or kExitFailed when the output cannot take it.
+  static int Emit(const OutputCapture::Captured& output, int status);
   int RunCommand(Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out);
   int ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount, Progress& progress, std::ostream& out);
   int Units(ProjectReader& reader, std::ostream& out);
@@ -67,6 +75,7 @@ class CommandRunner {
   static std::string CacheInputs(const ProjectSources& sources, const std::string& modulePath);
 
   const Options& options_;
+  bool colorOnError_;
   std::string cacheInputs_;
   MessageLog* log_ = nullptr;
   // From the command line and the project file.

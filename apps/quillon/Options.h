@@ -73,6 +73,8 @@ class Options {
   // --cache DIR; empty: .quillon beside the first project file, or no cache without one.
   std::string cacheDir;
   bool noCache = false;
+  // The arguments as given, after the program name; what the result cache keys a run by.
+  std::vector<std::string> arguments;
   // The command whose answer watch prints again whenever it changes: order, tree or check.
   Command watchView = Command::kOrder;
 };

@@ -1,16 +1,14 @@
 #include "ParseCache.h"
 
-#include <fcntl.h>
 #include <sys/stat.h>
-#include <unistd.h>
 
 #include <algorithm>
-#include <cerrno>
 #include <cinttypes>
 #include <cstdio>
 #include <fstream>
 #include <iterator>
 
+#include "CacheFiles.h"
 #include "FileFacts.h"
 #include "IHdlParseResults.h"
 #include "Port/FileArchive.h"
@@ -27,13 +25,15 @@ bool IsPlugin(const std::string& plugin, std::string_view name) {
            return std::tolower(static_cast<unsigned char>(a)) == std::tolower(static_cast<unsigned char>(b));
          });
 }
-bool IsVerilog(const std::string& plugin) { return IsPlugin(plugin, "PLUGIN_Verilog"); }
-// The parsers whose inputs the key covers: the source alone and the project's settings.
-bool IsKept(const std::string& plugin) { return IsVerilog(plugin) || IsPlugin(plugin, "PLUGIN_Vhdl"); }
 
 std::string Number(std::uint64_t value) { return std::to_string(value); }
 
 }  // namespace
+
+bool ParseCache::IsVerilog(const std::string& plugin) { return IsPlugin(plugin, "PLUGIN_Verilog"); }
+bool ParseCache::Keeps(const std::string& plugin) {
+  return IsVerilog(plugin) || IsPlugin(plugin, "PLUGIN_Vhdl");
+}
 
 // ---- keys --------------------------------------------------------------------------------------
 
@@ -56,7 +56,7 @@ std::optional<ParseCache::Facts> ParseCache::FactsOf(const std::string& path) {
 
 std::optional<std::string> ParseCache::KeyOf(Vad::IHdlFile* file) {
   OrderEntry described = FileFacts::Describe(file);
-  if (!IsKept(described.plugin) || described.path.empty()) return std::nullopt;
+  if (!Keeps(described.plugin) || described.path.empty()) return std::nullopt;
   std::optional<Facts> facts = FactsOf(described.path);
   if (!facts) return std::nullopt;
   std::string key = described.path + '\n' + described.plugin + '\n' + described.library + '\n' +
@@ -92,10 +92,9 @@ std::string ParseCache::EntryPath(const std::string& sourcePath) const {
 // ---- reading -----------------------------------------------------------------------------------
 
 bool ParseCache::ReadEntry(Vad::IHdlFile* file, const std::string& key, CacheEntry& entry) {
-  std::ifstream in(EntryPath(FileFacts::PathOf(file)), std::ios::binary);
-  if (!in) return false;
-  std::string bytes((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
-  return !in.bad() && entry.Decode(bytes) && entry.key == key;
+  std::string bytes;
+  return CacheFiles::Read(EntryPath(FileFacts::PathOf(file)), bytes) && entry.Decode(bytes) &&
+         entry.key == key;
 }
 
 bool ParseCache::Load(Vad::IHdlFile* file, const CacheEntry& entry) {
@@ -172,36 +171,20 @@ void ParseCache::StoreVerilog(const std::vector<Vad::IHdlFile*>& files) {
   }
 }
 
-void ParseCache::Store(Vad::IHdlFile* file, const std::string& key, std::vector<Port_MsgRecord> messages) {
+bool ParseCache::RecordsOf(Vad::IHdlFile* file, std::string& records) {
   auto* results = Prjrep::QueryAs<Vad::IHdlParseResults>(file);
   Prjrep::AutoPtr<Prjrep::IArchive> archive = Port::FileArchive::CreateInMemory();
   auto* writer = Prjrep::ObjectCast<Port::FileArchive>(archive.Get());
-  if (!results || !writer || results->saveParseResults(archive.Get()) != CitI::kOk) return;
-  if (writer->Close() != CitI::kOk) return;
-  CacheEntry entry{key, std::move(messages), std::string(writer->Bytes())};
-  WriteEntry(EntryPath(FileFacts::PathOf(file)), entry.Encode());
+  if (!results || !writer || results->saveParseResults(archive.Get()) != CitI::kOk) return false;
+  if (writer->Close() != CitI::kOk) return false;
+  records.assign(writer->Bytes());
+  return true;
 }
 
-// A cache that cannot be written costs time, not correctness: failures are silent.
-bool ParseCache::WriteEntry(const std::string& path, const std::string& bytes) {
-  if (!directoryMade_) {
-    if (::mkdir(directory_.c_str(), 0777) != 0 && errno != EEXIST) return false;
-    directoryMade_ = true;
-  }
-  std::string temporary = path + ".XXXXXX";
-  int descriptor = ::mkstemp(temporary.data());
-  if (descriptor < 0) return false;
-  std::size_t written = 0;
-  while (written < bytes.size()) {
-    ssize_t count = ::write(descriptor, bytes.data() + written, bytes.size() - written);
-    if (count < 0 && errno == EINTR) continue;
-    if (count <= 0) break;
-    written += static_cast<std::size_t>(count);
-  }
-  bool complete = ::close(descriptor) == 0 && written == bytes.size();
-  if (complete && ::rename(temporary.c_str(), path.c_str()) == 0) return true;
-  ::unlink(temporary.c_str());
-  return false;
+void ParseCache::Store(Vad::IHdlFile* file, const std::string& key, std::vector<Port_MsgRecord> messages) {
+  CacheEntry entry{key, std::move(messages), {}};
+  if (!RecordsOf(file, entry.records)) return;
+  CacheFiles::Write(directory_, EntryPath(FileFacts::PathOf(file)), entry.Encode());
 }
 
 }  // namespace quillon

@@ -36,6 +36,10 @@ class ParseCache {
   void BeginVerilogParse() { verilogMark_ = log_.received().size(); }
   void StoreVerilog(const std::vector<Vad::IHdlFile*>& files);
 
+  // The parsers whose inputs the key covers: the source alone and the project's settings.
+  static bool Keeps(const std::string& plugin);
+  static bool IsVerilog(const std::string& plugin);
+
   std::size_t hits() const { return hits_; }
   std::size_t misses() const { return misses_; }
 
@@ -53,9 +57,10 @@ class ParseCache {
   std::string EntryPath(const std::string& sourcePath) const;
   bool ReadEntry(Vad::IHdlFile* file, const std::string& key, CacheEntry& entry);
   static bool Load(Vad::IHdlFile* file, const CacheEntry& entry);
+  // The file's design-unit records in the module's archive format; false when it has none to give.
+  static bool RecordsOf(Vad::IHdlFile* file, std::string& records);
   void Replay(const CacheEntry& entry);
   void Store(Vad::IHdlFile* file, const std::string& key, std::vector<Port_MsgRecord> messages);
-  bool WriteEntry(const std::string& path, const std::string& bytes);
   std::vector<Port_MsgRecord> ReceivedSince(std::size_t mark) const;
 
   std::string directory_;
@@ -65,7 +70,6 @@ class ParseCache {
   std::optional<std::string> verilogChain_;
   std::vector<Vad::IHdlFile*> restoredVerilog_;
   std::size_t verilogMark_ = 0;
-  bool directoryMade_ = false;
   std::size_t hits_ = 0;
   std::size_t misses_ = 0;
 };

@@ -18,6 +18,9 @@ class Progress {
   Progress& operator=(const Progress&) = delete;
 
   bool enabled() const { return enabled_; }
+  // The descriptor of the terminal the line goes to (standard error unless its output is being
+  // kept elsewhere).
+  static void ShowOn(int descriptor) { terminal_ = descriptor; }
   // "quillon: parsing 12/340"
   void Step(std::string_view what, std::size_t done, std::size_t total);
   // "quillon: elaborating"
@@ -26,6 +29,8 @@ class Progress {
   void Clear();
 
  private:
+  static inline int terminal_ = 2;
+
   bool enabled_;
   bool lineShown_ = false;
 };

@@ -101,12 +101,15 @@ bool IsHdlSource(const std::filesystem::path& path) {
 
 // The HDL files under `directory`, sorted so that runs are repeatable; the paths start with
 // `directory` as given.
-std::vector<std::string> HdlFilesUnder(const std::string& directory, std::string& error) {
+std::vector<std::string> HdlFilesUnder(const std::string& directory, std::vector<std::string>& listed,
+                                       std::string& error) {
   namespace fs = std::filesystem;
   std::vector<std::string> files;
   std::error_code failure;
+  listed.push_back(directory);
   fs::recursive_directory_iterator walk(directory, fs::directory_options::skip_permission_denied, failure);
   for (; !failure && walk != fs::recursive_directory_iterator(); walk.increment(failure)) {
+    if (walk->is_directory(failure)) listed.push_back(walk->path().string());
     if (walk->is_regular_file(failure) && IsHdlSource(walk->path())) files.push_back(walk->path().string());
   }
   if (failure) error = "cannot read the directory " + directory + ": " + failure.message();
@@ -142,7 +145,13 @@ bool OptionalText(const nlohmann::json& object, const char* name, std::string& o
 }  // namespace
 
 ProjectLoader::ProjectLoader(ProjectSources& sources)
-    : sources_(sources), lists_(ReadWholeFile, EnvironmentValue, std::cin) {}
+    : sources_(sources),
+      lists_(
+          [&sources](const std::string& path, std::string& text, std::string& error) {
+            sources.consulted.files.push_back(path);
+            return ReadWholeFile(path, text, error);
+          },
+          EnvironmentValue, std::cin) {}
 
 bool ProjectLoader::Load(const Options& options, std::string& error) {
   for (const SourceArgument& argument : options.sources) {
@@ -192,6 +201,7 @@ bool ProjectLoader::AddGiven(const std::string& given, const std::string& librar
     return AddPathOrDirectory(given, library, plugin, error);
   }
   std::vector<std::string> matches;
+  sources_.consulted.patterns = true;
   if (!GlobMatches(given, matches)) {
     error = "no file matches the pattern " + given;
     return false;
@@ -205,7 +215,7 @@ bool ProjectLoader::AddGiven(const std::string& given, const std::string& librar
 bool ProjectLoader::AddPathOrDirectory(const std::string& given, const std::string& library,
                                        const std::string& plugin, std::string& error) {
   if (!Port::File::isDirectory(given.c_str())) return AddSource(given, library, plugin, error);
-  std::vector<std::string> files = HdlFilesUnder(given, error);
+  std::vector<std::string> files = HdlFilesUnder(given, sources_.consulted.directories, error);
   if (!error.empty()) return false;
   if (files.empty()) sources_.warnings.push_back("the directory " + given + " holds no HDL source");
   for (const std::string& file : files) {
@@ -247,6 +257,7 @@ bool ProjectLoader::AddSource(const std::string& given, std::string library, std
 bool ProjectLoader::AddProjectFile(const SourceArgument& argument, std::string& error) {
   std::string projectPath = Canonical(argument.path, "");
   std::string text;
+  sources_.consulted.files.push_back(projectPath);
   if (!ReadWholeFile(projectPath, text, error)) {
     if (error.empty()) error = "cannot read project file " + projectPath;
     return false;

@@ -96,6 +96,14 @@ PortInfo PortInfoOf(Vad::IHdlPort* port) {
 
 }  // namespace
 
+std::vector<UnitInfo> ProjectReader::UnitsOf(Vad::IHdlFile* file) {
+  UnitRecordReader reader;
+  std::vector<Vad::IHdlDesignUnit*> records;
+  std::vector<UnitInfo> units;
+  ReadUnitsOf(file, reader, records, units);
+  return units;
+}
+
 std::size_t ProjectReader::FileCount() const {
   auto* set = Prjrep::QueryAs<Vad::IHdlFileSet>(project_);
   return set ? set->GetCount() : 0;

@@ -49,6 +49,8 @@ class ProjectReader {
   CitI::Result PortsOf(Vad::IHdlDesignUnit* unit, std::optional<std::vector<PortInfo>>& ports) const;
 
   std::size_t FileCount() const;
+  // Every record of the file's unit set.
+  static std::vector<UnitInfo> UnitsOf(Vad::IHdlFile* file);
 
  private:
   void ParseFilesOneByOne(ParseCache* cache);

@@ -27,6 +27,13 @@ struct ProjectSources {
     std::vector<SourceFile> files;
     std::vector<std::string> extensions;
   } librarySearch;
+  // What the gathering read besides the sources: project files and lists, and the directories it
+  // listed; whether a pattern was matched.
+  struct Consulted {
+    std::vector<std::string> files;
+    std::vector<std::string> directories;
+    bool patterns = false;
+  } consulted;
 };
 
 }  // namespace quillon

@@ -32,6 +32,7 @@ int main(int argc, char** argv) {
       case quillon::Options::Outcome::kRun:
         break;
     }
+    options.arguments.assign(argv + 1, argv + argc);
     return quillon::CommandRunner(options).Run();
   } catch (const std::exception& failure) {
     // Nothing is expected to throw; should the standard library run out of memory, say so in one

@@ -87,7 +87,7 @@ CitI::Result CHdlFile::loadParseResults(Prjrep::IArchive* archive) {
   CitI::Result result = ParseResultsArchive::Load(archive, records);
   if (result != CitI::kOk) return result;
   Prjrep::AutoRelease<IHdlFileIterator> projectFiles;
-  if (project_) projectFiles = project_->CurrentFileList();
+  if (project_) projectFiles = project_->CurrentFileList(pluginName_);
   holder->AdoptUnits(records, projectFiles.Get());
   needsParse_ = false;
   return CitI::kOk;

@@ -179,7 +179,10 @@ CHdlProject::VerilogSurvey CHdlProject::SurveyVerilogFiles() const {
   return survey;
 }
 
-Prjrep::AutoRelease<IHdlFileIterator> CHdlProject::CurrentFileList() const {
+Prjrep::AutoRelease<IHdlFileIterator> CHdlProject::CurrentFileList(const Port::StringBase& pluginName) const {
+  // Only Verilog files read the others; surveying the project for every other file loaded would
+  // make loading a project quadratic.
+  if (!IsVerilogPlugin(pluginName)) return {};
   return CProjectFileList::New(SurveyVerilogFiles().files);
 }
 

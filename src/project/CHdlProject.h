@@ -115,8 +115,9 @@ class CHdlProject final : public CitI::IInterface {
   };
 
  public:
-  // The file list that the project hands to the files it brings up to date now.
-  Prjrep::AutoRelease<IHdlFileIterator> CurrentFileList() const;
+  // The file list that the project hands to the files it brings up to date now, for a file of
+  // plug-in `pluginName`: none but for Verilog files.
+  Prjrep::AutoRelease<IHdlFileIterator> CurrentFileList(const Port::StringBase& pluginName) const;
 
  private:
   // The project's Verilog files (V3 flag set, plug-in name "PLUGIN_Verilog" in any case), largest

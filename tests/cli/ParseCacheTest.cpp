@@ -1,21 +1,29 @@
-// The parse cache: runs that load files from it answer exactly as runs that parse everything.
+// The parse cache and the stored runs: runs that load files from the cache, or answer from a stored
+// run, answer exactly as runs that parse everything.
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 
+#include <chrono>
 #include <filesystem>
 #include <fstream>
 #include <map>
 #include <string>
+#include <thread>
 #include <vector>
 
 #include "CacheEntry.h"
 #include "CliRun.h"
+#include "InputStamp.h"
 #include "SeededRandom.h"
+#include "StoredRun.h"
 
 namespace cli_test {
 namespace {
 
 namespace fs = std::filesystem;
 using quillon::CacheEntry;
+using quillon::InputStamp;
+using quillon::StoredRun;
 
 void WriteText(const std::string& path, const std::string& text) {
   std::ofstream(path, std::ios::binary) << text;
@@ -117,14 +125,25 @@ TEST(ParseCache, GivesTheOutputOfAColdRunOverRandomEdits) {
     for (const char* command : {"units", "order"}) {
       std::vector<std::string> args = project.Arguments(command);
       CliResult cold = RunQuillon(args);
-      ExpectSameRun(cold, RunCached(cache.path(), args), "round " + std::to_string(round) + " " + command);
+      std::string what = "round " + std::to_string(round) + " " + command;
+      ExpectSameRun(cold, RunCached(cache.path(), args), what);
+      // Nothing changed since: the stored run answers.
+      if (command == std::string("order"))
+        ExpectSameRun(cold, RunCached(cache.path(), args), what + " again");
     }
   }
   // Nothing changed since: every file comes from the cache, with the messages of its parse.
-  std::vector<std::string> args = project.Arguments("check");
+  std::vector<std::string> args = project.Arguments("tree");
   args.insert(args.begin(), "-v");
   CliResult cached = RunCached(cache.path(), args);
   EXPECT_NE(cached.err.find("files loaded, 0 parsed"), std::string::npos) << cached.err;
+}
+
+std::vector<std::string> StoredRuns(const std::string& cacheDir) {
+  std::vector<std::string> paths;
+  for (const auto& file : fs::directory_iterator(cacheDir))
+    if (file.path().filename().string().starts_with("run-")) paths.push_back(file.path().string());
+  return paths;
 }
 
 // The entry of a one-file project, and the cold run's answer.
@@ -141,7 +160,8 @@ struct OneFile {
     WriteText(source, VerilogSource(1, 2, 7));
     cold = RunQuillon(args);
     RunCached(cache.path(), args);
-    for (const auto& file : fs::directory_iterator(cache.path())) entryPath = file.path().string();
+    for (const auto& file : fs::directory_iterator(cache.path()))
+      if (file.path().extension() == ".qpc") entryPath = file.path().string();
     entry = ReadText(entryPath);
   }
 };
@@ -168,6 +188,8 @@ TEST(ParseCache, RefusesEveryDamagedEntryAndRewritesIt) {
   // Through the program: a cut entry is parsed around and replaced by a whole one.
   for (std::size_t length : {std::size_t{0}, std::size_t{11}, one.entry.size() / 2, one.entry.size() - 1}) {
     WriteText(one.entryPath, one.entry.substr(0, length));
+    // The stored run would answer without reading the parse cache.
+    for (const std::string& run : StoredRuns(one.cache.path())) fs::remove(run);
     ExpectSameRun(one.cold, RunCached(one.cache.path(), one.args), "cut at " + std::to_string(length));
     EXPECT_EQ(ReadText(one.entryPath), one.entry) << length;
   }
@@ -183,6 +205,79 @@ TEST(ParseCache, IsOffWithoutAProjectFileUnlessAskedAndNoCacheTurnsItOff) {
   EXPECT_FALSE(fs::exists(dir.Path(".quillon")));
   EXPECT_EQ(RunQuillon({"units", "-P", dir.Path("p.json")}).status, 0);
   EXPECT_FALSE(fs::is_empty(dir.Path(".quillon")));
+}
+
+// The stored run is what answers: an answer planted in it comes out, until a source, an argument
+// or the environment differs.
+TEST(ResultCache, AnswersFromTheStoredRunUntilAnInputDiffers) {
+  ScopedTempDir dir, cache;
+  std::string source = dir.Path("a.vhd");
+  WriteText(source, VhdlSource(1, 1, 1));
+  // Old enough that the run may store its answer.
+  std::this_thread::sleep_for(std::chrono::milliseconds(50));
+  std::vector<std::string> args{"order", source};
+  CliResult cold = RunCached(cache.path(), args);
+  std::vector<std::string> runs = StoredRuns(cache.path());
+  ASSERT_EQ(runs.size(), 1u);
+  StoredRun run;
+  ASSERT_TRUE(run.Decode(ReadText(runs[0])));
+  EXPECT_EQ(run.output.out, cold.out);
+  EXPECT_EQ(run.status, cold.status);
+  ASSERT_EQ(run.inputs.size(), 1u);
+
+  run.output.out = "planted\n";
+  run.output.err = "planted message\n";
+  run.status = 3;
+  WriteText(runs[0], run.Encode());
+  CliResult planted = RunCached(cache.path(), args);
+  EXPECT_EQ(planted.out, "planted\n");
+  EXPECT_EQ(planted.err, "planted message\n");
+  EXPECT_EQ(planted.status, 3);
+
+  EXPECT_EQ(RunCached(cache.path(), {"--absolute", "order", source}).out,
+            RunQuillon({"--absolute", "order", source}).out);
+  EXPECT_EQ(
+      RunQuillon(CliRun{{"--cache", cache.path(), "order", source}, {}, {{"QUILLON_TEST_VALUE", "1"}}}).out,
+      cold.out);
+  std::ofstream(source, std::ios::app) << "\n";
+  ExpectSameRun(RunQuillon(args), RunCached(cache.path(), args), "after an edit");
+}
+
+// A file modified close to the run may change again within one tick of the file system's clock
+// with every stat field as it was: its content is compared instead.
+TEST(ResultCache, DoesNotTrustTheStatOfARecentlyModifiedFile) {
+  ScopedTempDir dir;
+  std::string path = dir.Path("a.vhd");
+  WriteText(path, "entity a is end;\n");
+  struct stat before {};
+  ASSERT_EQ(::stat(path.c_str(), &before), 0);
+  std::int64_t modified = before.st_mtim.tv_sec * 1'000'000'000LL + before.st_mtim.tv_nsec;
+
+  std::optional<InputStamp> racy = InputStamp::Take(path, modified + InputStamp::kRacyNanoseconds / 2);
+  std::optional<InputStamp> settled = InputStamp::Take(path, modified + 2 * InputStamp::kRacyNanoseconds);
+  ASSERT_TRUE(racy && settled);
+  EXPECT_TRUE(racy->racy);
+  EXPECT_FALSE(settled->racy);
+  EXPECT_TRUE(racy->Holds(before));
+  EXPECT_TRUE(racy->Holds());
+
+  WriteText(path, "entity b is end;\n");
+  EXPECT_FALSE(racy->Holds(before)) << "same stat, other content";
+  EXPECT_TRUE(settled->Holds(before)) << "an old file's stat is trusted";
+  EXPECT_FALSE(settled->Holds()) << "the real stat moved";
+
+  // Modified since the run started: what the run read is not known, nothing is stamped.
+  EXPECT_FALSE(InputStamp::Take(path, modified));
+
+  // A directory's content is its names.
+  struct stat listed {};
+  ASSERT_EQ(::stat(dir.path().c_str(), &listed), 0);
+  std::int64_t changed = listed.st_ctim.tv_sec * 1'000'000'000LL + listed.st_ctim.tv_nsec;
+  std::optional<InputStamp> folder = InputStamp::Take(dir.path(), changed + InputStamp::kRacyNanoseconds / 2);
+  ASSERT_TRUE(folder && folder->directory && folder->racy);
+  EXPECT_TRUE(folder->Holds(listed));
+  WriteText(dir.Path("b.vhd"), "");
+  EXPECT_FALSE(folder->Holds(listed));
 }
 
 }  // namespace
