@@ -233,3 +233,130 @@ class PipelineTest : public testing::Test {
 };
 
 }  // namespace test_host
+
+// ---- Messages, shared by the elaboration, parser, order and ports tests.
+#include "Port/MsgCollector.h"
+#include "Port/MsgDispatcher.h"
+
+namespace test_host {
+
+// Gathers the messages issued while it lives, as a host's message manager in the state given.
+class MessageLog {
+ public:
+  explicit MessageLog(bool enabled = true) {
+    Port_MsgDispatcher::addMsgMan(&collector_);
+    enabled ? collector_.enable() : collector_.disable();
+  }
+  ~MessageLog() {
+    Port_MsgDispatcher::removeMsgMan(&collector_);
+    if (silenced_) Port_MsgDispatcher::addMsgMan(Port_MsgDispatcher::getDefaultMsgMan());
+  }
+  MessageLog(const MessageLog&) = delete;
+  MessageLog& operator=(const MessageLog&) = delete;
+
+  // Keeps the terminal's manager out until the log goes (parses re-register the managers they
+  // found, so it must stay out for the whole scope).
+  void SilenceTerminal() { silenced_ = Port_MsgDispatcher::removeMsgMan(Port_MsgDispatcher::getDefaultMsgMan()); }
+
+  const Port_MsgCollector& Collector() const { return collector_; }
+  const std::vector<Port_MsgRecord>& Records() const { return collector_.records(); }
+  void Clear() { collector_.clearRecords(); }
+
+  std::vector<std::string> Texts(Port_MsgMan::MsgType type) const {
+    std::vector<std::string> texts;
+    for (const Port_MsgRecord& record : Records())
+      if (record.type == type) texts.push_back(record.text);
+    return texts;
+  }
+
+  // "<type>: <text>" per message; with `category`, every message must be of it.
+  std::vector<std::string> Lines(const char* category = nullptr) const {
+    std::vector<std::string> lines;
+    for (const Port_MsgRecord& record : Records()) {
+      if (category) EXPECT_EQ(record.category, category) << record.text;
+      lines.push_back(std::string(Port_MsgMan::typeName(record.type)) + ": " + record.text);
+    }
+    return lines;
+  }
+
+ private:
+  Port_MsgCollector collector_;
+  bool silenced_ = false;
+};
+
+}  // namespace test_host
+
+// ---- A design unit of no module of ours: it answers no implementation identity.
+namespace test_host {
+
+class ForeignUnit final : public Vad::IHdlDesignUnit {
+ public:
+  CitI::IInterface* QueryInterface(const Port::XUID& id) override {
+    return id == Vad::IHdlDesignUnit::Iid() || id == CitI::IInterface::Iid() ? this : nullptr;
+  }
+  CitI::Result GetDesignUnit(CitI::IInterface*, Vad::IHdlDesignUnit** out) override {
+    if (out) *out = nullptr;
+    return CitI::kNotImpl;
+  }
+  CitI::Result GetUnitFlag(std::int32_t, bool*) override { return CitI::kNotImpl; }
+  CitI::Result GetDesignUnitTypeId(Port::XUID*) override { return CitI::kNotImpl; }
+};
+
+}  // namespace test_host
+
+// ---- The unit of a set whose design-unit key is `key` ("Architecture|mid|rtl").
+namespace test_host {
+
+inline Prjrep::AutoPtr<Vad::IHdlDesignUnit> UnitWithKey(Vad::IHdlDesignUnitSet* set, std::string_view key) {
+  Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> unit;
+  if (set && set->CreateIterator(unit.Out()) == CitI::kOk) {
+    for (; !unit->IsDone(); unit->Next()) {
+      Port::StringBase unitKey;
+      if (auto* object = Prjrep::ImplementationCast<Vad::DbObject>(unit->Current())) object->GetDesignUnitKey(unitKey);
+      if (unitKey.view() == key) return Prjrep::AutoPtr<Vad::IHdlDesignUnit>(unit->Current());
+    }
+  }
+  ADD_FAILURE() << "no design unit " << key;
+  return {};
+}
+
+}  // namespace test_host
+
+// ---- Sources written to a temporary directory and parsed as files of a project, shared by the
+// parser tests.
+#include "ScopedTempDir.h"
+
+namespace test_host {
+
+class ParseTest : public PipelineTest {
+ protected:
+  void SetUp() override { project_ = NewProject(); }
+
+  // A file of the test's directory holding exactly `bytes`; its full path.
+  std::string Write(std::string_view name, std::string_view bytes) const { return WriteBytes(dir_.Path(name), bytes); }
+
+  // Adds the file to the project and parses it, as a host does; the units of the parse.
+  Vad::IHdlDesignUnitSet* ParseAs(const std::string& path, std::string_view plugin) {
+    file_ = AddNewFile(project_.Get(), path, plugin);
+    HolderOf(file_.Get())->Parse(nullptr);
+    return FileObject(file_.Get())->GetUnitSet();
+  }
+
+  // Adds the file to the project and runs a parser of type P alone on its holder.
+  template <class P>
+  Vad::CParserConfigHolder* RunParser(const std::string& path, std::string_view plugin) {
+    file_ = AddNewFile(project_.Get(), path, plugin);
+    Vad::CParserConfigHolder* holder = HolderOf(file_.Get());
+    holder->BeginParse(nullptr);
+    P parser;
+    parser.Parse(*holder);
+    holder->EndParse();
+    return holder;
+  }
+
+  ScopedTempDir dir_;
+  Prjrep::AutoPtr<Vad::IHdlProject> project_;
+  Prjrep::AutoPtr<Vad::IHdlFile> file_;
+};
+
+}  // namespace test_host

@@ -1,141 +1,99 @@
-// Shared set-up of the elaboration tests: host components and module factories in the registry,
-// projects and files made the way a host makes them, design-unit records made by hand, and a
-// text rendering of hierarchy trees.
+// Shared set-up of the elaboration tests: files in libraries, design-unit records made by hand,
+// and a text rendering of hierarchy trees.
 #pragma once
 
-#include <gtest/gtest.h>
-
 #include <cstdlib>
+#include <set>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "CElaborator.h"
-#include "CHdlElement.h"
-#include "CHdlFile.h"
 #include "CHdlProject.h"
 #include "CNetListNode.h"
-#include "HdlSets.h"
-#include "Host/FileType.h"
-#include "Host/HostComponents.h"
-#include "Host/SourceLibrary.h"
-#include "ICompAdmin.h"
+#include "CVhdlDU.h"
+#include "CompInst.h"
 #include "IHdlElaborationData.h"
-#include "IHdlFile.h"
 #include "IHdlNetListNode.h"
-#include "IHdlProject.h"
-#include "ISourceLibraryMember.h"
 #include "ITclCollectable.h"
-#include "Identifiers.h"
-#include "Port/MsgCollector.h"
-#include "Port/MsgDispatcher.h"
-#include "Prjrep/AutoPtr.h"
-#include "Prjrep/Casts.h"
 #include "Prjrep/TListIter.h"
-
-extern "C" void InstFactoryEntry();
+#include "TestHost.h"
+#include "Use.h"
 
 namespace elab_test {
+
+using test_host::MessageLog;
 
 inline std::string DataPath(std::string_view relative) {
   return std::string(QUILLON_TEST_DATA_DIR) + "/elab/" + std::string(relative);
 }
 
-// Gathers the messages issued while it lives.
-class MessageLog {
- public:
-  MessageLog() { Port_MsgDispatcher::addMsgMan(&collector_); }
-  ~MessageLog() { Port_MsgDispatcher::removeMsgMan(&collector_); }
-  MessageLog(const MessageLog&) = delete;
-  MessageLog& operator=(const MessageLog&) = delete;
-
-  const std::vector<Port_MsgRecord>& Records() const { return collector_.records(); }
-  std::vector<std::string> Texts(Port_MsgMan::MsgType type) const {
-    std::vector<std::string> texts;
-    for (const Port_MsgRecord& record : Records()) {
-      if (record.type == type) texts.push_back(record.text);
-    }
-    return texts;
-  }
-
- private:
-  Port_MsgCollector collector_;
-};
-
-class ElabTest : public testing::Test {
+class ElabTest : public test_host::PipelineTest {
  protected:
   static void SetUpTestSuite() {
-    ASSERT_TRUE(Host::RegisterHostComponents());
-    InstFactoryEntry();
+    PipelineTest::SetUpTestSuite();
     // The cell libraries of the repository's data folder stand in for an installation.
     setenv("CORVANE", (std::string(QUILLON_TEST_DATA_DIR) + "/../../data").c_str(), 0);
   }
+  void SetUp() override { project_ = NewProject(); }
 
-  static Prjrep::AutoPtr<Vad::IHdlProject> NewProject() {
-    auto project = Prjrep::CreateInstanceAs<Vad::IHdlProject>(Vad::ClassIds::CHdlProject());
-    EXPECT_TRUE(project);
-    return project;
-  }
-
-  // A file as a host makes one, in `library`, added to the project.
-  static Prjrep::AutoPtr<Vad::IHdlFile> AddFile(Vad::IHdlProject* project, std::string_view path,
-                                                std::string_view library = "work",
-                                                std::string_view plugin = "PLUGIN_Vhdl",
-                                                std::uint64_t orderKey = 0) {
-    Prjrep::AutoPtr<Vad::IHdlFile> file = NewFile(project, path, library, plugin, orderKey);
-    EXPECT_EQ(Prjrep::QueryAs<Vad::IHdlFileSet>(project)->Add(file.Get()), CitI::kOk);
-    return file;
-  }
-
-  static Prjrep::AutoPtr<Vad::IHdlFile> NewFile(Vad::IHdlProject* project, std::string_view path,
-                                                std::string_view library = "work",
-                                                std::string_view plugin = "PLUGIN_Vhdl",
-                                                std::uint64_t orderKey = 0) {
-    Prjrep::AutoPtr<Vad::IHdlFile> file;
-    EXPECT_EQ(project->createNewFile(file.Out()), CitI::kOk);
-    auto fileType = Host::FileType::Create("HDL", {"vhd", "v"});
-    EXPECT_EQ(Prjrep::QueryAs<Vad::ICompAdmin>(file.Get())->InitializeAfterCreate(nullptr, fileType.Get()),
-              CitI::kOk);
-    EXPECT_EQ(file->setFilePath(Port::StringBase(path), Port::StringBase()), CitI::kOk);
-    file->setPluginName(Port::StringBase(plugin));
+  // A file of the project in `library`, as a host makes one; AddFile adds it to the project.
+  Prjrep::AutoPtr<Vad::IHdlFile> MakeFile(std::string_view path, std::string_view library = "work",
+                                          std::string_view plugin = "PLUGIN_Vhdl", std::uint64_t orderKey = 0) {
+    auto file = NewFile(project_.Get(), path, plugin);
     file->setOrderKey(orderKey);
-    auto* member = Prjrep::QueryAs<Vad::ISourceLibraryMember>(file.Get());
-    EXPECT_EQ(member->setSourceLibrary(Host::SourceLibrary::Create(library).Get()), CitI::kOk);
+    SetLibrary(file.Get(), library);
+    return file;
+  }
+  Prjrep::AutoPtr<Vad::IHdlFile> AddFile(std::string_view path, std::string_view library = "work",
+                                         std::string_view plugin = "PLUGIN_Vhdl", std::uint64_t orderKey = 0) {
+    auto file = MakeFile(path, library, plugin, orderKey);
+    EXPECT_EQ(FileSetOf(project_.Get())->Add(file.Get()), CitI::kOk);
     return file;
   }
 
-  static Prjrep::AutoPtr<Vad::IHdlNetListNode> HierarchyRoot(Vad::IHdlProject* project,
-                                                             CitI::Result expected = CitI::kOk) {
+  Prjrep::AutoPtr<Vad::IHdlNetListNode> HierarchyRoot() {
     Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
-    auto* data = Prjrep::QueryAs<Vad::IHdlElaborationData>(project);
-    EXPECT_EQ(data->getHierarchyRoot(root.Out()), expected);
+    EXPECT_EQ(Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get())->getHierarchyRoot(root.Out()), CitI::kOk);
     return root;
   }
+  Vad::CHdlProject* ProjectObject() const { return Prjrep::ObjectCast<Vad::CHdlProject>(project_.Get()); }
+  Vad::CLibRefs* References() const { return ProjectObject()->getLibraryReferences(); }
 
-  static Vad::CHdlProject* ProjectObject(Vad::IHdlProject* project) {
-    return Prjrep::ObjectCast<Vad::CHdlProject>(project);
-  }
-
-  // A record made by hand, linked to `file` (for its library), with the creation reference
-  // owned by the returned pointer.
+  // A record made by hand in `file` (for its library), kept by the test.
   template <class Record, class... Args>
-  static Prjrep::AutoRelease<CitI::IInterface> MakeUnit(Vad::IHdlFile* file, Args&&... args) {
+  CitI::IInterface* Unit(Vad::IHdlFile* file, Args&&... args) {
     auto* record = new Record(std::forward<Args>(args)...);
     record->SetFile(file);
-    return Prjrep::AutoRelease<CitI::IInterface>(record);
+    units_.emplace_back(record);
+    return units_.back().Get();
+  }
+  // An instance under `parent`, which keeps it.
+  static Vad::CompInst* Component(CitI::IInterface* parent, std::string_view label, std::string_view component) {
+    Prjrep::AutoRelease<CitI::IInterface> made(new Vad::CompInst(label, component, RecordOf<Vad::DbObject>(parent)));
+    return RecordOf<Vad::CompInst>(made.Get());
+  }
+  // A use clause in effect for the VHDL unit, in the unit's file.
+  void Uses(CitI::IInterface* unit, std::string_view selectedName) {
+    Prjrep::AutoRelease<Vad::IHdlFile> file;
+    ElementOf(unit)->GetFile(file.Out());
+    CitI::IInterface* use = Unit<Vad::Use>(file.Get(), selectedName, nullptr);
+    auto* vhdlUnit = RecordOf<Vad::CVhdlDU>(unit);
+    std::vector<Vad::DbObject*> uses;
+    vhdlUnit->GetUses(uses);
+    uses.push_back(RecordOf<Vad::DbObject>(use));
+    vhdlUnit->SetUses(uses);
   }
 
-  static Vad::IHdlElement* ElementOf(CitI::IInterface* unit) {
-    return Prjrep::QueryAs<Vad::IHdlElement>(unit);
-  }
+  static Vad::IHdlElement* ElementOf(CitI::IInterface* unit) { return Prjrep::QueryAs<Vad::IHdlElement>(unit); }
   template <class Record>
   static Record* RecordOf(CitI::IInterface* unit) {
     return dynamic_cast<Record*>(Prjrep::ImplementationCast<Vad::DbObject>(unit));
   }
 
   // An iterator over units, as the project hands them to the elaborator.
-  static Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> IterateUnits(
-      const std::vector<CitI::IInterface*>& units) {
+  static Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> IterateUnits(const std::vector<CitI::IInterface*>& units) {
     std::vector<Vad::IHdlDesignUnit*> designUnits;
     for (CitI::IInterface* unit : units) designUnits.push_back(Prjrep::QueryAs<Vad::IHdlDesignUnit>(unit));
     return Prjrep::TInterfaceListIter<Vad::IHdlDesignUnitIterator>::New(designUnits);
@@ -154,42 +112,51 @@ class ElabTest : public testing::Test {
     Prjrep::QueryAs<Vad::IHdlNetListNodeInternal>(node)->GetName(&name);
     return name.str();
   }
+  static std::string PathOf(Vad::IHdlNetListNode* node) {
+    Port::StringBase path;
+    Prjrep::QueryAs<UtilI::ITclCollectable>(node)->GetName(&path);
+    return path.str();
+  }
 
-  // The file name of the node's element, or empty.
+  // One line per node from `top` down in pre-order (without `top` when `withTop` is false),
+  // indented two blanks per level: name [label] {Tcl path} Tcl type, then "@file" for a node with
+  // element, "missing" for one without, and "cell" for a library cell. `distinct` gets every node.
+  static std::string Render(Vad::IHdlNetListNode* top, bool withTop = true,
+                            std::set<Vad::IHdlNetListNode*>* distinct = nullptr) {
+    std::string text;
+    std::vector<std::pair<Vad::IHdlNetListNode*, int>> pending{{top, withTop ? 0 : -1}};
+    while (!pending.empty()) {
+      auto [node, depth] = pending.back();
+      pending.pop_back();
+      if (distinct) distinct->insert(node);
+      if (depth >= 0) text += std::string(static_cast<std::size_t>(2 * depth), ' ') + Line(node) + "\n";
+      std::vector<Vad::IHdlNetListNode*> children = ChildrenOf(node);
+      for (auto child = children.rbegin(); child != children.rend(); ++child) pending.emplace_back(*child, depth + 1);
+    }
+    return text;
+  }
+  static std::string RenderTree(Vad::IHdlNetListNode* root) { return Render(root, false); }
+
+  Prjrep::AutoPtr<Vad::IHdlProject> project_;
+  std::vector<Prjrep::AutoRelease<CitI::IInterface>> units_;
+
+ private:
+  static std::string Line(Vad::IHdlNetListNode* node) {
+    Port::StringBase label;
+    Port::StringBase type;
+    node->GetInstanceName(&label);
+    Prjrep::QueryAs<UtilI::ITclCollectable>(node)->GetType(&type);
+    std::string line = NameOf(node) + " [" + label.str() + "] {" + PathOf(node) + "} " + type.str();
+    line += node->GetElement() ? " @" + FileNameOf(node) : std::string(" missing");
+    return line + (node->IsLibraryCell() ? " cell" : "");
+  }
   static std::string FileNameOf(Vad::IHdlNetListNode* node) {
     Prjrep::AutoRelease<Vad::IHdlFile> file;
-    if (!node->GetElement() || node->GetElement()->GetFile(file.Out()) != CitI::kOk || !file) return {};
+    if (node->GetElement()->GetFile(file.Out()) != CitI::kOk || !file) return {};
     Port::StringBase directory;
     Port::StringBase fileName;
     file->getFileName(&directory, &fileName);
     return fileName.str();
-  }
-
-  // One line per node, indented two blanks per level:
-  //   name [label] {Tcl path} Tcl type, then "@file" for a node with element, "missing" for one
-  //   without, and "cell" for a library cell.
-  static std::string Render(Vad::IHdlNetListNode* node, int depth = 0) {
-    Port::StringBase label;
-    Port::StringBase path;
-    Port::StringBase type;
-    node->GetInstanceName(&label);
-    auto* tcl = Prjrep::QueryAs<UtilI::ITclCollectable>(node);
-    tcl->GetName(&path);
-    tcl->GetType(&type);
-    std::string line(static_cast<std::size_t>(2 * depth), ' ');
-    line += NameOf(node) + " [" + label.str() + "] {" + path.str() + "} " + type.str();
-    line += node->GetElement() ? " @" + FileNameOf(node) : std::string(" missing");
-    if (node->IsLibraryCell()) line += " cell";
-    line += "\n";
-    for (Vad::IHdlNetListNode* child : ChildrenOf(node)) line += Render(child, depth + 1);
-    return line;
-  }
-
-  // The children of the root, rendered.
-  static std::string RenderTree(Vad::IHdlNetListNode* root) {
-    std::string text;
-    for (Vad::IHdlNetListNode* child : ChildrenOf(root)) text += Render(child);
-    return text;
   }
 };
 

@@ -2,8 +2,6 @@
 // instances and primary units, and the table dump.
 #include <gtest/gtest.h>
 
-#include <cstdio>
-
 #include "Arch.h"
 #include "CompInst.h"
 #include "ElabFixtures.h"
@@ -26,53 +24,29 @@ namespace {
 class Elaborator : public ElabTest {
  protected:
   void SetUp() override {
-    project_ = NewProject();
-    work_ = NewFile(project_.Get(), "/src/work.vhd", "work");
-    other_ = NewFile(project_.Get(), "/src/other.vhd", "lib2");
+    ElabTest::SetUp();
+    work_ = MakeFile("/src/work.vhd");
+    other_ = MakeFile("/src/other.vhd", "lib2");
   }
 
-  CitI::IInterface* Keep(Prjrep::AutoRelease<CitI::IInterface> unit) {
-    units_.push_back(unit);
-    return unit.Get();
-  }
   CitI::IInterface* Entity(std::string_view name, Vad::IHdlFile* file = nullptr) {
-    return Keep(MakeUnit<Vad::EntityDecl>(file ? file : work_.Get(), name, nullptr));
+    return Unit<Vad::EntityDecl>(file ? file : work_.Get(), name, nullptr);
   }
-  CitI::IInterface* Architecture(std::string_view entity, std::string_view name,
-                                 Vad::IHdlFile* file = nullptr) {
-    return Keep(MakeUnit<Vad::Arch>(file ? file : work_.Get(), entity, name, nullptr));
+  CitI::IInterface* Architecture(std::string_view entity, std::string_view name, Vad::IHdlFile* file = nullptr) {
+    return Unit<Vad::Arch>(file ? file : work_.Get(), entity, name, nullptr);
   }
   CitI::IInterface* Package(std::string_view name, Vad::IHdlFile* file = nullptr) {
-    return Keep(MakeUnit<Vad::PackageDecl>(file ? file : work_.Get(), name, nullptr));
+    return Unit<Vad::PackageDecl>(file ? file : work_.Get(), name, nullptr);
   }
-  CitI::IInterface* Module(std::string_view name) {
-    return Keep(MakeUnit<Vad::module>(work_.Get(), name, nullptr));
-  }
+  CitI::IInterface* Module(std::string_view name) { return Unit<Vad::module>(work_.Get(), name, nullptr); }
 
-  // An instance under `parent`, which keeps it.
-  static Vad::CompInst* Component(CitI::IInterface* parent, std::string_view label,
-                                  std::string_view component) {
-    Prjrep::AutoRelease<CitI::IInterface> made(
-        new Vad::CompInst(label, component, RecordOf<Vad::DbObject>(parent)));
-    return RecordOf<Vad::CompInst>(made.Get());
-  }
-  static Vad::EntityInst* EntityInstance(CitI::IInterface* parent, std::string_view label,
-                                         std::string_view entity, std::string_view architecture) {
+  static void EntityInstance(CitI::IInterface* parent, std::string_view label, std::string_view entity,
+                             std::string_view architecture) {
     Prjrep::AutoRelease<CitI::IInterface> made(new Vad::EntityInst(label, RecordOf<Vad::DbObject>(parent)));
     auto* record = RecordOf<Vad::EntityInst>(made.Get());
     record->SetLabel(label);
     record->SetEntityName(entity);
     record->SetArchitectureName(architecture);
-    return record;
-  }
-  // A use clause in effect for `unit`, kept by the test.
-  void Uses(CitI::IInterface* unit, std::string_view selectedName) {
-    auto use = Keep(MakeUnit<Vad::Use>(work_.Get(), selectedName, nullptr));
-    auto* vhdlUnit = RecordOf<Vad::CVhdlDU>(unit);
-    std::vector<Vad::DbObject*> uses;
-    vhdlUnit->GetUses(uses);
-    uses.push_back(RecordOf<Vad::DbObject>(use));
-    vhdlUnit->SetUses(uses);
   }
 
   // Registration and processing of `units`, as Elaborate runs them.
@@ -109,10 +83,8 @@ class Elaborator : public ElabTest {
     return found == tables_.m_ElementNameDependencyCountMap.end() ? -1 : static_cast<long>(found->second);
   }
 
-  Prjrep::AutoPtr<Vad::IHdlProject> project_;
   Prjrep::AutoPtr<Vad::IHdlFile> work_;
   Prjrep::AutoPtr<Vad::IHdlFile> other_;
-  std::vector<Prjrep::AutoPtr<CitI::IInterface>> units_;
   Prjrep::AutoRelease<Vad::CElaborator> elaboratorObject_{new Vad::CElaborator()};
   Vad::CElaborator& elaborator_ = *elaboratorObject_.Get();
   CElabTables tables_;
@@ -163,15 +135,9 @@ TEST_F(Elaborator, VhdlNamesResolveWithoutCaseExceptExtendedIdentifiers) {
   EXPECT_EQ(Count("work:PackageDecl|\\Tab\\"), 1);
 }
 
-TEST_F(Elaborator, GenericsAreNotRegistered) {
-  CitI::IInterface* width = Keep(MakeUnit<Vad::generic>(work_.Get(), "WIDTH", nullptr));
-  ASSERT_EQ(Resolve({width, Entity("e")}), CitI::kOk);
-  EXPECT_EQ(RegisteredNames(), std::vector<std::string>{"Entity|e"});
-}
-
 TEST_F(Elaborator, EveryArchitectureIsRegisteredWithTheOneAnalysedLastFirst) {
   // A file given earlier has the larger order key (work.vhd has 0), so it is analysed first.
-  Prjrep::AutoPtr<Vad::IHdlFile> early = NewFile(project_.Get(), "/src/early.vhd", "work", "PLUGIN_Vhdl", 5);
+  auto early = MakeFile("/src/early.vhd", "work", "PLUGIN_Vhdl", 5);
   CitI::IInterface* two = Architecture("SUB", "two", early.Get());
   CitI::IInterface* one = Architecture("sub", "one");
   CitI::IInterface* top = Architecture("top", "rtl");
@@ -255,8 +221,8 @@ TEST_F(Elaborator, ModuleInstancesOfTheVerilogParserResolveToModules) {
 }
 
 TEST_F(Elaborator, PrimaryUnitsAreReferencedByArchitecturesAndBodies) {
-  CitI::IInterface* body = Keep(MakeUnit<Vad::PackageBody>(work_.Get(), "pkg", nullptr));
-  CitI::IInterface* orphan = Keep(MakeUnit<Vad::PackageBody>(work_.Get(), "lonely", nullptr));
+  CitI::IInterface* body = Unit<Vad::PackageBody>(work_.Get(), "pkg", nullptr);
+  CitI::IInterface* orphan = Unit<Vad::PackageBody>(work_.Get(), "lonely", nullptr);
   ASSERT_EQ(Resolve({Package("pkg"), body, orphan, Entity("e"), Architecture("e", "rtl")}), CitI::kOk);
   EXPECT_EQ(Depends("work:PackageBody|pkg"), std::vector<std::string>{"work:PackageDecl|pkg"});
   EXPECT_EQ(Depends("work:PackageBody|lonely"), std::vector<std::string>{"work:PackageDecl|lonely"});
@@ -265,11 +231,13 @@ TEST_F(Elaborator, PrimaryUnitsAreReferencedByArchitecturesAndBodies) {
   EXPECT_EQ(Count("work:Architecture|e|rtl"), 0);
 }
 
-TEST_F(Elaborator, UnitOfAnUnknownKindGetsTheUnknownLabel) {
-  CitI::IInterface* library = Keep(MakeUnit<Vad::Library>(work_.Get(), "ieee", nullptr));
-  ASSERT_EQ(Resolve({library}), CitI::kOk);
+TEST_F(Elaborator, GenericsAreNotRegisteredAndUnitsOfAnUnknownKindGetTheUnknownLabel) {
+  CitI::IInterface* width = Unit<Vad::generic>(work_.Get(), "WIDTH", nullptr);
+  CitI::IInterface* library = Unit<Vad::Library>(work_.Get(), "ieee", nullptr);
+  ASSERT_EQ(Resolve({width, library, Entity("e")}), CitI::kOk);
+  EXPECT_EQ(RegisteredNames(), (std::vector<std::string>{"Entity|e", "Library"}));
   EXPECT_EQ(Labels("work:Library"), std::vector<std::string>{Vad::ElabText::kUnknownType});
-  EXPECT_TRUE(tables_.m_sArchitectureMultiMapList.empty());
+  EXPECT_EQ(tables_.m_sArchitectureMultiMapList.size(), 1u);
 }
 
 TEST_F(Elaborator, ExistingCountNameKeepsItsCountAndTellsTheDeveloper) {
@@ -336,53 +304,23 @@ TEST_F(Elaborator, SplitsQualifiedAndDottedNamesAtTheirLastSeparator) {
   EXPECT_EQ(Vad::CElaborator::Qualify("lib", "Entity|e"), "lib:Entity|e");
 }
 
-TEST_F(Elaborator, DumpsTheSixTablesInTheirOrder) {
-  CitI::IInterface* entity = Entity("e");
+TEST_F(Elaborator, DumpShowsTheTablesEntries) {
   CitI::IInterface* arch = Architecture("e", "rtl");
-  Vad::CompInst* instance = Component(arch, "u1", "sub");
-  instance->SetProperty("PARTITION", "P1");
-  ASSERT_EQ(Resolve({entity, arch}), CitI::kOk);
-
+  Component(arch, "u1", "sub")->SetProperty("PARTITION", "P1");
+  ASSERT_EQ(Resolve({Entity("e"), arch}), CitI::kOk);
   testing::internal::CaptureStdout();
   elaborator_.DumpTables(tables_);
   std::string dump = testing::internal::GetCapturedStdout();
-
-  char pointers[512];
-  std::snprintf(pointers, sizeof pointers, "%p|%p|%p", static_cast<void*>(ElementOf(instance)),
-                static_cast<void*>(ElementOf(arch)), static_cast<void*>(ElementOf(entity)));
-  std::vector<StringBase> ptr;
-  StringBase(pointers).Split(ptr, "|");
-  ASSERT_EQ(ptr.size(), 3u);
-  EXPECT_EQ(dump,
-            "\n\n>>> m_sArchitectureMultiMapList <<<\n"
-            "  Architecture|e -- work\n"
-            "   work:Architecture|e|rtl\n"
-            "  Entity|e -- work\n"
-            "   work:Entity|e\n"
-            "\n\n>>> m_sElementNameInstanceList <<<\n"
-            "  work:Architecture|e|rtl\n"
-            "   u1\n"
-            "  work:Entity|e\n"
-            "   \n"
-            "\n\n>>> m_IHdlElementInstanceNameMap <<<\n"
-            "  work:Architecture|e|rtl|work:Architecture|sub|u1, Prop: P1, Ptr: " +
-                ptr[0].str() +
-                "\n"
-                "\n\n>>> m_ElementNameDependencyCountMap <<<\n"
-                "  work:Architecture|e|rtl -- 0\n"
-                "  work:Entity|e -- 1\n"
-                "\n\n>>> m_DependsTable <<<\n"
-                "  work:Architecture|e|rtl\n"
-                "    work:Architecture|sub\n"
-                "    work:Entity|e\n"
-                "\n\n>>> m_piHdlElementMultiMapNames <<<\n"
-                "  work - Architecture|e|rtl Ptr: " +
-                ptr[1].str() + "\n  work - Entity|e Ptr: " + ptr[2].str() + "\n");
+  for (const char* entry : {"  Entity|e -- work\n   work:Entity|e\n", "  work:Entity|e\n   \n",
+                            "work:Architecture|e|rtl|work:Architecture|sub|u1, Prop: P1, Ptr: ",
+                            "  work:Entity|e -- 1\n", "    work:Architecture|sub\n    work:Entity|e\n",
+                            "  work - Entity|e Ptr: "})
+    EXPECT_NE(dump.find(entry), std::string::npos) << entry;
 }
 
 TEST_F(Elaborator, ElaborateNeedsItsArgumentsAndLibraryReferences) {
   auto none = IterateUnits({});
-  Vad::CLibRefs* references = ProjectObject(project_.Get())->getLibraryReferences();
+  Vad::CLibRefs* references = References();
   Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
   EXPECT_EQ(elaborator_.Elaborate(nullptr, none.Get(), root.Out()), CitI::kInvalidArg);
   EXPECT_EQ(elaborator_.Elaborate(references, nullptr, root.Out()), CitI::kInvalidArg);
@@ -393,14 +331,6 @@ TEST_F(Elaborator, ElaborateNeedsItsArgumentsAndLibraryReferences) {
   ASSERT_TRUE(root);
   EXPECT_TRUE(ChildrenOf(root.Get()).empty());
   EXPECT_EQ(Prjrep::RefCountOf(root.Get()), 1u);
-}
-
-TEST_F(Elaborator, AnswersOnlyItsCounterAndItself) {
-  EXPECT_NE(elaborator_.QueryInterface(Prjrep::IRefCount::Iid()), nullptr);
-  EXPECT_EQ(elaborator_.QueryInterface(CitI::IInterface::Iid()), &elaborator_);
-  EXPECT_EQ(elaborator_.QueryInterface(Vad::InterfaceIds::ImplementationIdentity()), nullptr);
-  auto made = Prjrep::CreateInstanceAs<CitI::IInterface>(Vad::ClassIds::CElaborator());
-  EXPECT_NE(Prjrep::ObjectCast<Vad::CElaborator>(made.Get()), nullptr);
 }
 
 }  // namespace

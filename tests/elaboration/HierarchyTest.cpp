@@ -11,38 +11,15 @@ using namespace elab_test;
 
 namespace {
 
-class Hierarchy : public ElabTest {
- protected:
-  void SetUp() override { project_ = NewProject(); }
-
-  void AddThreeLevelProject() {
-    AddFile(project_.Get(), DataPath("three_level/util_pkg.vhd"), "util");
-    AddFile(project_.Get(), DataPath("three_level/types_pkg.vhd"));
-    AddFile(project_.Get(), DataPath("three_level/leaf.vhd"));
-    AddFile(project_.Get(), DataPath("three_level/mid.vhd"));
-    AddFile(project_.Get(), DataPath("three_level/top.vhd"));
-    AddFile(project_.Get(), DataPath("three_level/empty.vhd"), "work", "PLUGIN_Vhdl", 7);
-    AddFile(project_.Get(), DataPath("three_level/context_only.vhd"), "work", "PLUGIN_Vhdl", 3);
-  }
-
-  // The node reached from the root by following child positions.
-  Vad::IHdlNetListNode* NodeAt(Vad::IHdlNetListNode* root, std::initializer_list<std::size_t> positions) {
-    Vad::IHdlNetListNode* node = root;
-    for (std::size_t position : positions) {
-      auto children = ChildrenOf(node);
-      if (position >= children.size()) return nullptr;
-      node = children[position];
-    }
-    return node;
-  }
-
-  Prjrep::AutoPtr<Vad::IHdlProject> project_;
-};
+class Hierarchy : public ElabTest {};
 
 TEST_F(Hierarchy, ThreeLevelProjectWithPackagesInTwoLibraries) {
-  AddThreeLevelProject();
+  AddFile(DataPath("three_level/util_pkg.vhd"), "util");
+  for (const char* name : {"types_pkg.vhd", "leaf.vhd", "mid.vhd", "top.vhd"}) AddFile(DataPath("three_level/") + name);
+  AddFile(DataPath("three_level/empty.vhd"), "work", "PLUGIN_Vhdl", 7);
+  AddFile(DataPath("three_level/context_only.vhd"), "work", "PLUGIN_Vhdl", 3);
   MessageLog messages;
-  auto root = HierarchyRoot(project_.Get());
+  auto root = HierarchyRoot();
   ASSERT_TRUE(root);
 
   // The cell instance is no missing unit: either the parse already knew it as a library cell or
@@ -72,10 +49,10 @@ TEST_F(Hierarchy, ThreeLevelProjectWithPackagesInTwoLibraries) {
 }
 
 TEST_F(Hierarchy, DuplicateEntityIsATopNodeUnderItsPlainName) {
-  AddFile(project_.Get(), DataPath("duplicate/dup_a.vhd"));
-  AddFile(project_.Get(), DataPath("duplicate/dup_b.vhd"));
+  AddFile(DataPath("duplicate/dup_a.vhd"));
+  AddFile(DataPath("duplicate/dup_b.vhd"));
   MessageLog messages;
-  auto root = HierarchyRoot(project_.Get());
+  auto root = HierarchyRoot();
   ASSERT_TRUE(root);
   // Both architectures refer to the entity registered first; the second entity is referred to by
   // nothing and keeps only its own name once the suffix is gone.
@@ -92,10 +69,10 @@ TEST_F(Hierarchy, DuplicateEntityIsATopNodeUnderItsPlainName) {
 }
 
 TEST_F(Hierarchy, UnitsThatInstantiateEachOtherAreCutWithAWarning) {
-  AddFile(project_.Get(), DataPath("cycle/ping.vhd"));
-  AddFile(project_.Get(), DataPath("cycle/pong.vhd"));
+  AddFile(DataPath("cycle/ping.vhd"));
+  AddFile(DataPath("cycle/pong.vhd"));
   MessageLog messages;
-  auto root = HierarchyRoot(project_.Get());
+  auto root = HierarchyRoot();
   ASSERT_TRUE(root);
   // Every unit is referred to once; the first name in byte order becomes the top node.
   EXPECT_EQ(RenderTree(root.Get()),
@@ -113,7 +90,7 @@ TEST_F(Hierarchy, UnitsThatInstantiateEachOtherAreCutWithAWarning) {
 }
 
 TEST_F(Hierarchy, ProjectWithoutFilesHasAnEmptyRoot) {
-  auto root = HierarchyRoot(project_.Get());
+  auto root = HierarchyRoot();
   ASSERT_TRUE(root);
   EXPECT_TRUE(ChildrenOf(root.Get()).empty());
   EXPECT_EQ(root->GetElement(), nullptr);
@@ -121,22 +98,22 @@ TEST_F(Hierarchy, ProjectWithoutFilesHasAnEmptyRoot) {
 }
 
 TEST_F(Hierarchy, CachedTreeIsKeptUntilTheFilesChange) {
-  auto file = AddFile(project_.Get(), DataPath("duplicate/dup_a.vhd"));
-  auto first = HierarchyRoot(project_.Get());
-  auto second = HierarchyRoot(project_.Get());
+  AddFile(DataPath("duplicate/dup_a.vhd"));
+  auto first = HierarchyRoot();
+  auto second = HierarchyRoot();
   EXPECT_EQ(first.Get(), second.Get());
 
   // Clearing the file set alone keeps the tree.
   ASSERT_EQ(Prjrep::QueryAs<Vad::IHdlFileSet>(project_.Get())->Clear(), CitI::kOk);
-  EXPECT_EQ(HierarchyRoot(project_.Get()).Get(), first.Get());
+  EXPECT_EQ(HierarchyRoot().Get(), first.Get());
 
-  AddFile(project_.Get(), DataPath("duplicate/dup_b.vhd"));
-  auto rebuilt = HierarchyRoot(project_.Get());
+  AddFile(DataPath("duplicate/dup_b.vhd"));
+  auto rebuilt = HierarchyRoot();
   EXPECT_NE(rebuilt.Get(), first.Get());
   EXPECT_EQ(ChildrenOf(rebuilt.Get()).size(), 1u);
 
   // A file that needs a parse again makes the tree out of date.
-  auto again = HierarchyRoot(project_.Get());
+  auto again = HierarchyRoot();
   EXPECT_EQ(again.Get(), rebuilt.Get());
   auto units = ChildrenOf(again.Get());
   ASSERT_FALSE(units.empty());
@@ -144,7 +121,7 @@ TEST_F(Hierarchy, CachedTreeIsKeptUntilTheFilesChange) {
   units[0]->GetElement()->GetFile(unitFile.Out());
   ASSERT_TRUE(unitFile);
   unitFile->setNeedsParse(true);
-  EXPECT_NE(HierarchyRoot(project_.Get()).Get(), again.Get());
+  EXPECT_NE(HierarchyRoot().Get(), again.Get());
 }
 
 // Asks the project for its hierarchy from inside the message system, that is from inside a
@@ -167,13 +144,13 @@ class NestedRequest : public Port_MsgCollector {
 };
 
 TEST_F(Hierarchy, RequestDuringARebuildGetsThePreviousTreeWithoutRebuilding) {
-  auto ping = AddFile(project_.Get(), DataPath("cycle/ping.vhd"));
-  AddFile(project_.Get(), DataPath("cycle/pong.vhd"));
+  auto ping = AddFile(DataPath("cycle/ping.vhd"));
+  AddFile(DataPath("cycle/pong.vhd"));
   NestedRequest nested(project_.Get());
   ASSERT_TRUE(Port_MsgDispatcher::addMsgMan(&nested));
 
   // First build: there is no previous tree, so the nested request gets an empty node.
-  auto first = HierarchyRoot(project_.Get());
+  auto first = HierarchyRoot();
   ASSERT_EQ(nested.seen.size(), 1u);
   EXPECT_EQ(nested.results[0], CitI::kOk);
   ASSERT_TRUE(nested.seen[0]);
@@ -182,7 +159,7 @@ TEST_F(Hierarchy, RequestDuringARebuildGetsThePreviousTreeWithoutRebuilding) {
 
   // A rebuild of a tree gone out of date: the nested request sees the tree being replaced.
   ping->setNeedsParse(true);
-  auto second = HierarchyRoot(project_.Get());
+  auto second = HierarchyRoot();
   Port_MsgDispatcher::removeMsgMan(&nested);
   ASSERT_EQ(nested.seen.size(), 2u);
   EXPECT_EQ(nested.seen[1].Get(), first.Get());
@@ -190,23 +167,9 @@ TEST_F(Hierarchy, RequestDuringARebuildGetsThePreviousTreeWithoutRebuilding) {
   nested.seen.clear();
 }
 
-// A design unit of another module: it answers no implementation identity.
-class ForeignUnit final : public Vad::IHdlDesignUnit {
- public:
-  CitI::IInterface* QueryInterface(const Port::XUID& id) override {
-    return id == Vad::IHdlDesignUnit::Iid() || id == CitI::IInterface::Iid() ? this : nullptr;
-  }
-  CitI::Result GetDesignUnit(CitI::IInterface*, Vad::IHdlDesignUnit** out) override {
-    if (out) *out = nullptr;
-    return CitI::kNotImpl;
-  }
-  CitI::Result GetUnitFlag(std::int32_t, bool*) override { return CitI::kNotImpl; }
-  CitI::Result GetDesignUnitTypeId(Port::XUID*) override { return CitI::kNotImpl; }
-};
-
 TEST_F(Hierarchy, DesignUnitPortsAreAskedOfTheElement) {
-  auto file = AddFile(project_.Get(), DataPath("three_level/leaf.vhd"));
-  auto root = HierarchyRoot(project_.Get());
+  AddFile(DataPath("three_level/leaf.vhd"));
+  auto root = HierarchyRoot();
   ASSERT_TRUE(root);
   auto* data = Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get());
   auto* unit = Prjrep::QueryAs<Vad::IHdlDesignUnit>(ChildrenOf(root.Get())[0]->GetElement());
@@ -214,13 +177,13 @@ TEST_F(Hierarchy, DesignUnitPortsAreAskedOfTheElement) {
   EXPECT_EQ(data->getDesignUnitPorts(unit, nullptr), CitI::kInvalidArg);
   EXPECT_EQ(data->getDesignUnitPorts(nullptr, nullptr), CitI::kInvalidArg);
   Vad::IHdlPortIterator* ports = nullptr;
-  ForeignUnit foreign;
+  test_host::ForeignUnit foreign;
   EXPECT_EQ(data->getDesignUnitPorts(&foreign, &ports), CitI::kInvalidArg);
   EXPECT_EQ(ports, nullptr);
 }
 
 TEST_F(Hierarchy, ElaboratorIsMadeOnceAndKept) {
-  Vad::CHdlProject* project = ProjectObject(project_.Get());
+  Vad::CHdlProject* project = ProjectObject();
   EXPECT_EQ(project->getElaborator(nullptr), CitI::kInvalidArg);
   Prjrep::AutoRelease<Vad::CElaborator> first;
   Prjrep::AutoRelease<Vad::CElaborator> second;

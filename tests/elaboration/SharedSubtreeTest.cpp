@@ -28,72 +28,32 @@ namespace {
 // What one elaboration gives a host: the tree as GetChildren shows it, the compile order and the
 // messages of both steps.
 struct Outcome {
-  std::vector<std::string> tree;
+  std::string tree;
   std::vector<std::string> order;
   std::vector<std::string> elaborationMessages;
   std::vector<std::string> orderMessages;
   std::size_t distinctNodes = 0;
 };
 
-std::vector<std::string> MessageTexts(const MessageLog& log) {
-  std::vector<std::string> texts;
-  for (const Port_MsgRecord& record : log.Records())
-    texts.push_back(std::to_string(record.type) + record.text);
-  return texts;
-}
-
 // Messages in first-occurrence order without repeats; a cycle report (header, files, end) counts
 // as one message.
 std::vector<std::string> WithoutRepeats(const std::vector<std::string>& messages) {
-  std::vector<std::string> blocks;
-  bool inCycle = false;
-  for (const std::string& message : messages) {
-    if (inCycle) {
-      blocks.back() += message;
-      inCycle = message.substr(1) != Vad::CompileOrderText::kCycleEnd;
-      continue;
-    }
-    blocks.push_back(message);
-    inCycle = message.find(Vad::CompileOrderText::kCycleHeader) != std::string::npos;
-  }
   std::vector<std::string> unique;
   std::set<std::string> seen;
-  for (const std::string& block : blocks) {
+  std::string block;
+  for (const std::string& message : messages) {
+    block += message;
+    if (block.find(Vad::CompileOrderText::kCycleHeader) != std::string::npos &&
+        message.substr(message.find(": ") + 2) != Vad::CompileOrderText::kCycleEnd)
+      continue;
     if (seen.insert(block).second) unique.push_back(block);
+    block.clear();
   }
   return unique;
 }
 
 class SharedSubtrees : public ElabTest {
  protected:
-  void SetUp() override { project_ = NewProject(); }
-
-  // Every node below the root in pre-order, one line each: depth, name, label, path, type, file
-  // and the library-cell flag, as a host walking GetChildren sees them.
-  static std::vector<std::string> Walk(Vad::IHdlNetListNode* root,
-                                       std::set<Vad::IHdlNetListNode*>& distinct) {
-    std::vector<std::string> lines;
-    std::vector<std::pair<Vad::IHdlNetListNode*, int>> pending{{root, 0}};
-    while (!pending.empty()) {
-      auto [node, depth] = pending.back();
-      pending.pop_back();
-      distinct.insert(node);
-      Port::StringBase label;
-      Port::StringBase path;
-      Port::StringBase type;
-      node->GetInstanceName(&label);
-      auto* tcl = Prjrep::QueryAs<UtilI::ITclCollectable>(node);
-      tcl->GetName(&path);
-      tcl->GetType(&type);
-      lines.push_back(std::to_string(depth) + " " + NameOf(node) + " [" + label.str() + "] {" + path.str() +
-                      "} " + type.str() + " @" + FileNameOf(node) + (node->IsLibraryCell() ? " cell" : ""));
-      std::vector<Vad::IHdlNetListNode*> children = ChildrenOf(node);
-      for (auto child = children.rbegin(); child != children.rend(); ++child)
-        pending.emplace_back(*child, depth + 1);
-    }
-    return lines;
-  }
-
   static std::vector<std::string> FileNames(Vad::IHdlFileIterator* files) {
     std::vector<std::string> names;
     for (; files && !files->IsDone(); files->Next()) {
@@ -105,37 +65,37 @@ class SharedSubtrees : public ElabTest {
     return names;
   }
 
-  Outcome Run(bool share) {
+  Outcome Run(Vad::IHdlDesignUnitIterator* units, bool share) {
     Outcome outcome;
-    Prjrep::AutoRelease<Vad::IHdlDesignUnitSet> units;
-    EXPECT_EQ(ProjectObject(project_.Get())->getAllDesignUnits(units.Out()), CitI::kOk);
-    Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> unit;
-    EXPECT_EQ(units->CreateIterator(unit.Out()), CitI::kOk);
-    Prjrep::AutoRelease<Vad::CElaborator> elaborator(new Vad::CElaborator);
-    elaborator->SetShareSubtrees(share);
+    Vad::CElaborator elaborator;
+    elaborator.SetShareSubtrees(share);
     Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
     {
       MessageLog log;
-      EXPECT_EQ(elaborator->Elaborate(References(), unit.Get(), root.Out()), CitI::kOk);
-      outcome.elaborationMessages = MessageTexts(log);
+      EXPECT_EQ(elaborator.Elaborate(References(), units, root.Out()), CitI::kOk);
+      outcome.elaborationMessages = log.Lines();
     }
     if (!root) return outcome;
     std::set<Vad::IHdlNetListNode*> distinct;
-    outcome.tree = Walk(root.Get(), distinct);
+    outcome.tree = Render(root.Get(), false, &distinct);
     outcome.distinctNodes = distinct.size();
     MessageLog log;
     Prjrep::AutoRelease<Vad::IHdlFileIterator> files;
-    EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), References(), root.Get(), nullptr, nullptr,
-                                             false, files.Out()),
+    EXPECT_EQ(Vad::CCompileOrder::OrderBelow(elaborator, References(), root.Get(), nullptr, nullptr, false,
+                                             files.Out()),
               CitI::kOk);
     outcome.order = FileNames(files.Get());
-    outcome.orderMessages = MessageTexts(log);
+    outcome.orderMessages = log.Lines();
     return outcome;
   }
 
-  Vad::CLibRefs* References() const { return ProjectObject(project_.Get())->getLibraryReferences(); }
-
-  Prjrep::AutoPtr<Vad::IHdlProject> project_;
+  Outcome RunOnProject(bool share) {
+    Prjrep::AutoRelease<Vad::IHdlDesignUnitSet> units;
+    EXPECT_EQ(ProjectObject()->getAllDesignUnits(units.Out()), CitI::kOk);
+    Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> unit;
+    EXPECT_EQ(units->CreateIterator(unit.Out()), CitI::kOk);
+    return Run(unit.Get(), share);
+  }
 };
 
 // A VHDL project of packages using packages and entities whose architectures instantiate each
@@ -206,9 +166,9 @@ TEST_F(SharedSubtrees, SharedAndExpandedBuildsLookTheSameOnRandomProjects) {
     project_ = NewProject();
     ScopedTempDir dir;
     for (const std::string& path : RandomProject(seed, seed % 2 == 0).Write(dir))
-      AddFile(project_.Get(), path);
-    Outcome expanded = Run(false);
-    Outcome shared = Run(true);
+      AddFile(path);
+    Outcome expanded = RunOnProject(false);
+    Outcome shared = RunOnProject(true);
     ASSERT_FALSE(expanded.tree.empty());
     EXPECT_EQ(shared.tree, expanded.tree);
     EXPECT_EQ(shared.order, expanded.order);
@@ -226,52 +186,30 @@ TEST_F(SharedSubtrees, SharedAndExpandedBuildsLookTheSameOnRandomProjects) {
 
 class DeepHierarchy : public SharedSubtrees {
  protected:
-  CitI::IInterface* Keep(Prjrep::AutoRelease<CitI::IInterface> unit) {
-    units_.push_back(unit);
-    return unit.Get();
-  }
   Vad::IHdlFile* File(const std::string& path, std::string_view plugin) {
-    files_.push_back(NewFile(project_.Get(), path, "work", plugin));
+    files_.push_back(MakeFile(path, "work", plugin));
     return files_.back().Get();
   }
-  // `unit` uses package `package` of the working library.
-  void Uses(CitI::IInterface* unit, const std::string& package, Vad::IHdlFile* file) {
-    CitI::IInterface* use = Keep(MakeUnit<Vad::Use>(file, "work." + package + ".all", nullptr));
-    auto* vhdlUnit = RecordOf<Vad::CVhdlDU>(unit);
-    std::vector<Vad::DbObject*> uses;
-    vhdlUnit->GetUses(uses);
-    uses.push_back(RecordOf<Vad::DbObject>(use));
-    vhdlUnit->SetUses(uses);
-  }
 
+  // The units made so far, use clauses aside.
   Prjrep::AutoPtr<Vad::IHdlNetListNode> Elaborate(Vad::CElaborator& elaborator) {
     std::vector<CitI::IInterface*> designUnits;
-    for (const auto& unit : units_) {
-      if (RecordOf<Vad::DbObject>(unit.Get())->GetType() != Vad::DbType::kUse)
-        designUnits.push_back(unit.Get());
-    }
-    auto iterator = IterateUnits(designUnits);
+    for (const auto& unit : units_)
+      if (RecordOf<Vad::DbObject>(unit.Get())->GetType() != Vad::DbType::kUse) designUnits.push_back(unit.Get());
     Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
-    EXPECT_EQ(elaborator.Elaborate(References(), iterator.Get(), root.Out()), CitI::kOk);
+    EXPECT_EQ(elaborator.Elaborate(References(), IterateUnits(designUnits).Get(), root.Out()), CitI::kOk);
     return root;
   }
 
   // The nodes from `top` down along the first child, and the last one's path.
   static std::size_t DepthAlongFirstChildren(Vad::IHdlNetListNode* top, std::string& lastPath) {
-    std::size_t depth = 0;
-    Vad::IHdlNetListNode* last = nullptr;
-    for (Vad::IHdlNetListNode* node = top; node; ++depth) {
-      last = node;
-      std::vector<Vad::IHdlNetListNode*> children = ChildrenOf(node);
-      node = children.empty() ? nullptr : children.front();
-    }
-    Port::StringBase path;
-    Prjrep::QueryAs<UtilI::ITclCollectable>(last)->GetName(&path);
-    lastPath = path.str();
+    std::size_t depth = 1;
+    for (std::vector<Vad::IHdlNetListNode*> children; !(children = ChildrenOf(top)).empty(); ++depth)
+      top = children.front();
+    lastPath = PathOf(top);
     return depth;
   }
 
-  std::vector<Prjrep::AutoRelease<CitI::IInterface>> units_;
   std::vector<Prjrep::AutoPtr<Vad::IHdlFile>> files_;
 };
 
@@ -286,14 +224,11 @@ TEST_F(DeepHierarchy, InstanceChainAndPackageChainElaborateOrderAndFree) {
                                                     : files_[files_.size() - 2].Get();
     Vad::IHdlFile* vhdl =
         i % kUnitsPerFile == 0 ? File("/chain/p" + suffix + ".vhd", "PLUGIN_Vhdl") : files_.back().Get();
-    CitI::IInterface* module = Keep(MakeUnit<Vad::module>(verilog, "m" + std::to_string(i), nullptr));
+    CitI::IInterface* module = Unit<Vad::module>(verilog, "m" + std::to_string(i), nullptr);
+    CitI::IInterface* package = Unit<Vad::PackageDecl>(vhdl, "p" + std::to_string(i), nullptr);
     if (i + 1 < kChainDepth) {
-      Prjrep::AutoRelease<CitI::IInterface> instance(
-          new Vad::CompInst("u", "m" + std::to_string(i + 1), RecordOf<Vad::DbObject>(module)));
-      CitI::IInterface* package = Keep(MakeUnit<Vad::PackageDecl>(vhdl, "p" + std::to_string(i), nullptr));
-      Uses(package, "p" + std::to_string(i + 1), vhdl);
-    } else {
-      Keep(MakeUnit<Vad::PackageDecl>(vhdl, "p" + std::to_string(i), nullptr));
+      Component(module, "u", "m" + std::to_string(i + 1));
+      Uses(package, "work.p" + std::to_string(i + 1) + ".all");
     }
   }
   Vad::CElaborator elaborator;
@@ -329,14 +264,10 @@ TEST_F(DeepHierarchy, InstanceChainAndPackageChainElaborateOrderAndFree) {
 
 TEST_F(DeepHierarchy, PackageUsedByManyUnitsIsOneNodeWithEveryParent) {
   Vad::IHdlFile* file = File("/src/diamond.vhd", "PLUGIN_Vhdl");
-  CitI::IInterface* common = Keep(MakeUnit<Vad::PackageDecl>(file, "common", nullptr));
-  Uses(common, "base", file);
-  Keep(MakeUnit<Vad::PackageDecl>(file, "base", nullptr));
+  Uses(Unit<Vad::PackageDecl>(file, "common", nullptr), "work.base.all");
+  Unit<Vad::PackageDecl>(file, "base", nullptr);
   constexpr int kUsers = 3;
-  for (int i = 0; i < kUsers; ++i) {
-    CitI::IInterface* user = Keep(MakeUnit<Vad::PackageDecl>(file, "user" + std::to_string(i), nullptr));
-    Uses(user, "common", file);
-  }
+  for (int i = 0; i < kUsers; ++i) Uses(Unit<Vad::PackageDecl>(file, "user" + std::to_string(i), nullptr), "work.common.all");
   Vad::CElaborator elaborator;
   auto root = Elaborate(elaborator);
   ASSERT_TRUE(root);

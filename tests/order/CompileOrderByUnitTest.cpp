@@ -15,23 +15,11 @@
 #include "Port/MsgManData.h"
 
 using namespace order_test;
-using Strings = std::vector<std::string>;
 
 namespace {
 
 constexpr CitI::Result kNotOrderedByKind = 4;
 constexpr CitI::Result kUnitNotInTree = 5;
-
-// A design unit of no module of ours.
-class ForeignUnit final : public Vad::IHdlDesignUnit {
- public:
-  CitI::IInterface* QueryInterface(const Port::XUID& id) override {
-    return id == Vad::IHdlDesignUnit::Iid() || id == CitI::IInterface::Iid() ? this : nullptr;
-  }
-  CitI::Result GetDesignUnit(CitI::IInterface*, Vad::IHdlDesignUnit**) override { return CitI::kOk; }
-  CitI::Result GetUnitFlag(std::int32_t, bool*) override { return CitI::kFail; }
-  CitI::Result GetDesignUnitTypeId(Port::XUID*) override { return CitI::kFail; }
-};
 
 class CompileOrderByUnit : public OrderTest {
  protected:
@@ -70,31 +58,33 @@ const Strings kWholeProject{"util.vhd", "leaf_ent.vhd", "leaf_rtl.vhd", "mid.vhd
 // mid's tree (mid.vhd, util.vhd) widened by side, which shares mid.vhd, and side's subtree.
 const Strings kMidWithItsFileMates{"util.vhd", "leaf_ent.vhd", "leaf_rtl.vhd", "mid.vhd"};
 
-TEST_F(CompileOrderByUnit, AModuleByItselfIsJustItsOwnFile) {
-  EXPECT_EQ(OrderOf("Module|counter", true), Strings{"counter.sm"});
-  EXPECT_EQ(OrderOf("Module|counter", false), Strings{"counter.sm"});
+TEST_F(CompileOrderByUnit, EachUnitGetsTheOrderOfItsTreeByItselfOrWithItsDependencies) {
+  struct Case {
+    const char* key;
+    bool byUnit;
+    Strings order;
+  };
+  const Case cases[] = {
+      {"Module|counter", true, {"counter.sm"}},
+      {"Module|counter", false, {"counter.sm"}},
+      {"Entity|top", true, kWholeProject},
+      // An architecture by itself: not its own file, but its entity node's tree (the entity and the
+      // package it uses).
+      {"Architecture|leaf|rtl", true, {"util.vhd", "leaf_ent.vhd"}},
+      {"Architecture|mid|rtl", true, {"mid.vhd"}},
+      {"Architecture|ghost|rtl", false, {"orphan.vhd"}},
+      {"PackageDecl|util", false, {"util.vhd"}},
+      // With its dependencies, a unit takes along the units that share its files.
+      {"Architecture|mid|rtl", false, kMidWithItsFileMates},
+      {"Entity|side", false, kMidWithItsFileMates},
+      {"Architecture|top|rtl", false, {"util.vhd", "leaf_ent.vhd", "leaf_rtl.vhd", "mid.vhd", "top.vhd"}},
+      {"Architecture|other|rtl", false, {"other.vhd"}}};
+  for (const Case& c : cases) EXPECT_EQ(OrderOf(c.key, c.byUnit), c.order) << c.key << " by unit " << c.byUnit;
   EXPECT_EQ(Messages(), Strings{});
-}
-
-TEST_F(CompileOrderByUnit, AnEntityByItselfGetsTheOrderOfTheWholeTree) {
-  EXPECT_EQ(OrderOf("Entity|top", true), kWholeProject);
-}
-
-TEST_F(CompileOrderByUnit, AnArchitectureByItselfGetsTheOrderOfItsEntitysTree) {
-  // Not the architecture's own file: the entity node's tree is the entity and the package it uses.
-  EXPECT_EQ(OrderOf("Architecture|leaf|rtl", true), (Strings{"util.vhd", "leaf_ent.vhd"}));
-  EXPECT_EQ(OrderOf("Architecture|mid|rtl", true), Strings{"mid.vhd"});
-  EXPECT_EQ(Messages(), Strings{});
-}
-
-TEST_F(CompileOrderByUnit, AnArchitectureWithoutAnEntityInTheProjectHasNoOrderByItself) {
+  // By itself, an architecture without an entity in the project is in no tree, and a package is
+  // not ordered.
   OrderOf("Architecture|ghost|rtl", true, kUnitNotInTree);
-  EXPECT_EQ(OrderOf("Architecture|ghost|rtl", false), Strings{"orphan.vhd"});
-}
-
-TEST_F(CompileOrderByUnit, APackageByItselfIsNotOrdered) {
   OrderOf("PackageDecl|util", true, kNotOrderedByKind);
-  EXPECT_EQ(OrderOf("PackageDecl|util", false), Strings{"util.vhd"});
 }
 
 TEST_F(CompileOrderByUnit, AUnitOutsideTheTreeHasNoOrder) {
@@ -106,15 +96,6 @@ TEST_F(CompileOrderByUnit, AUnitOutsideTheTreeHasNoOrder) {
   ASSERT_EQ(Prjrep::ImplementationCast<Vad::DbObject>(generic.Get())->GetType(), Vad::DbType::kGeneric);
   EXPECT_EQ(ResultFor(generic.Get(), true), kUnitNotInTree);
   EXPECT_EQ(ResultFor(generic.Get(), false), kUnitNotInTree);
-}
-
-TEST_F(CompileOrderByUnit, AUnitWithItsDependenciesTakesAlongTheUnitsThatShareItsFiles) {
-  EXPECT_EQ(OrderOf("Architecture|mid|rtl", false), kMidWithItsFileMates);
-  EXPECT_EQ(OrderOf("Entity|side", false), kMidWithItsFileMates);
-  EXPECT_EQ(OrderOf("Architecture|top|rtl", false),
-            (Strings{"util.vhd", "leaf_ent.vhd", "leaf_rtl.vhd", "mid.vhd", "top.vhd"}));
-  EXPECT_EQ(OrderOf("Architecture|other|rtl", false), Strings{"other.vhd"});
-  EXPECT_EQ(Messages(), Strings{});
 }
 
 TEST_F(CompileOrderByUnit, ATopNodeGivenToTheProjectOrderGetsTheSameReducedTree) {
@@ -140,6 +121,15 @@ TEST_F(CompileOrderByUnit, WithoutTheByUnitFlagATopNodeGetsTheOrderOfItsOwnTree)
                                            false, order.Out()),
             CitI::kOk);
   EXPECT_EQ(FileNames(order.Get()), (Strings{"util.vhd", "mid.vhd"}));
+
+  order = nullptr;
+  EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), nullptr, root_.Get(), node, config.Get(), true,
+                                           order.Out()),
+            CitI::kInvalidArg);
+  EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), References(), root_.Get(), node, nullptr, true,
+                                           order.Out()),
+            CitI::kInvalidArg);
+  EXPECT_FALSE(order);
 }
 
 TEST_F(CompileOrderByUnit, UnitsThatAreNotOursOrMissingGetNoOrder) {
@@ -148,28 +138,12 @@ TEST_F(CompileOrderByUnit, UnitsThatAreNotOursOrMissingGetNoOrder) {
   EXPECT_EQ(Elaboration()->getCompileOrderByDU(nullptr, true, order.Out()), CitI::kFail);
   EXPECT_EQ(Elaboration()->getCompileOrderByDU(unit.Get(), true, nullptr), CitI::kFail);
 
-  ForeignUnit foreign;
+  test_host::ForeignUnit foreign;
   Port_DebugCapture debug;
   EXPECT_EQ(Elaboration()->getCompileOrderByDU(&foreign, false, order.Out()), CitI::kFail);
   EXPECT_FALSE(order);
   EXPECT_EQ(debug.text(),
             "Error: CHdlView::getCompileOrderByDU() - Unable to obtain the CHdlElement pointer.\n");
-}
-
-TEST_F(CompileOrderByUnit, TheReducedTreeNeedsEveryArgument) {
-  auto elaborator = Elaborator();
-  Prjrep::AutoPtr<Vad::IHdlParserConfig> config;
-  ASSERT_EQ(project_->getParserConfig(config.Out()), CitI::kOk);
-  auto mid = Unit("Architecture|mid|rtl");
-  Vad::IHdlNetListNode* node = Vad::NetListWalk::FindNodeOfUnit(root_.Get(), mid.Get());
-  Prjrep::AutoPtr<Vad::IHdlFileIterator> order;
-  EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), nullptr, root_.Get(), node, config.Get(), true,
-                                           order.Out()),
-            CitI::kInvalidArg);
-  EXPECT_EQ(Vad::CCompileOrder::OrderBelow(*elaborator.Get(), References(), root_.Get(), node, nullptr, true,
-                                           order.Out()),
-            CitI::kInvalidArg);
-  EXPECT_FALSE(order);
 }
 
 }  // namespace

@@ -9,7 +9,6 @@
 #include "Port/MsgManData.h"
 
 using namespace order_test;
-using Strings = std::vector<std::string>;
 using Graph = Vad::CCompileOrder::Graph;
 
 namespace {

@@ -2,58 +2,70 @@
 // circular file dependencies, with the exact messages.
 #include <gtest/gtest.h>
 
+#include <initializer_list>
+
 #include "OrderFixtures.h"
 
 using namespace order_test;
 namespace Text = Vad::CompileOrderText;
-using Strings = std::vector<std::string>;
 
 namespace {
 
-class CompileOrder : public OrderTest {};
+using CompileOrder = OrderTest;
 
-TEST_F(CompileOrder, ATreeInOneFileGivesThatFileWithoutMessages) {
-  AddFile("single", "alu.vhd");
-  Root();
-  EXPECT_EQ(ProjectOrder(), Strings{"alu.vhd"});
-  EXPECT_EQ(Messages(), Strings{});
-}
-
-TEST_F(CompileOrder, APackageComesBeforeItsUserAndAFileOnItsOwnComesLast) {
-  AddFiles("package", {"loner.vhd", "shared.vhd", "user.vhd"});
-  Root();
+TEST_F(CompileOrder, UsedFilesComeFirstThenEqualLevelsInDescendingNameOrderWithLetterCaseFolded) {
+  struct Case {
+    const char* folder;
+    std::initializer_list<std::string_view> files;
+    Strings order;
+  };
   // loner uses nothing and nobody uses it: level 0 like user, and after it by name.
-  EXPECT_EQ(ProjectOrder(), (Strings{"shared.vhd", "user.vhd", "loner.vhd"}));
-  EXPECT_EQ(Messages(), Strings{});
+  const Case cases[] = {{"single", {"alu.vhd"}, {"alu.vhd"}},
+                        {"package", {"loner.vhd", "shared.vhd", "user.vhd"}, {"shared.vhd", "user.vhd", "loner.vhd"}},
+                        {"names", {"alpha.vhd", "Beta.vhd", "gamma.vhd"}, {"gamma.vhd", "Beta.vhd", "alpha.vhd"}}};
+  for (const Case& c : cases) {
+    SCOPED_TRACE(c.folder);
+    project_ = NewProject();
+    AddFiles(c.folder, c.files);
+    Root();
+    EXPECT_EQ(ProjectOrder(), c.order);
+    EXPECT_EQ(Messages(), Strings{});
+  }
 }
 
-TEST_F(CompileOrder, FilesOfEqualLevelComeInDescendingNameOrderWithLetterCaseFolded) {
-  AddFiles("names", {"alpha.vhd", "Beta.vhd", "gamma.vhd"});
-  Root();
-  EXPECT_EQ(ProjectOrder(), (Strings{"gamma.vhd", "Beta.vhd", "alpha.vhd"}));
-}
-
-TEST_F(CompileOrder, MutualInstancesWithSeparateEntityFilesAreOrderedByTheRelaxedRule) {
-  AddFiles("split", {"a_ent.vhd", "a_rtl.vhd", "b_ent.vhd", "b_rtl.vhd"});
-  Root();
-  // Both entity files before both architecture files: a valid order.
-  EXPECT_EQ(ProjectOrder(), (Strings{"b_ent.vhd", "a_ent.vhd", "b_rtl.vhd", "a_rtl.vhd"}));
-  EXPECT_EQ(Messages(),
-            (Strings{Warning(Text::kStrictCycle), Warning(Text::kCycleHeader),
-                     CycleLine("split", "b_rtl.vhd"), CycleLine("split", "a_rtl.vhd"),
-                     Warning(Text::kCycleEnd), Warning(Text::kRelaxing), Warning(Text::kRelaxedOrderValid)}));
-}
-
-TEST_F(CompileOrder, MutualInstancesInFilesWithTheirEntitiesLeaveTheRelaxedGraphWithoutEdges) {
-  AddFiles("joined", {"a.vhd", "b.vhd"});
-  Root();
-  // Instances lead to architecture nodes and each entity shares its architecture's file, so the
-  // relaxed rule keeps no edge at all.
-  EXPECT_EQ(ProjectOrder(), (Strings{"b.vhd", "a.vhd"}));
-  EXPECT_EQ(Messages(),
-            (Strings{Warning(Text::kStrictCycle), Warning(Text::kCycleHeader), CycleLine("joined", "b.vhd"),
-                     CycleLine("joined", "a.vhd"), Warning(Text::kCycleEnd), Warning(Text::kRelaxing),
-                     Warning(Text::kRelaxedOrderValid)}));
+TEST_F(CompileOrder, MutualInstancesAreOrderedByTheRelaxedRuleWithTheCycleListedFromTheBackEdgeSource) {
+  struct Case {
+    const char* folder;
+    std::initializer_list<std::string_view> files;
+    Strings order;
+    Strings cycle;
+  };
+  const Case cases[] = {
+      // Both entity files before both architecture files: a valid order.
+      {"split", {"a_ent.vhd", "a_rtl.vhd", "b_ent.vhd", "b_rtl.vhd"},
+       {"b_ent.vhd", "a_ent.vhd", "b_rtl.vhd", "a_rtl.vhd"}, {"b_rtl.vhd", "a_rtl.vhd"}},
+      // Instances lead to architecture nodes and each entity shares its architecture's file, so the
+      // relaxed rule keeps no edge at all.
+      {"joined", {"a.vhd", "b.vhd"}, {"b.vhd", "a.vhd"}, {"b.vhd", "a.vhd"}},
+      // Three files: listed against the edges.
+      {"ring", {"p.vhd", "q.vhd", "r.vhd"}, {"r.vhd", "q.vhd", "p.vhd"}, {"r.vhd", "q.vhd", "p.vhd"}}};
+  for (const Case& c : cases) {
+    SCOPED_TRACE(c.folder);
+    project_ = NewProject();
+    AddFiles(c.folder, c.files);
+    Root();
+    EXPECT_EQ(ProjectOrder(), c.order);
+    Strings expected{Warning(Text::kStrictCycle), Warning(Text::kCycleHeader)};
+    for (const std::string& file : c.cycle) expected.push_back(CycleLine(c.folder, file));
+    for (const char* text : {Text::kCycleEnd, Text::kRelaxing, Text::kRelaxedOrderValid})
+      expected.push_back(Warning(text));
+    EXPECT_EQ(Messages(), expected);
+  }
+  for (const Port_MsgRecord& record : log_.Records()) {
+    EXPECT_EQ(record.category, "ProjectMgmt");
+    EXPECT_EQ(record.sourceFile, "../src/CElaborator");
+    EXPECT_GT(record.line, 0);
+  }
 }
 
 TEST_F(CompileOrder, ACycleThatSurvivesTheRelaxedRuleIsListedAgainCutAndStillOrdered) {
@@ -69,28 +81,6 @@ TEST_F(CompileOrder, ACycleThatSurvivesTheRelaxedRuleIsListedAgainCutAndStillOrd
   EXPECT_EQ(Messages(), (Strings{Warning(Text::kStrictCycle), header, y, x, end, header, y, x, end,
                                  Warning(Text::kRelaxing), Warning(Text::kRelaxedCycle), header, y, x, end,
                                  Warning(Text::kBreaking), Warning(Text::kNoValidOrder)}));
-}
-
-TEST_F(CompileOrder, AThreeFileCycleIsListedFromTheBackEdgeSourceAgainstTheEdges) {
-  AddFiles("ring", {"p.vhd", "q.vhd", "r.vhd"});
-  Root();
-  EXPECT_EQ(ProjectOrder(), (Strings{"r.vhd", "q.vhd", "p.vhd"}));
-  EXPECT_EQ(Messages(),
-            (Strings{Warning(Text::kStrictCycle), Warning(Text::kCycleHeader), CycleLine("ring", "r.vhd"),
-                     CycleLine("ring", "q.vhd"), CycleLine("ring", "p.vhd"), Warning(Text::kCycleEnd),
-                     Warning(Text::kRelaxing), Warning(Text::kRelaxedOrderValid)}));
-}
-
-TEST_F(CompileOrder, MessagesComeFromTheElaboratorInTheProjectCategory) {
-  AddFiles("ring", {"p.vhd", "q.vhd", "r.vhd"});
-  Root();
-  ProjectOrder();
-  ASSERT_FALSE(collector_.records().empty());
-  for (const Port_MsgRecord& record : collector_.records()) {
-    EXPECT_EQ(record.category, "ProjectMgmt");
-    EXPECT_EQ(record.sourceFile, "../src/CElaborator");
-    EXPECT_GT(record.line, 0);
-  }
 }
 
 TEST_F(CompileOrder, AWholeProjectIsOrderedAcrossAllTopNodes) {

@@ -12,19 +12,13 @@
 #include "ScopedTempDir.h"
 
 using namespace order_test;
-using Strings = std::vector<std::string>;
 
 namespace {
 
 class VhdlDependencyOrder : public OrderTest {
  protected:
   void AddSource(std::string_view name, std::string_view text) {
-    std::string path = dir_.Path(name);
-    std::FILE* out = std::fopen(path.c_str(), "wb");
-    ASSERT_NE(out, nullptr);
-    std::fwrite(text.data(), 1, text.size(), out);
-    std::fclose(out);
-    AddFileAt(path);
+    AddNewFile(project_.Get(), WriteBytes(dir_.Path(name), text), "PLUGIN_Vhdl");
   }
 
   ScopedTempDir dir_;
@@ -38,7 +32,7 @@ TEST_F(VhdlDependencyOrder, MaplessInstancesPutTheInstantiatedFileFirst) {
   for (std::string_view instance : {"u : entity work.sub(rtl);", "u : entity work.sub;", "u : sub;",
                                     "u : component sub;", "u : entity work.sub generic map (N => 1);"}) {
     SCOPED_TRACE(std::string(instance));
-    project_ = Prjrep::CreateInstanceAs<Vad::IHdlProject>(Vad::ClassIds::CHdlProject());
+    project_ = NewProject();
     AddSource("sub.vhd", kSub);
     AddSource("top.vhd",
               "entity top is end;\narchitecture rtl of top is\n"

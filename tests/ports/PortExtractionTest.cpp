@@ -17,8 +17,6 @@
 #include "IHdlElaborationData.h"
 #include "IHdlPort.h"
 #include "TestHost.h"
-#include "Port/MsgCollector.h"
-#include "Port/MsgDispatcher.h"
 #include "Port/MsgManData.h"
 #include "PortExtraction.h"
 #include "ScopedTempDir.h"
@@ -67,17 +65,12 @@ Strings Describe(Vad::IHdlPortIterator* ports) {
 class PortExtraction : public test_host::PipelineTest {
  protected:
   void SetUp() override {
-    defaultWasRegistered_ = Port_MsgDispatcher::removeMsgMan(Port_MsgDispatcher::getDefaultMsgMan());
-    ASSERT_TRUE(Port_MsgDispatcher::addMsgMan(&collector_));
+    log_.SilenceTerminal();
     project_ = NewProject();
     for (const char* name : {"sizes_pkg.vhd", "mixer.vhd", "gauge.vhd"}) AddCopy(name, "PLUGIN_Vhdl");
     auto verilog = AddCopy("pair.v", "PLUGIN_Verilog");
     Prjrep::QueryAs<Vad::IHdlFileV3>(verilog.Get())->setV3Flag(true);
     ASSERT_EQ(project_->getAllDesignUnits(units_.Out()), CitI::kOk);
-  }
-  void TearDown() override {
-    Port_MsgDispatcher::removeMsgMan(&collector_);
-    if (defaultWasRegistered_) Port_MsgDispatcher::addMsgMan(Port_MsgDispatcher::getDefaultMsgMan());
   }
 
   Prjrep::AutoPtr<Vad::IHdlFile> AddCopy(const char* name, const char* plugin) {
@@ -91,16 +84,7 @@ class PortExtraction : public test_host::PipelineTest {
     return Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get());
   }
 
-  // The unit of the project whose design-unit key is `key` ("Entity|mixer").
-  Vad::IHdlDesignUnit* Unit(std::string_view key) const {
-    for (CitI::IInterface* unit : UnitsOf(units_.Get())) {
-      Port::StringBase unitKey;
-      if (auto* object = Prjrep::ImplementationCast<Vad::DbObject>(unit)) object->GetDesignUnitKey(unitKey);
-      if (unitKey.view() == key) return Prjrep::QueryAs<Vad::IHdlDesignUnit>(unit);
-    }
-    ADD_FAILURE() << "no design unit " << key;
-    return nullptr;
-  }
+  Vad::IHdlDesignUnit* Unit(std::string_view key) const { return test_host::UnitWithKey(units_.Get(), key).Get(); }
 
   // The ports the project hands out for the unit; the query itself always answers 1.
   Strings PortsOf(std::string_view key) {
@@ -120,13 +104,7 @@ class PortExtraction : public test_host::PipelineTest {
     return result;
   }
 
-  Strings ErrorTexts() const {
-    Strings texts;
-    for (const Port_MsgRecord& record : collector_.records()) {
-      if (record.type == Port_MsgMan::kError) texts.push_back(record.text);
-    }
-    return texts;
-  }
+  Strings ErrorTexts() const { return log_.Texts(Port_MsgMan::kError); }
 
   // The developer texts that give the reason for a missing answer.
   Strings Reasons() const {
@@ -140,8 +118,7 @@ class PortExtraction : public test_host::PipelineTest {
 
   ScopedTempDir dir_;
   Port_DebugCapture debug_;
-  Port_MsgCollector collector_;
-  bool defaultWasRegistered_ = false;
+  test_host::MessageLog log_;
   Prjrep::AutoPtr<Vad::IHdlProject> project_;
   std::vector<Prjrep::AutoPtr<Vad::IHdlFile>> files_;  // sizes_pkg, mixer, gauge, pair
   Prjrep::AutoRelease<Vad::IHdlDesignUnitSet> units_;

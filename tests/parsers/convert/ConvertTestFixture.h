@@ -18,8 +18,6 @@
 #include "CParserConfigHolder.h"
 #include "TestHost.h"
 #include "Port/File.h"
-#include "Port/MsgCollector.h"
-#include "Port/MsgDispatcher.h"
 #include "Port/MsgManData.h"
 #include "ScopedEnv.h"
 #include "ScopedTempDir.h"
@@ -28,11 +26,7 @@ namespace convert_test {
 
 class ConverterParse : public test_host::PipelineTest {
  protected:
-  void SetUp() override {
-    project_ = NewProject();
-    Port_MsgDispatcher::addMsgMan(&messages_);
-  }
-  void TearDown() override { Port_MsgDispatcher::removeMsgMan(&messages_); }
+  void SetUp() override { project_ = NewProject(); }
 
   // An executable shell script named `name` in the tools directory.
   void InstallTool(std::string_view name, std::string_view body) {
@@ -97,18 +91,8 @@ class ConverterParse : public test_host::PipelineTest {
 
   std::string Part() const { return HolderOf(file_.Get())->GetPart().str(); }
 
-  // "error: <text>" and "warning: <text>" of the messages issued, with their category checked.
-  std::vector<std::string> Messages() const {
-    std::vector<std::string> texts;
-    for (const Port_MsgRecord& record : messages_.records()) {
-      EXPECT_EQ(record.category, "ProjectMgmt") << record.text;
-      const char* kind = record.type == Port_MsgMan::kError     ? "error: "
-                         : record.type == Port_MsgMan::kWarning ? "warning: "
-                                                                : "other: ";
-      texts.push_back(kind + record.text);
-    }
-    return texts;
-  }
+  // "<type>: <text>" of the messages issued, with their category checked.
+  std::vector<std::string> Messages() const { return messages_.Lines("ProjectMgmt"); }
 
   static std::vector<std::string> Describe(Vad::IHdlDesignUnitSet* set) {
     return DescribeUnits(set, [](CitI::IInterface* unit) { return Describe(unit); });
@@ -139,7 +123,7 @@ class ConverterParse : public test_host::PipelineTest {
   ScopedEnv qt3_{"CVN_WSMGR_QT3", nullptr};
   Prjrep::AutoPtr<Vad::IHdlProject> project_;
   Prjrep::AutoPtr<Vad::IHdlFile> file_;
-  Port_MsgCollector messages_;
+  test_host::MessageLog messages_;
   std::string debugText_;
 };
 

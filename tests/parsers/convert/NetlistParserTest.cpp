@@ -82,7 +82,7 @@ TEST_F(NetlistParse, MissingOrCorruptIntermediateFileIsReported) {
                                           ": edifconv exited with status 1)\n",
                                       "error: edifconv wrote no output design.tbx for design.edf\n"));
 
-  messages_.clearRecords();
+  messages_.Clear();
   InstallNetlistConverter(Database("", "SOURCE", R"({"properties": {"TYPE": "nameless"}})"));
   EXPECT_THAT(ParseAgain(), IsEmpty());
   InstallNetlistConverter(Database("", "LAYOUT", Block("top", "top_cell", kGate)));
@@ -92,7 +92,7 @@ TEST_F(NetlistParse, MissingOrCorruptIntermediateFileIsReported) {
                           testing::StartsWith("error: The tbx file: design.tbx may be corrupt: ")));
 
   // A database that exists but is none is not said to be impossible to open.
-  messages_.clearRecords();
+  messages_.Clear();
   InstallTool("edifconv", "echo 'not a database' > design.tbx\n");
   EXPECT_THAT(ParseAgain(), IsEmpty());
   EXPECT_THAT(Messages(), ElementsAre("error: design.tbx is no netlist database\n"));

@@ -60,7 +60,7 @@ TEST_F(EdifRead, FlatNetlistRecordsTheRenamedTopCellAndThePart) {
   EXPECT_EQ(part_, "DEV-100-A");
   EXPECT_THAT(Read<Vad::EdifParserEx>(Netlist(false)), ElementsAre("|Module||top top"));
   EXPECT_EQ(part_, "DEV-100-A");
-  EXPECT_THAT(log.Lines(), IsEmpty());
+  EXPECT_THAT(log.Lines("ProjectMgmt"), IsEmpty());
 }
 
 TEST_F(EdifRead, HierarchyOnRequestRecordsCellsWithBodiesAndTheirNonPrimitiveInstances) {
@@ -73,7 +73,7 @@ TEST_F(EdifRead, HierarchyOnRequestRecordsCellsWithBodiesAndTheirNonPrimitiveIns
                           "|ComponentInstantiation||top|top|u_other|leaf| instance parent |Module||top",
                           "|Module||leaf module", "|Module||top top"));
   EXPECT_EQ(part_, "DEV-100-A");
-  EXPECT_THAT(log.Lines(), IsEmpty());
+  EXPECT_THAT(log.Lines("ProjectMgmt"), IsEmpty());
 }
 
 TEST_F(EdifRead, PartitionedNetlistIsReadAsHierarchyUnlessTheEnvironmentForbidsIt) {
@@ -106,9 +106,9 @@ TEST_F(EdifRead, DesignNamingAnUnknownCellOrLibraryIsAnError) {
     EXPECT_THAT(Read<Vad::EdifParser>(unknownCell), IsEmpty());
     EXPECT_THAT(Read<Vad::EdifParser>(unknownLibrary), IsEmpty());
     EXPECT_THAT(Read<Vad::EdifParser>(known), ElementsAre("|Module||known_cell top"));
-    EXPECT_THAT(log.Lines(), ElementsAre("error ProjectMgmt: ERROR: cell/library \"other_cell|lib_x\", "
+    EXPECT_THAT(log.Lines("ProjectMgmt"), ElementsAre("error: ERROR: cell/library \"other_cell|lib_x\", "
                                          "referenced in design...cellref clause, not found\n",
-                                         "error ProjectMgmt: ERROR: cell/library \"known_cell|lib_y\", "
+                                         "error: ERROR: cell/library \"known_cell|lib_y\", "
                                          "referenced in design...cellref clause, not found\n"));
   }
   ScopedEnv always(kAlways, "1");
@@ -116,10 +116,10 @@ TEST_F(EdifRead, DesignNamingAnUnknownCellOrLibraryIsAnError) {
   EXPECT_THAT(Read<Vad::EdifParserEx>(unknownCell, "nodesign.edf"), IsEmpty());
   // Once from the keyword scan that decides on the hierarchy, once from the grammar.
   const std::string missing =
-      "error ProjectMgmt: ERROR: cell/library \"other_cell|lib_x\", referenced in design...cellref clause, "
+      "error: ERROR: cell/library \"other_cell|lib_x\", referenced in design...cellref clause, "
       "not found\n";
-  EXPECT_THAT(log.Lines(),
-              ElementsAre(missing, missing, "error ProjectMgmt: No design in edif file: nodesign.edf"));
+  EXPECT_THAT(log.Lines("ProjectMgmt"),
+              ElementsAre(missing, missing, "error: No design in edif file: nodesign.edf"));
   EXPECT_THAT(Read<Vad::EdifParserEx>(known), ElementsAre("|Module||known_cell top"));
 }
 
@@ -135,7 +135,7 @@ TEST_F(EdifRead, RenamedLibraryIsReferencedByItsEdifName) {
   EXPECT_THAT(Read<Vad::EdifParserEx>(netlist),
               ElementsAre("|ComponentInstantiation||top|top|u1|leaf| instance parent |Module||top",
                           "|Module||leaf module", "|Module||top top"));
-  EXPECT_THAT(log.Lines(), IsEmpty());
+  EXPECT_THAT(log.Lines("ProjectMgmt"), IsEmpty());
 }
 
 TEST_F(EdifRead, LongestCellNameKeepsItsLibraryInTheDesignReference) {
@@ -145,12 +145,12 @@ TEST_F(EdifRead, LongestCellNameKeepsItsLibraryInTheDesignReference) {
   ScopedEnv always(kAlways, "1");
   MessageLog log;
   EXPECT_THAT(Read<Vad::EdifParserEx>(netlist), ElementsAre("|Module||" + cell + " top"));
-  for (const std::string& line : log.Lines()) EXPECT_THAT(line, testing::Not(HasSubstr("not found")));
+  for (const std::string& line : log.Lines("ProjectMgmt")) EXPECT_THAT(line, testing::Not(HasSubstr("not found")));
 }
 
 TEST_F(EdifRead, SiblingHierarchyFileInTheCurrentDirectoryIsReadInstead) {
-  const std::string netlist = Write(Netlist(false), "board.edf");
-  Write("HIERARCHY\nMODULE from_hrf\nSUBMODULE sub_hrf\nENDHIERARCHY\n", "board.hrf");
+  const std::string netlist = Write("board.edf", Netlist(false));
+  Write("board.hrf", "HIERARCHY\nMODULE from_hrf\nSUBMODULE sub_hrf\nENDHIERARCHY\n");
   // Elsewhere the hierarchy file is not seen.
   EXPECT_THAT(ReadPath<Vad::EdifParser>(netlist), ElementsAre("|Module||top top"));
   ScopedCurrentDir here(dir_.path());
@@ -170,7 +170,7 @@ TEST_F(EdifRead, OverlongTokenIsCutWithAWarningAndReadingGoesOn) {
                               "(design d (cellRef top (libraryRef lib_x)))\n";
   MessageLog log;
   EXPECT_THAT(Read<Vad::EdifParser>(netlist), ElementsAre("|Module||top top"));
-  EXPECT_THAT(log.Lines(), ElementsAre("warning ProjectMgmt: EDIF parser truncated token to " +
+  EXPECT_THAT(log.Lines("ProjectMgmt"), ElementsAre("warning: EDIF parser truncated token to " +
                                        longName.substr(0, 1023) + ".\n"));
 }
 
@@ -189,10 +189,10 @@ TEST_F(EdifRead, UnopenableFileRecordsNothingAndOnlyTheHierarchyReaderSaysSo) {
   MessageLog log;
   EXPECT_THAT(ReadPath<Vad::EdifParser>(missing), IsEmpty());
   EXPECT_THAT(ReadPath<Vad::EdifParserEx>(missing), IsEmpty());
-  EXPECT_THAT(log.Lines(), IsEmpty());
+  EXPECT_THAT(log.Lines("ProjectMgmt"), IsEmpty());
   ScopedEnv always(kAlways, "1");
   EXPECT_THAT(ReadPath<Vad::EdifParserEx>(missing), IsEmpty());
-  EXPECT_THAT(log.Lines(), ElementsAre("error ProjectMgmt: ERROR: Quillon.dll: EdifParserEx: " + missing +
+  EXPECT_THAT(log.Lines("ProjectMgmt"), ElementsAre("error: ERROR: Quillon.dll: EdifParserEx: " + missing +
                                        " file not found\n"));
 }
 

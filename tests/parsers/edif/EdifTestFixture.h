@@ -6,7 +6,6 @@
 #include <gtest/gtest.h>
 #include <unistd.h>
 
-#include <cstdio>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -16,38 +15,10 @@
 #include "EdifParser.h"
 #include "EdifParserEx.h"
 #include "TestHost.h"
-#include "Port/MsgCollector.h"
-#include "Port/MsgDispatcher.h"
-#include "ScopedTempDir.h"
 
 namespace edif_test {
 
-// Gathers the messages of the process for one scope.
-class MessageLog {
- public:
-  MessageLog() {
-    Port_MsgDispatcher::addMsgMan(&collector_);
-    collector_.enable();
-  }
-  ~MessageLog() { Port_MsgDispatcher::removeMsgMan(&collector_); }
-  MessageLog(const MessageLog&) = delete;
-  MessageLog& operator=(const MessageLog&) = delete;
-
-  // "<error|warning> <category>: <text>" per message.
-  std::vector<std::string> Lines() const {
-    std::vector<std::string> lines;
-    for (const Port_MsgRecord& record : collector_.records()) {
-      const char* type = record.type == Port_MsgMan::kError     ? "error"
-                         : record.type == Port_MsgMan::kWarning ? "warning"
-                                                                : "other";
-      lines.push_back(std::string(type) + " " + record.category + ": " + record.text);
-    }
-    return lines;
-  }
-
- private:
-  Port_MsgCollector collector_;
-};
+using test_host::MessageLog;
 
 // Makes a directory the current one for one scope.
 class ScopedCurrentDir {
@@ -69,31 +40,19 @@ class ScopedCurrentDir {
   std::string saved_;
 };
 
-class EdifRead : public test_host::PipelineTest {
+class EdifRead : public test_host::ParseTest {
  protected:
-  void SetUp() override { project_ = NewProject(); }
-
   // Writes `text` as `name` in the test's directory and reads it with a new parser of type P.
   template <typename P>
   std::vector<std::string> Read(std::string_view text, std::string_view name = "netlist.edf") {
-    return ReadPath<P>(Write(text, name));
+    return ReadPath<P>(Write(name, text));
   }
 
   template <typename P>
   std::vector<std::string> ReadPath(const std::string& path) {
-    file_ = AddNewFile(project_.Get(), path, "PLUGIN_Edif");
-    Vad::CParserConfigHolder* holder = HolderOf(file_.Get());
-    holder->BeginParse(nullptr);
-    P parser;
-    parser.Parse(*holder);
-    holder->EndParse();
+    Vad::CParserConfigHolder* holder = RunParser<P>(path, "PLUGIN_Edif");
     part_ = holder->GetPart().str();
     return Describe(holder->GetUnitSet());
-  }
-
-  std::string Write(std::string_view bytes, std::string_view name) {
-    std::string path = dir_.Path(name);
-    return WriteBytes(path, bytes);
   }
 
   static std::vector<std::string> Describe(Vad::IHdlDesignUnitSet* set) {
@@ -121,9 +80,6 @@ class EdifRead : public test_host::PipelineTest {
     return "type " + type.ToString();
   }
 
-  ScopedTempDir dir_;
-  Prjrep::AutoPtr<Vad::IHdlProject> project_;
-  Prjrep::AutoPtr<Vad::IHdlFile> file_;
   std::string part_;
 };
 

@@ -252,7 +252,7 @@ TEST_F(HierarchyRead, ProjectFileThatCannotBeOpenedOrReadIsAnError) {
   testing::internal::CaptureStderr();
   EXPECT_THAT(ReadProjectPath(dir_.Path("absent.hrf")), IsEmpty());
   EXPECT_EQ(Errors(), "cannot open " + dir_.Path("absent.hrf") + ": No such file or directory\n");
-  messages_.clearRecords();
+  messages_.Clear();
   ReadProjectPath(kUnreadable);
   EXPECT_EQ(Errors(), std::string(kUnreadable) + " could not be read to its end\n");
   testing::internal::GetCapturedStderr();

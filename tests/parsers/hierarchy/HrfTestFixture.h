@@ -6,7 +6,6 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include <cstdio>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -14,45 +13,28 @@
 #include "CHdlElement.h"
 #include "CParserConfigHolder.h"
 #include "TestHost.h"
-#include "Port/MsgCollector.h"
-#include "Port/MsgDispatcher.h"
-#include "ScopedTempDir.h"
 #include "qhParser.h"
 
 namespace hrf_test {
 
-class HierarchyRead : public test_host::PipelineTest {
+class HierarchyRead : public test_host::ParseTest {
  protected:
-  void SetUp() override {
-    project_ = NewProject();
-    Port_MsgDispatcher::addMsgMan(&messages_);
-  }
-  void TearDown() override { Port_MsgDispatcher::removeMsgMan(&messages_); }
-
   // The texts of the errors issued, one after another.
   std::string Errors() const {
     std::string texts;
-    for (const Port_MsgRecord& record : messages_.records()) {
-      if (record.type == Port_MsgMan::kError) texts += record.text;
-    }
+    for (const std::string& text : messages_.Texts(Port_MsgMan::kError)) texts += text;
     return texts;
   }
 
   // Reads `text` as a hierarchy file of the project (plug-in "PLUGIN_Hrf").
   std::vector<std::string> ReadProjectFile(std::string_view text) { return ReadProjectPath(Write(text)); }
-
-  std::vector<std::string> ReadProjectPath(const std::string& path) {
-    file_ = AddNewFile(project_.Get(), path, "PLUGIN_Hrf");
-    HolderOf(file_.Get())->Parse(nullptr);
-    return Describe(FileObject(file_.Get())->GetUnitSet());
-  }
+  std::vector<std::string> ReadProjectPath(const std::string& path) { return Describe(ParseAs(path, "PLUGIN_Hrf")); }
 
   // Reads `text` with the grammar, as the converter parsers do, into a file's holder with its
   // default type slots. `result` gets qhParser's result.
   std::vector<std::string> ReadConverterOutput(std::string_view text, int& result) {
     return ReadConverterPath(Write(text), result);
   }
-
   std::vector<std::string> ReadConverterPath(const std::string& path, int& result) {
     file_ = AddNewFile(project_.Get(), path, "PLUGIN_Hrf");
     Vad::CParserConfigHolder* holder = HolderOf(file_.Get());
@@ -64,8 +46,7 @@ class HierarchyRead : public test_host::PipelineTest {
 
   // A new file in the test's directory holding exactly these bytes.
   std::string Write(std::string_view bytes) {
-    std::string path = dir_.Path("design" + std::to_string(++fileCount_) + ".hrf");
-    return WriteBytes(path, bytes);
+    return ParseTest::Write("design" + std::to_string(++fileCount_) + ".hrf", bytes);
   }
 
   static std::vector<std::string> Describe(Vad::IHdlDesignUnitSet* set) {
@@ -87,11 +68,8 @@ class HierarchyRead : public test_host::PipelineTest {
     return NameOfType(type, kKinds);
   }
 
-  ScopedTempDir dir_;
-  Prjrep::AutoPtr<Vad::IHdlProject> project_;
-  Prjrep::AutoPtr<Vad::IHdlFile> file_;
   int fileCount_ = 0;
-  Port_MsgCollector messages_;
+  test_host::MessageLog messages_;
 };
 
 }  // namespace hrf_test

@@ -19,7 +19,6 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::Not;
-using verilog_test::HostManager;
 using verilog_test::VerilogProject;
 
 namespace {
@@ -193,13 +192,13 @@ TEST_F(VerilogParse, BadInputGivesACapturedMessageAndKeepsWhatWasRecognised) {
 }
 
 TEST_F(VerilogParse, HostManagersHearTheFilesOwnCompilerMessagesOnceWithFileAndLine) {
-  HostManager listening(/*enabled=*/true), silent(/*enabled=*/false);
+  test_host::MessageLog listening(/*enabled=*/true), silent(/*enabled=*/false);
   const std::string path = Write("noisy.v", "module noisy; `no_such_macro endmodule\nstray words;\n");
   auto noisy = AddVerilog(path, 1);
 
   EXPECT_THAT(ParseAlone(noisy.Get()), HasSubstr(CompilerText(Text::kUndefinedMacro, "no_such_macro")));
   EXPECT_THAT(Describe(noisy.Get()), ElementsAre("|Module||noisy line 1 module"));
-  const std::vector<Port_MsgRecord>& heard = listening.collector().records();
+  const std::vector<Port_MsgRecord>& heard = listening.Collector().records();
   ASSERT_FALSE(heard.empty());
   EXPECT_EQ(heard[0].type, Port_MsgMan::kError);
   EXPECT_EQ(heard[0].text, path + ":1: " + CompilerText(Text::kUndefinedMacro, "no_such_macro") + "\n");
@@ -208,15 +207,16 @@ TEST_F(VerilogParse, HostManagersHearTheFilesOwnCompilerMessagesOnceWithFileAndL
     EXPECT_EQ(record.sourceFile, path);
     EXPECT_GT(record.line, 0);
   }
-  EXPECT_THAT(silent.collector().records(), IsEmpty());
-  ASSERT_TRUE(listening.IsRegistered() && silent.IsRegistered());
-  EXPECT_TRUE(listening.collector().isEnabled());
-  EXPECT_FALSE(silent.collector().isEnabled());
+  EXPECT_THAT(silent.Collector().records(), IsEmpty());
+  ASSERT_TRUE(Port_MsgDispatcher::isRegistered(&listening.Collector()) &&
+              Port_MsgDispatcher::isRegistered(&silent.Collector()));
+  EXPECT_TRUE(listening.Collector().isEnabled());
+  EXPECT_FALSE(silent.Collector().isEnabled());
 
   // Parsed again, the file's messages are heard again, once.
   const std::size_t once = heard.size();
   ParseAlone(noisy.Get());
-  EXPECT_EQ(listening.collector().records().size(), 2 * once);
+  EXPECT_EQ(listening.Collector().records().size(), 2 * once);
 }
 
 }  // namespace

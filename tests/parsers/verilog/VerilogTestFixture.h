@@ -15,10 +15,7 @@
 #include "CHdlElement.h"
 #include "TestHost.h"
 #include "Port/Env.h"
-#include "Port/MsgCollector.h"
-#include "Port/MsgDispatcher.h"
 #include "ScopedEnv.h"
-#include "ScopedTempDir.h"
 #include "VerilogArguments.h"
 #include "VerilogParser.h"
 
@@ -26,16 +23,8 @@ namespace verilog_test {
 
 inline constexpr const char* kVerilogPlugin = "PLUGIN_Verilog";
 
-class VerilogProject : public test_host::PipelineTest {
+class VerilogProject : public test_host::ParseTest {
  protected:
-  void SetUp() override { project_ = NewProject(); }
-
-  // A file of the test's directory holding exactly these bytes; answers its full path.
-  std::string Write(std::string_view name, std::string_view bytes) const {
-    const std::string path = dir_.Path(name);
-    return WriteBytes(path, bytes);
-  }
-
   Prjrep::AutoPtr<Vad::IHdlFile> AddVerilog(const std::string& path, std::uint64_t orderKey, bool v3 = true) {
     auto file = AddNewFile(project_.Get(), path, kVerilogPlugin);
     EXPECT_EQ(file->setOrderKey(orderKey), CitI::kOk);
@@ -78,23 +67,9 @@ class VerilogProject : public test_host::PipelineTest {
   // "<store key> line <n> <kind>", then "parent <store key>" and "flag" (a module's port flag)
   // as they apply; in the order of the file's unit set.
   static std::vector<std::string> Describe(Vad::IHdlFile* file) {
-    std::vector<std::string> descriptions;
-    for (CitI::IInterface* unit : UnitsOf(FileObject(file)->GetUnitSet())) {
-      descriptions.push_back(Describe(unit));
-    }
-    return descriptions;
+    return DescribeUnits(FileObject(file)->GetUnitSet(),
+                         [](CitI::IInterface* unit) { return DescribeRecord(unit, KindOf); });
   }
-
-  static std::string Describe(CitI::IInterface* unit) {
-    auto* element = Prjrep::ImplementationCast<Vad::CHdlElement>(unit);
-    if (!element) return "<not a record>";
-    std::string text = element->GetKey().str() + " line " + std::to_string(element->GetLine()) + " " +
-                       KindOf(element->GetDesignUnitTypeId());
-    if (element->GetParent()) text += " parent " + element->GetParent()->GetKey().str();
-    if (element->GetUnitFlag()) text += " flag";
-    return text;
-  }
-
   static std::string KindOf(const Port::XUID& type) {
     if (type == Vad::VerilogTypeIds::Module()) return "module";
     if (type == Vad::VerilogTypeIds::ModuleInstance()) return "instance";
@@ -102,27 +77,6 @@ class VerilogProject : public test_host::PipelineTest {
   }
 
   std::string Dir() const { return dir_.path() + "/"; }
-
-  ScopedTempDir dir_;
-  Prjrep::AutoPtr<Vad::IHdlProject> project_;
-};
-
-// A message manager of the host, registered for one scope in the state given.
-class HostManager {
- public:
-  explicit HostManager(bool enabled) {
-    Port_MsgDispatcher::addMsgMan(&collector_);
-    enabled ? collector_.enable() : collector_.disable();
-  }
-  ~HostManager() { Port_MsgDispatcher::removeMsgMan(&collector_); }
-  HostManager(const HostManager&) = delete;
-  HostManager& operator=(const HostManager&) = delete;
-
-  const Port_MsgCollector& collector() const { return collector_; }
-  bool IsRegistered() const { return Port_MsgDispatcher::isRegistered(&collector_); }
-
- private:
-  Port_MsgCollector collector_;
 };
 
 }  // namespace verilog_test

@@ -20,6 +20,9 @@ using vhdl_test::VhdlParse;
 
 namespace {
 
+const std::string kTopRtl = " parent |Architecture||rtl|top||";
+const std::string kMixed = " parent |Architecture||RTL|Mixed_Case||";
+
 std::string FileNotFound(const std::string& path, const char* reason) {
   Port::StringBase text;
   if (reason) {
@@ -54,94 +57,147 @@ TEST_F(VhdlParse, RecordsEveryUnitOfAMultiUnitDesignWithLinesParentsAndContext) 
           "||Use|work|counter_pkg|all| line 22 use"));
 }
 
-TEST_F(VhdlParse, LibraryClauseRecordsEveryNameButOnlyWithABlankAfterTheKeyword) {
-  EXPECT_THAT(Parse("library ieee, lumen_lib;\n"
-                    "library\n"
-                    "  broken;\n"
-                    "library\twork;\n"),
-              ElementsAre("||Library|ieee| line 1 library", "||Library|lumen_lib| line 1 library",
-                          "||Library|work| line 4 library"));
-}
-
-TEST_F(VhdlParse, UseClauseWaitsForTheNextUnitUnlessItFollowsAUnitHeader) {
-  EXPECT_THAT(Parse("use ieee.std_logic_1164.all;\n"
-                    "entity a is end;\n"
-                    "architecture rtl of a is\n"
-                    "  use work.helpers.all;\n"
-                    "begin\n"
-                    "  use work.late;\n"
-                    "end;\n"
-                    "entity b is end;\n"),
-              ElementsAre("|Architecture||rtl|a|| line 3 architecture uses [||Use|work|helpers|all|]",
-                          "|Entity||a line 2 entity uses [||Use|ieee|std_logic_1164|all|]",
-                          "|Entity||b line 8 entity uses [||Use|work|late||]",
-                          "||Use|ieee|std_logic_1164|all| line 1 use", "||Use|work|helpers|all| line 4 use",
-                          "||Use|work|late|| line 6 use"));
-}
-
-TEST_F(VhdlParse, SelectedNamesKeepTheirPartsAndSpellAllInLowerCase) {
-  EXPECT_THAT(Parse("use lib.pkg.item;\n"
-                    "use work.ALL;\n"
-                    "use Vendor_Lib.Cells.All;\n"
-                    "package p is end;\n"),
-              ElementsAre("|PackageDecl||p| line 4 package uses [||Use|lib|pkg|item| ||Use|work|all|| "
-                          "||Use|Vendor_Lib|Cells|all|]",
-                          "||Use|Vendor_Lib|Cells|all| line 3 use", "||Use|lib|pkg|item| line 1 use",
-                          "||Use|work|all|| line 2 use"));
-}
-
-TEST_F(VhdlParse, InstancesAreRecordedByHowTheyNameWhatTheyInstantiate) {
-  const std::string kArch = " parent |Architecture||rtl|top||";
-  EXPECT_THAT(Parse("u0 : adder port map (a => b);\n"
-                    "entity top is end;\n"
-                    "architecture rtl of top is\n"
-                    "begin\n"
-                    "  u1 : adder port map (a => b);\n"
-                    "  u2 : component adder generic map (W => 4) port map (a => b);\n"
-                    "  u3 : entity work.adder port map (a => b);\n"
-                    "  u4 : entity work.adder(fast) port map (a => b);\n"
-                    "  \\u5\\ : \\odd_cell\\ port map (a => b);\n"
-                    "end;\n"),
-              // Extended identifiers keep their backslashes: they never match a basic identifier.
-              ElementsAre("|Architecture||rtl|top|| line 3 architecture uses []",
-                          "|ComponentInstantiation||top|rtl|\\u5\\|\\odd_cell\\| line 9 instance" + kArch,
-                          "|ComponentInstantiation||top|rtl|u1|adder| line 5 instance" + kArch,
-                          "|ComponentInstantiation||top|rtl|u2|adder| line 6 instance" + kArch,
-                          "|EntityInstantiation||top|rtl|u3|work.adder|| line 7 instance" + kArch,
-                          "|EntityInstantiation||top|rtl|u4|work.adder||fast line 8 instance" + kArch,
-                          "|Entity||top line 2 entity uses []"));
-}
-
-TEST_F(VhdlParse, KeywordsMatchInAnyCaseAndNamesMayStartWithDigitsOrAKeyword) {
-  const std::string kArch = " parent |Architecture||RTL|Mixed_Case||";
-  EXPECT_THAT(
-      Parse("ENTITY \\Mixed_Case\\ IS END;\n"
-            "Architecture RTL Of Mixed_Case Is\n"
-            "BEGIN\n"
-            "  2nd_stage : Adder PORT MAP (a => b);\n"
-            "  beginning : endpoint Port Map (a => b);\n"
-            "End;\n"),
-      ElementsAre("|Architecture||RTL|Mixed_Case|| line 2 architecture uses []",
-                  "|ComponentInstantiation||Mixed_Case|RTL|2nd_stage|Adder| line 4 instance" + kArch,
-                  "|ComponentInstantiation||Mixed_Case|RTL|beginning|endpoint| line 5 instance" + kArch,
-                  "|Entity||\\Mixed_Case\\ line 1 entity uses []"));
-}
-
-TEST_F(VhdlParse, EntityPortFlagFollowsItsPortClause) {
-  EXPECT_THAT(
-      Parse("entity with_ports is\n"
-            "  port (a : in bit);\n"
-            "end;\n"
-            "entity with_generics is\n"
-            "  generic (N : natural := 1);\n"
-            "  port (a : in bit);\n"
-            "end;\n"
-            "entity no_ports is\n"
-            "end;\n"
-            "entity empty_ports is port ( ); end;\n"),
-      ElementsAre("|Entity||empty_ports line 10 entity uses []", "|Entity||no_ports line 9 entity uses []",
-                  "|Entity||with_generics line 5 entity flag uses []",
-                  "|Entity||with_ports line 2 entity flag uses []"));
+TEST_F(VhdlParse, ClausesAndInstancesAreRecordedWithTheirLinesParentsAndUses) {
+  ExpectParses({
+      {"LibraryClauseRecordsEveryNameButOnlyWithABlankAfterTheKeyword",
+       "library ieee, lumen_lib;\n"
+       "library\n"
+       "  broken;\n"
+       "library\twork;\n",
+       {"||Library|ieee| line 1 library", "||Library|lumen_lib| line 1 library",
+        "||Library|work| line 4 library"}},
+      {"UseClauseWaitsForTheNextUnitUnlessItFollowsAUnitHeader",
+       "use ieee.std_logic_1164.all;\n"
+       "entity a is end;\n"
+       "architecture rtl of a is\n"
+       "  use work.helpers.all;\n"
+       "begin\n"
+       "  use work.late;\n"
+       "end;\n"
+       "entity b is end;\n",
+       {"|Architecture||rtl|a|| line 3 architecture uses [||Use|work|helpers|all|]",
+        "|Entity||a line 2 entity uses [||Use|ieee|std_logic_1164|all|]",
+        "|Entity||b line 8 entity uses [||Use|work|late||]", "||Use|ieee|std_logic_1164|all| line 1 use",
+        "||Use|work|helpers|all| line 4 use", "||Use|work|late|| line 6 use"}},
+      {"SelectedNamesKeepTheirPartsAndSpellAllInLowerCase",
+       "use lib.pkg.item;\n"
+       "use work.ALL;\n"
+       "use Vendor_Lib.Cells.All;\n"
+       "package p is end;\n",
+       {"|PackageDecl||p| line 4 package uses [||Use|lib|pkg|item| ||Use|work|all|| "
+        "||Use|Vendor_Lib|Cells|all|]",
+        "||Use|Vendor_Lib|Cells|all| line 3 use", "||Use|lib|pkg|item| line 1 use",
+        "||Use|work|all|| line 2 use"}},
+      // Extended identifiers keep their backslashes: they never match a basic identifier.
+      {"InstancesAreRecordedByHowTheyNameWhatTheyInstantiate",
+       "u0 : adder port map (a => b);\n"
+       "entity top is end;\n"
+       "architecture rtl of top is\n"
+       "begin\n"
+       "  u1 : adder port map (a => b);\n"
+       "  u2 : component adder generic map (W => 4) port map (a => b);\n"
+       "  u3 : entity work.adder port map (a => b);\n"
+       "  u4 : entity work.adder(fast) port map (a => b);\n"
+       "  \\u5\\ : \\odd_cell\\ port map (a => b);\n"
+       "end;\n",
+       {"|Architecture||rtl|top|| line 3 architecture uses []",
+        "|ComponentInstantiation||top|rtl|\\u5\\|\\odd_cell\\| line 9 instance" + kTopRtl,
+        "|ComponentInstantiation||top|rtl|u1|adder| line 5 instance" + kTopRtl,
+        "|ComponentInstantiation||top|rtl|u2|adder| line 6 instance" + kTopRtl,
+        "|EntityInstantiation||top|rtl|u3|work.adder|| line 7 instance" + kTopRtl,
+        "|EntityInstantiation||top|rtl|u4|work.adder||fast line 8 instance" + kTopRtl,
+        "|Entity||top line 2 entity uses []"}},
+      {"KeywordsMatchInAnyCaseAndNamesMayStartWithDigitsOrAKeyword",
+       "ENTITY \\Mixed_Case\\ IS END;\n"
+       "Architecture RTL Of Mixed_Case Is\n"
+       "BEGIN\n"
+       "  2nd_stage : Adder PORT MAP (a => b);\n"
+       "  beginning : endpoint Port Map (a => b);\n"
+       "End;\n",
+       {"|Architecture||RTL|Mixed_Case|| line 2 architecture uses []",
+        "|ComponentInstantiation||Mixed_Case|RTL|2nd_stage|Adder| line 4 instance" + kMixed,
+        "|ComponentInstantiation||Mixed_Case|RTL|beginning|endpoint| line 5 instance" + kMixed,
+        "|Entity||\\Mixed_Case\\ line 1 entity uses []"}},
+      {"EntityPortFlagFollowsItsPortClause",
+       "entity with_ports is\n"
+       "  port (a : in bit);\n"
+       "end;\n"
+       "entity with_generics is\n"
+       "  generic (N : natural := 1);\n"
+       "  port (a : in bit);\n"
+       "end;\n"
+       "entity no_ports is\n"
+       "end;\n"
+       "entity empty_ports is port ( ); end;\n",
+       {"|Entity||empty_ports line 10 entity uses []", "|Entity||no_ports line 9 entity uses []",
+        "|Entity||with_generics line 5 entity flag uses []",
+        "|Entity||with_ports line 2 entity flag uses []"}},
+      {"ConfigurationForAllInstancesBindsTheComponentForTheRestOfTheUnit",
+       "entity top is end;\n"
+       "architecture rtl of top is\n"
+       "  for all : fifo use entity work.fast_fifo;\n"
+       "  for others : ram use entity work.big_ram;\n"
+       "  for u9 : rom use entity work.rom_impl;\n"
+       "  for all : reg use entity work.reg_impl(rtl);\n"
+       "  for all : cfg use configuration work.cfg_a;\n"
+       "begin\n"
+       "  u1 : fifo port map (a => b);\n"
+       "  u2 : ram port map (a => b);\n"
+       "  u3 : rom port map (a => b);\n"
+       "  u4 : reg port map (a => b);\n"
+       "  u5 : cfg port map (a => b);\n"
+       "end;\n"
+       "architecture other of top is\n"
+       "begin\n"
+       "  u6 : fifo port map (a => b);\n"
+       "end;\n",
+       {"|Architecture||other|top|| line 15 architecture uses []",
+        "|Architecture||rtl|top|| line 2 architecture uses []",
+        "|ComponentInstantiation||top|other|u6|fifo| line 17 instance parent "
+        "|Architecture||other|top||",
+        "|ComponentInstantiation||top|rtl|u2|ram| line 10 instance parent |Architecture||rtl|top||",
+        "|ComponentInstantiation||top|rtl|u3|rom| line 11 instance parent |Architecture||rtl|top||",
+        "|ComponentInstantiation||top|rtl|u4|reg| line 12 instance parent |Architecture||rtl|top||",
+        "|ComponentInstantiation||top|rtl|u5|cfg| line 13 instance parent |Architecture||rtl|top||",
+        "|EntityInstantiation||top|rtl|u1|work.fast_fifo|| line 9 instance parent "
+        "|Architecture||rtl|top||",
+        "|Entity||top line 1 entity uses []"}},
+      {"InstancesInsideGenerateStatementsAreMarkedUntilTheMatchingEnd",
+       "entity top is end;\n"
+       "architecture rtl of top is\n"
+       "begin\n"
+       "  before_gen : cell port map (a => b);\n"
+       "  g1 : for i in 0 to 3 generate\n"
+       "    in_gen : cell port map (a => b);\n"
+       "    g2 : if i > 0 generate\n"
+       "      nested : entity work.cell port map (a => b);\n"
+       "    end generate g2;\n"
+       "    still_in : cell port map (a => b);\n"
+       "  end generate;\n"
+       "  after_gen : cell port map (a => b);\n"
+       "end;\n",
+       {"|Architecture||rtl|top|| line 2 architecture uses []",
+        "|ComponentInstantiation||top|rtl|after_gen|cell| line 12 instance" + kTopRtl,
+        "|ComponentInstantiation||top|rtl|before_gen|cell| line 4 instance" + kTopRtl,
+        "|ComponentInstantiation||top|rtl|in_gen|cell| line 6 instance" + kTopRtl + " generate",
+        "|ComponentInstantiation||top|rtl|still_in|cell| line 10 instance" + kTopRtl + " generate",
+        "|EntityInstantiation||top|rtl|nested|work.cell|| line 8 instance" + kTopRtl + " generate",
+        "|Entity||top line 1 entity uses []"}},
+      {"UnterminatedStringEndsAtItsLine",
+       "x <= \"open ; entity s1 is end;\n"
+       "entity s2 is end;\n",
+       {"|Entity||s1 line 1 entity uses []", "|Entity||s2 line 2 entity uses []"}},
+      {"CrlfLineEndsCountEachLineOnce",
+       "library ieee;\r\n"
+       "entity a is\r\n"
+       "end;\r\n"
+       "-- comment\r\n"
+       "architecture rtl of a is\r\n"
+       "begin\r\n"
+       "end;\r\n",
+       {"|Architecture||rtl|a|| line 5 architecture uses []", "|Entity||a line 3 entity uses []",
+        "||Library|ieee| line 1 library"}},
+  });
 }
 
 const char kPragmaSource[] =
@@ -206,64 +262,6 @@ TEST_F(VhdlParse, TranslateOnCountsInTheFirstCommentOfALineAndPragmaWordsMayRunO
                           "|Entity||kept_d line 13 entity uses []"));
 }
 
-TEST_F(VhdlParse, ConfigurationForAllInstancesBindsTheComponentForTheRestOfTheUnit) {
-  EXPECT_THAT(
-      Parse("entity top is end;\n"
-            "architecture rtl of top is\n"
-            "  for all : fifo use entity work.fast_fifo;\n"
-            "  for others : ram use entity work.big_ram;\n"
-            "  for u9 : rom use entity work.rom_impl;\n"
-            "  for all : reg use entity work.reg_impl(rtl);\n"
-            "  for all : cfg use configuration work.cfg_a;\n"
-            "begin\n"
-            "  u1 : fifo port map (a => b);\n"
-            "  u2 : ram port map (a => b);\n"
-            "  u3 : rom port map (a => b);\n"
-            "  u4 : reg port map (a => b);\n"
-            "  u5 : cfg port map (a => b);\n"
-            "end;\n"
-            "architecture other of top is\n"
-            "begin\n"
-            "  u6 : fifo port map (a => b);\n"
-            "end;\n"),
-      ElementsAre("|Architecture||other|top|| line 15 architecture uses []",
-                  "|Architecture||rtl|top|| line 2 architecture uses []",
-                  "|ComponentInstantiation||top|other|u6|fifo| line 17 instance parent "
-                  "|Architecture||other|top||",
-                  "|ComponentInstantiation||top|rtl|u2|ram| line 10 instance parent |Architecture||rtl|top||",
-                  "|ComponentInstantiation||top|rtl|u3|rom| line 11 instance parent |Architecture||rtl|top||",
-                  "|ComponentInstantiation||top|rtl|u4|reg| line 12 instance parent |Architecture||rtl|top||",
-                  "|ComponentInstantiation||top|rtl|u5|cfg| line 13 instance parent |Architecture||rtl|top||",
-                  "|EntityInstantiation||top|rtl|u1|work.fast_fifo|| line 9 instance parent "
-                  "|Architecture||rtl|top||",
-                  "|Entity||top line 1 entity uses []"));
-}
-
-TEST_F(VhdlParse, InstancesInsideGenerateStatementsAreMarkedUntilTheMatchingEnd) {
-  const std::string kArch = " parent |Architecture||rtl|top||";
-  EXPECT_THAT(
-      Parse("entity top is end;\n"
-            "architecture rtl of top is\n"
-            "begin\n"
-            "  before_gen : cell port map (a => b);\n"
-            "  g1 : for i in 0 to 3 generate\n"
-            "    in_gen : cell port map (a => b);\n"
-            "    g2 : if i > 0 generate\n"
-            "      nested : entity work.cell port map (a => b);\n"
-            "    end generate g2;\n"
-            "    still_in : cell port map (a => b);\n"
-            "  end generate;\n"
-            "  after_gen : cell port map (a => b);\n"
-            "end;\n"),
-      ElementsAre("|Architecture||rtl|top|| line 2 architecture uses []",
-                  "|ComponentInstantiation||top|rtl|after_gen|cell| line 12 instance" + kArch,
-                  "|ComponentInstantiation||top|rtl|before_gen|cell| line 4 instance" + kArch,
-                  "|ComponentInstantiation||top|rtl|in_gen|cell| line 6 instance" + kArch + " generate",
-                  "|ComponentInstantiation||top|rtl|still_in|cell| line 10 instance" + kArch + " generate",
-                  "|EntityInstantiation||top|rtl|nested|work.cell|| line 8 instance" + kArch + " generate",
-                  "|Entity||top line 1 entity uses []"));
-}
-
 TEST_F(VhdlParse, MalformedConstructsAreSkippedSilentlyAndParsingGoesOn) {
   testing::internal::CaptureStdout();
   EXPECT_THAT(Parse("entity ( is end;\n"
@@ -310,12 +308,6 @@ TEST_F(VhdlParse, BinaryBytesAreScannedWithoutHarm) {
   EXPECT_THAT(units, Contains(testing::StartsWith("|Entity||after line ")));
 }
 
-TEST_F(VhdlParse, UnterminatedStringEndsAtItsLine) {
-  EXPECT_THAT(Parse("x <= \"open ; entity s1 is end;\n"
-                    "entity s2 is end;\n"),
-              ElementsAre("|Entity||s1 line 1 entity uses []", "|Entity||s2 line 2 entity uses []"));
-}
-
 TEST_F(VhdlParse, HundredThousandNestedParenthesesAreSkipped) {
   std::string source = "entity before is end;\n" + std::string(100'000, '(') + std::string(100'000, ')') +
                        "\nentity after is end;\n";
@@ -327,18 +319,6 @@ TEST_F(VhdlParse, EmptyFileRecordsNothingAndSaysNothing) {
   testing::internal::CaptureStdout();
   EXPECT_THAT(Parse(""), IsEmpty());
   EXPECT_EQ(testing::internal::GetCapturedStdout(), "");
-}
-
-TEST_F(VhdlParse, CrlfLineEndsCountEachLineOnce) {
-  EXPECT_THAT(Parse("library ieee;\r\n"
-                    "entity a is\r\n"
-                    "end;\r\n"
-                    "-- comment\r\n"
-                    "architecture rtl of a is\r\n"
-                    "begin\r\n"
-                    "end;\r\n"),
-              ElementsAre("|Architecture||rtl|a|| line 5 architecture uses []",
-                          "|Entity||a line 3 entity uses []", "||Library|ieee| line 1 library"));
 }
 
 TEST_F(VhdlParse, FileRemovedBeforeItsParseIsReportedWithTheSystemsReason) {

@@ -5,43 +5,43 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include <cstdio>
 #include <string>
 #include <string_view>
 #include <vector>
 
-#include "CHdlElement.h"
 #include "CVhdlDU.h"
 #include "TestHost.h"
-#include "ScopedTempDir.h"
 #include "VhdlParser.h"
 
 namespace vhdl_test {
 
-class VhdlParse : public test_host::PipelineTest {
+using Strings = std::vector<std::string>;
+
+class VhdlParse : public test_host::ParseTest {
  protected:
-  void SetUp() override { project_ = NewProject(); }
-
   // Writes `source` into a new file of the project, parses it and describes its units.
-  std::vector<std::string> Parse(std::string_view source) { return ParseFile(Write(source)); }
-
-  std::vector<std::string> ParseFile(const std::string& path) {
-    file_ = AddNewFile(project_.Get(), path, "PLUGIN_Vhdl");
-    HolderOf(file_.Get())->Parse(nullptr);
-    return Describe(FileObject(file_.Get())->GetUnitSet());
+  Strings Parse(std::string_view source) { return ParseFile(Write(source)); }
+  Strings ParseFile(const std::string& path) { return Describe(ParseAs(path, "PLUGIN_Vhdl")); }
+  static Strings Describe(Vad::IHdlDesignUnitSet* set) {
+    return DescribeUnits(set, [](CitI::IInterface* unit) { return Describe(unit); });
+  }
+  std::string Write(std::string_view bytes) {
+    return ParseTest::Write("unit" + std::to_string(++fileCount_) + ".vhd", bytes);
   }
 
-  // A new file in the test's directory holding exactly these bytes.
-  std::string Write(std::string_view bytes) {
-    std::string path = dir_.Path("unit" + std::to_string(++fileCount_) + ".vhd");
-    return WriteBytes(path, bytes);
+  struct Case {
+    const char* behaviour;
+    std::string source;
+    Strings units;
+  };
+  void ExpectParses(std::initializer_list<Case> cases) {
+    for (const Case& c : cases) {
+      SCOPED_TRACE(c.behaviour);
+      EXPECT_EQ(Parse(c.source), c.units);
+    }
   }
 
   void SetParseTarget(std::string_view target) { SetProperty(project_.Get(), "PROP_Parse_Target", target); }
-
-  static std::vector<std::string> Describe(Vad::IHdlDesignUnitSet* set) {
-    return DescribeUnits(set, [](CitI::IInterface* unit) { return Describe(unit); });
-  }
 
   // "<store key> line <n> <kind>", then as they apply: "parent <store key>", "generate" (inside a
   // generate statement), "flag" (the unit flag; an entity's port flag) and "uses [<store keys>]"
@@ -76,9 +76,6 @@ class VhdlParse : public test_host::PipelineTest {
     return "type " + type.ToString();
   }
 
-  ScopedTempDir dir_;
-  Prjrep::AutoPtr<Vad::IHdlProject> project_;
-  Prjrep::AutoPtr<Vad::IHdlFile> file_;
   int fileCount_ = 0;
 };
 
