@@ -3,11 +3,11 @@
 
 #include <filesystem>
 #include <fstream>
-#include <optional>
 #include <string>
 
 #include "Port/Env.h"
 #include "ScopedEnv.h"
+#include "ScopedTempDir.h"
 
 namespace fs = std::filesystem;
 
@@ -17,30 +17,21 @@ namespace {
 class DataDir : public testing::Test {
  protected:
   void SetUp() override {
-    std::string pattern = (fs::temp_directory_path() / "quillon-env-XXXXXX").string();
-    ASSERT_NE(mkdtemp(pattern.data()), nullptr);
-    root_ = pattern;
-    fs::create_directories(root_ / "data" / "kestrel");
-    fs::create_directories(root_ / "other");
-    std::ofstream(root_ / "data" / "kestrel" / "arch.vho") << "-- cells\n";
-    std::ofstream(root_ / "other" / "cells.vho") << "-- cells\n";
-    dataDir_.emplace("QUILLON_DATA_DIR", (root_ / "data").c_str());
-  }
-  void TearDown() override {
-    dataDir_.reset();
-    std::error_code ignored;
-    fs::remove_all(root_, ignored);
+    fs::create_directories(Under("data/kestrel"));
+    fs::create_directories(Under("other"));
+    std::ofstream(Under("data/kestrel/arch.vho")) << "-- cells\n";
+    std::ofstream(Under("other/cells.vho")) << "-- cells\n";
   }
 
-  std::string Under(const char* relative) const { return (root_ / relative).string(); }
+  std::string Under(const char* relative) const { return root_.Path(relative); }
 
-  fs::path root_;
-  std::optional<ScopedEnv> dataDir_;
+  ScopedTempDir root_;
+  ScopedEnv dataDir_{"QUILLON_DATA_DIR", Under("data").c_str()};
 };
 
 }  // namespace
 
-TEST(PortEnv, GetEnvSeesSetAndUnset) {
+TEST(PortEnv, GetEnvSeesSetAndUnsetAndBadNamesAreRefused) {
   ScopedEnv clean("QUILLON_TEST_VARIABLE", nullptr);
   EXPECT_EQ(Port_Env::GetEnv("QUILLON_TEST_VARIABLE"), nullptr);
   ASSERT_TRUE(Port_Env::SetEnv("QUILLON_TEST_VARIABLE", "a value"));
@@ -50,9 +41,6 @@ TEST(PortEnv, GetEnvSeesSetAndUnset) {
   ASSERT_TRUE(Port_Env::UnsetEnv("QUILLON_TEST_VARIABLE"));
   EXPECT_EQ(Port_Env::GetEnv("QUILLON_TEST_VARIABLE"), nullptr);
   EXPECT_TRUE(Port_Env::UnsetEnv("QUILLON_TEST_VARIABLE"));
-}
-
-TEST(PortEnv, RejectsBadNames) {
   EXPECT_EQ(Port_Env::GetEnv(nullptr), nullptr);
   EXPECT_EQ(Port_Env::GetEnv(""), nullptr);
   EXPECT_FALSE(Port_Env::SetEnv(nullptr, "x"));
@@ -81,7 +69,7 @@ TEST_F(DataDir, FindsAnExistingDataFile) {
   EXPECT_TRUE(Port_Env::GetDataFileName("kestrel/arch.vho", 1, nullptr));
 }
 
-TEST_F(DataDir, MissingFileFailsOnlyWhenItMustExist) {
+TEST_F(DataDir, MissingFileOrNameFailsOnlyWhenItMustExist) {
   Port::StringBase path;
   EXPECT_FALSE(Port_Env::GetDataFileName("falcon/arch.vho", 1, &path));
   EXPECT_EQ(path, Under("data/falcon/arch.vho"));
@@ -90,8 +78,8 @@ TEST_F(DataDir, MissingFileFailsOnlyWhenItMustExist) {
   EXPECT_EQ(path, Under("data/falcon/arch.vho"));
 }
 
-TEST_F(DataDir, ExpandsEnvironmentReferences) {
-  ScopedEnv cells("QUILLON_TEST_CELLS", root_.c_str());
+TEST_F(DataDir, ExpandsEnvironmentReferencesAndRefusesEmptyNames) {
+  ScopedEnv cells("QUILLON_TEST_CELLS", root_.path().c_str());
   ScopedEnv unset("QUILLON_TEST_UNSET", nullptr);
   Port::StringBase path;
   EXPECT_TRUE(Port_Env::GetDataFileName("$QUILLON_TEST_CELLS/other/cells.vho", 1, &path));
@@ -101,10 +89,8 @@ TEST_F(DataDir, ExpandsEnvironmentReferences) {
   EXPECT_FALSE(Port_Env::GetDataFileName("$QUILLON_TEST_UNSET/other/cells.vho", 1, &path));
   EXPECT_EQ(path, Under("data/$QUILLON_TEST_UNSET/other/cells.vho"));
   EXPECT_FALSE(Port_Env::GetDataFileName("${QUILLON_TEST_CELLS/other/cells.vho", 1, &path));
-}
 
-TEST_F(DataDir, EmptyNameGivesNoPath) {
-  Port::StringBase path("stale");
+  path = "stale";
   EXPECT_FALSE(Port_Env::GetDataFileName("", 0, &path));
   EXPECT_TRUE(path.IsEmpty());
   path = "stale";

@@ -38,38 +38,24 @@ TEST(FileName, MakeCanonicalUsesTheCurrentDirectoryForRelativeBases) {
 
 TEST(FileName, PartsOfAPath) {
   using Port::FileName;
-  EXPECT_EQ(FileName::GetBase("C:/x/top.v"), "top");
-  EXPECT_EQ(FileName::GetExtension("C:/x/top.v"), "v");
-  EXPECT_EQ(FileName::GetHead("C:/x/top.v"), "C:/x/");
-  EXPECT_EQ(FileName::GetTail("C:/x/top.v"), "top.v");
-
-  EXPECT_EQ(FileName::GetBase("lib/archive.tar.gz"), "archive.tar");
-  EXPECT_EQ(FileName::GetExtension("lib/archive.tar.gz"), "gz");
-
-  EXPECT_EQ(FileName::GetBase("/top.vhd"), "top");
-  EXPECT_EQ(FileName::GetHead("/top.vhd"), "/");
-  EXPECT_EQ(FileName::GetTail("dir/"), "");
-}
-
-TEST(FileName, NamesWithoutExtension) {
-  using Port::FileName;
-  EXPECT_EQ(FileName::GetBase("Makefile"), "Makefile");
-  EXPECT_EQ(FileName::GetExtension("Makefile"), "");
-  EXPECT_EQ(FileName::GetHead("Makefile"), "");
-  EXPECT_EQ(FileName::GetTail("Makefile"), "Makefile");
-
-  EXPECT_EQ(FileName::GetExtension("rel.d/Makefile"), "");
-  EXPECT_EQ(FileName::GetBase("rel.d/Makefile"), "Makefile");
-
-  EXPECT_EQ(FileName::GetBase("proj/.settings"), ".settings");
-  EXPECT_EQ(FileName::GetExtension("proj/.settings"), "");
-  EXPECT_EQ(FileName::GetBase(".cfg.v"), ".cfg");
-  EXPECT_EQ(FileName::GetExtension(".cfg.v"), "v");
-
-  EXPECT_EQ(FileName::GetBase("top."), "top.");
-  EXPECT_EQ(FileName::GetExtension("top."), "");
-  EXPECT_EQ(FileName::GetBase(".."), "..");
-  EXPECT_EQ(FileName::GetExtension(""), "");
+  const std::pair<const char*, const char*> cases[] = {
+      {"C:/x/top.v", "C:/x/|top.v|top|v"},
+      {"lib/archive.tar.gz", "lib/|archive.tar.gz|archive.tar|gz"},
+      {"/top.vhd", "/|top.vhd|top|vhd"},
+      {"dir/", "dir/|||"},
+      {"Makefile", "|Makefile|Makefile|"},
+      {"rel.d/Makefile", "rel.d/|Makefile|Makefile|"},
+      {"proj/.settings", "proj/|.settings|.settings|"},
+      {".cfg.v", "|.cfg.v|.cfg|v"},
+      {"top.", "|top.|top.|"},
+      {"..", "|..|..|"},
+      {"", "|||"}};
+  for (const auto& [path, expected] : cases) {
+    EXPECT_EQ(FileName::GetHead(path) + "|" + FileName::GetTail(path).view() + "|" + FileName::GetBase(path).view() +
+                  "|" + FileName::GetExtension(path).view(),
+              expected)
+        << path;
+  }
 }
 
 TEST(FileName, JoinAndIsAbsolute) {

@@ -9,7 +9,9 @@
 
 #include "Port/File.h"
 #include "Port/StringBase.h"
+#include "ScopedEnv.h"
 #include "ScopedTempDir.h"
+#include "ScopedWorkingDirectory.h"
 
 namespace {
 
@@ -30,30 +32,6 @@ std::vector<std::string> ReadLines(const std::string& path) {
   EXPECT_FALSE(stream->error());
   return lines;
 }
-
-// Restores the current directory and TMPDIR that a test changes.
-class RestoreProcessState {
- public:
-  RestoreProcessState() {
-    EXPECT_TRUE(Port::File::getcwd(&cwd_));
-    const char* tmpdir = std::getenv("TMPDIR");
-    hadTmpdir_ = tmpdir != nullptr;
-    if (tmpdir) tmpdir_ = tmpdir;
-  }
-  ~RestoreProcessState() {
-    Port::File::chdir(cwd_.c_str());
-    if (hadTmpdir_) {
-      ::setenv("TMPDIR", tmpdir_.c_str(), 1);
-    } else {
-      ::unsetenv("TMPDIR");
-    }
-  }
-
- private:
-  Port::StringBase cwd_;
-  std::string tmpdir_;
-  bool hadTmpdir_ = false;
-};
 
 }  // namespace
 
@@ -167,9 +145,8 @@ TEST(File, RemoveROfALinkRemovesTheLinkOnly) {
 }
 
 TEST(File, MkdtempCreatesDistinctPrivateDirectoriesUnderTmpdir) {
-  RestoreProcessState restore;
   ScopedTempDir root;
-  ::setenv("TMPDIR", (root.path() + "/").c_str(), 1);
+  ScopedEnv tmpdir("TMPDIR", (root.path() + "/").c_str());
 
   Port::StringBase first;
   Port::StringBase second;
@@ -185,7 +162,7 @@ TEST(File, MkdtempCreatesDistinctPrivateDirectoriesUnderTmpdir) {
     EXPECT_EQ(info.st_mode & 0777, 0700u);
   }
 
-  ::setenv("TMPDIR", root.Path("no-such-dir").c_str(), 1);
+  Port_Env::SetEnv("TMPDIR", root.Path("no-such-dir").c_str());
   Port::StringBase fallback;
   ASSERT_TRUE(Port::File::mkdtemp(&fallback));
   EXPECT_TRUE(fallback.StartsWith("/tmp/")) << fallback.str();
@@ -224,8 +201,8 @@ TEST(File, GetdatetimeGivesTheModificationTimeOfExistingFilesOnly) {
 }
 
 TEST(File, MkdirChdirAndGetcwdWorkTogether) {
-  RestoreProcessState restore;
   ScopedTempDir dir;
+  ScopedWorkingDirectory returns(dir.path());
   std::string sub = dir.Path("sub");
   EXPECT_TRUE(Port::File::mkdir(sub.c_str()));
   EXPECT_FALSE(Port::File::mkdir(sub.c_str()));

@@ -4,7 +4,7 @@
 
 #include "Port/Memory.h"
 
-TEST(Memory, ZeroSizedBlocksAreDistinctAndReleasable) {
+TEST(Memory, ZeroSizedBlocksAreDistinctAndReallocKeepsContentAndNeverFreesOnZero) {
   void* first = cvn_malloc(0);
   void* second = cvn_malloc(0);
   ASSERT_NE(first, nullptr);
@@ -13,9 +13,7 @@ TEST(Memory, ZeroSizedBlocksAreDistinctAndReleasable) {
   cvn_free(first);
   cvn_free(second);
   cvn_free(nullptr);
-}
 
-TEST(Memory, ReallocKeepsContentAndNeverFreesOnZero) {
   auto* block = static_cast<char*>(cvn_realloc(nullptr, 16));
   ASSERT_NE(block, nullptr);
   std::memcpy(block, "0123456789abcdef", 16);

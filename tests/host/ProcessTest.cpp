@@ -11,6 +11,7 @@
 #include "Port/SafeCount.h"
 #include "Port/StringBase.h"
 #include "ScopedTempDir.h"
+#include "ScopedWorkingDirectory.h"
 
 namespace {
 
@@ -94,9 +95,7 @@ TEST_F(ProcessTest, ShellCharactersInArgumentsRunNoCommand) {
 
 TEST_F(ProcessTest, ProgramNameWithShellCharactersRunsOnlyThatProgram) {
   // A file name cannot hold '/', so the markers are relative: run from the test directory.
-  Port::StringBase savedCwd;
-  ASSERT_TRUE(Port::File::getcwd(&savedCwd));
-  ASSERT_TRUE(Port::File::chdir(dir_.path().c_str()));
+  ScopedWorkingDirectory inDir(dir_.path());
   std::string program =
       Script("conv;touch markerA;$(touch markerB)`touch markerC`|touch markerD", "echo ran");
   SinkLog log;
@@ -105,19 +104,15 @@ TEST_F(ProcessTest, ProgramNameWithShellCharactersRunsOnlyThatProgram) {
   for (const char* marker : {"markerA", "markerB", "markerC", "markerD"}) {
     EXPECT_FALSE(Port::File::exist(dir_.Path(marker).c_str())) << marker;
   }
-  EXPECT_TRUE(Port::File::chdir(savedCwd.c_str()));
 }
 
-TEST_F(ProcessTest, ExitStatusIsReturned) {
+TEST_F(ProcessTest, ExitStatusOrSignalBasePlusSignalIsReturned) {
   std::string program = Quoted(Script("status", "echo \"exiting $1\"; exit $1"));
   for (int expected : {0, 1, 3}) {
     SinkLog log;
     EXPECT_EQ(Run(program + " " + std::to_string(expected), &log), expected);
     EXPECT_EQ(log.text, "exiting " + std::to_string(expected) + "\n");
   }
-}
-
-TEST_F(ProcessTest, ChildKilledByASignalGivesSignalBasePlusSignal) {
   SinkLog log;
   EXPECT_EQ(Run(Quoted(Script("killed", "kill -TERM $$")), &log), Port::Process::kSignalBase + SIGTERM);
 }
@@ -138,13 +133,17 @@ TEST_F(ProcessTest, MissingProgramIsReportedOnceInOneLine) {
   EXPECT_EQ(std::count(notExecutable.text.begin(), notExecutable.text.end(), '\n'), 1);
 }
 
-TEST_F(ProcessTest, EmptyCommandLineRunsNothing) {
+TEST_F(ProcessTest, EmptyCommandLineRunsNothingAndUncapturedRunGivesTheSinkOnlyDone) {
   for (const char* empty : {"", "  \t "}) {
     SinkLog log;
     EXPECT_EQ(Run(empty, &log), Port::Process::kNotStarted);
     EXPECT_EQ(log.text, Port::Process::kEmptyCommand);
   }
   EXPECT_NE(Port::Process::RunNoWindow(Port::StringBase(""), true, true), 0);
+  SinkLog log;
+  EXPECT_EQ(Run(Quoted(Script("quiet", "exit 0")), &log, false), 0);
+  EXPECT_EQ(log.outputs, 0);
+  EXPECT_EQ(Port::Process::RunNoWindow(Port::StringBase(Quoted(Script("failing", "exit 1"))), true, true), 1);
 }
 
 TEST_F(ProcessTest, LargeMergedOutputIsGatheredCompletely) {
@@ -168,11 +167,4 @@ TEST_F(ProcessTest, ChildGetsNoInputAndNoInheritedDescriptors) {
   EXPECT_EQ(log.text, "checked\n");
   ::close(ends[0]);
   ::close(ends[1]);
-}
-
-TEST_F(ProcessTest, UncapturedRunGivesTheSinkNothingButDone) {
-  SinkLog log;
-  EXPECT_EQ(Run(Quoted(Script("quiet", "exit 0")), &log, false), 0);
-  EXPECT_EQ(log.outputs, 0);
-  EXPECT_EQ(Port::Process::RunNoWindow(Port::StringBase(Quoted(Script("failing", "exit 1"))), true, true), 1);
 }

@@ -47,7 +47,7 @@ TEST(StringBase, FormatMayReadItsOwnText) {
   EXPECT_EQ(text, "abc-abc+abc-abc");
 }
 
-TEST(StringBase, ExactCompareIsByteOrder) {
+TEST(StringBase, ComparesUnsignedBytesExactlyOrFoldingAsciiLetters) {
   StringBase abc("ABC");
   EXPECT_LT(abc.Compare("abc"), 0);
   EXPECT_GT(StringBase("abc").Compare("ABC"), 0);
@@ -57,9 +57,6 @@ TEST(StringBase, ExactCompareIsByteOrder) {
   // Bytes above 127 sort after ASCII, as unsigned bytes.
   EXPECT_GT(StringBase("\xE9").Compare("z"), 0);
   EXPECT_LT(StringBase("z").Compare("\xE9"), 0);
-}
-
-TEST(StringBase, NoCaseCompareFoldsAsciiLettersOnly) {
   EXPECT_EQ(StringBase("ABC").Compare("abc", Port::kCompareNoCase), 0);
   EXPECT_TRUE(StringBase("Std_Logic").Equals("STD_LOGIC", 1));
   EXPECT_LT(StringBase("abc").Compare("ABD", 1), 0);
@@ -70,9 +67,6 @@ TEST(StringBase, NoCaseCompareFoldsAsciiLettersOnly) {
   EXPECT_NE(StringBase("\xC9").Compare("\xE9", 1), 0);
   EXPECT_GT(StringBase("\xE9").Compare("Z", 1), 0);
   EXPECT_EQ(StringBase("\xE9X").Compare("\xE9x", 1), 0);
-}
-
-TEST(StringBase, StricmpIgnoresCaseAndOrdersNullFirst) {
   EXPECT_EQ(Port::stricmp("Entity", "ENTITY"), 0);
   EXPECT_LT(Port::stricmp("entity", "ENTITYX"), 0);
   EXPECT_GT(Port::stricmp("b", "A"), 0);
@@ -92,22 +86,16 @@ TEST(StringBase, StrdupCopiesIntoSharedHeap) {
   cvn_free(copy);
 }
 
-TEST(StringBase, SplitsUseClauseNameAtDots) {
+TEST(StringBase, SplitKeepsOrDropsEmptyPiecesAndQuotedPiecesWhole) {
   EXPECT_EQ(SplitTexts("ieee.std_logic_1164.all", ".", false, "\"", "\""),
             (Pieces{"ieee", "std_logic_1164", "all"}));
   EXPECT_EQ(SplitTexts("work", ".", false, "\"", "\""), (Pieces{"work"}));
-}
-
-TEST(StringBase, SplitKeepsOrDropsEmptyPieces) {
   EXPECT_EQ(SplitTexts(".a..b.", ".", true), (Pieces{"", "a", "", "b", ""}));
   EXPECT_EQ(SplitTexts(".a..b.", ".", false), (Pieces{"a", "b"}));
   EXPECT_EQ(SplitTexts("", ".", true), (Pieces{""}));
   EXPECT_EQ(SplitTexts("", ".", false), (Pieces{}));
   EXPECT_EQ(SplitTexts("a b,c", " ,", false), (Pieces{"a", "b", "c"}));
   EXPECT_EQ(SplitTexts("a.b", "", false), (Pieces{"a.b"}));
-}
-
-TEST(StringBase, SplitKeepsQuotedPiecesWhole) {
   EXPECT_EQ(SplitTexts("lib.\"odd.name\".all", ".", false, "\"", "\""),
             (Pieces{"lib", "\"odd.name\"", "all"}));
   // After the closing quote the piece runs on to the next delimiter.
@@ -137,16 +125,13 @@ TEST(StringBase, TokenRangesSkipDelimiterRuns) {
   EXPECT_FALSE(StringBase(",,,").GetNextTokenRange(fromZero, ",", start, length));
 }
 
-TEST(StringBase, TrimsRemoveOnlyTheGivenCharacters) {
+TEST(StringBase, TrimTruncateMidRightAndCaseChanges) {
   EXPECT_EQ(StringBase(" \t a b \r\n").Trim(), "a b");
   EXPECT_EQ(StringBase("  a  ").TrimLeft(), "a  ");
   EXPECT_EQ(StringBase("  a  ").TrimRight(), "  a");
   EXPECT_EQ(StringBase("xxaxx").Trim("x"), "a");
   EXPECT_EQ(StringBase(" \n\t").Trim(), "");
   EXPECT_EQ(StringBase("text\n\n").TrimRight("\n"), "text");
-}
-
-TEST(StringBase, TruncateMidAndRightClampToTheText) {
   EXPECT_EQ(StringBase("abcdef").Truncate(3), "abc");
   EXPECT_EQ(StringBase("abc").Truncate(10), "abc");
   EXPECT_EQ(StringBase("abc").Truncate(0), "");
@@ -160,9 +145,6 @@ TEST(StringBase, TruncateMidAndRightClampToTheText) {
   EXPECT_EQ(text.Right(2), "ef");
   EXPECT_EQ(text.Right(100), "abcdef");
   EXPECT_EQ(text.Right(0), "");
-}
-
-TEST(StringBase, CaseChangesTouchAsciiLettersOnly) {
   EXPECT_EQ(StringBase("Std_Logic_1164\xC9").MakeLower(), "std_logic_1164\xC9");
   EXPECT_EQ(StringBase("Std_Logic_1164\xE9").MakeUpper(), "STD_LOGIC_1164\xE9");
 }
@@ -182,7 +164,7 @@ TEST(StringBase, ReplaceAllCountsNonOverlappingOccurrences) {
   EXPECT_TRUE(growing.IsEmpty());
 }
 
-TEST(StringBase, RegexMatchReportsRangeFromOffset) {
+TEST(StringBase, RegexMatchReportsRangeFromOffsetWithAnchorsAtTheStart) {
   StringBase text("u1: cpu port map (a => b); u2: alu");
   std::size_t start = 0, length = 0;
   ASSERT_TRUE(text.GetRangeOfMatch("u[0-9]+:", start, length));
@@ -192,15 +174,16 @@ TEST(StringBase, RegexMatchReportsRangeFromOffset) {
   EXPECT_EQ(length, 3u);
   ASSERT_TRUE(text.GetRangeOfMatch("(port|generic) +map", start, length));
   EXPECT_EQ(text.Mid(start, length), "port map");
-}
 
-TEST(StringBase, RegexAnchorsStayAtTheStartOfTheText) {
-  StringBase text("abab");
-  std::size_t start = 0, length = 0;
-  EXPECT_TRUE(text.GetRangeOfMatch("^ab", start, length, 0));
-  EXPECT_FALSE(text.GetRangeOfMatch("^ab", start, length, 2));
-  ASSERT_TRUE(text.GetRangeOfMatch("ab$", start, length, 1));
+  // Anchors stay at the start of the text; an empty match is found at its end.
+  StringBase abab("abab");
+  EXPECT_TRUE(abab.GetRangeOfMatch("^ab", start, length, 0));
+  EXPECT_FALSE(abab.GetRangeOfMatch("^ab", start, length, 2));
+  ASSERT_TRUE(abab.GetRangeOfMatch("ab$", start, length, 1));
   EXPECT_EQ(start, 2u);
+  ASSERT_TRUE(abab.GetRangeOfMatch("x*", start, length, 4));
+  EXPECT_EQ(start, 4u);
+  EXPECT_EQ(length, 0u);
 }
 
 TEST(StringBase, RegexFailsWithoutMatchOrWithBadInput) {
@@ -219,14 +202,6 @@ TEST(StringBase, RegexFailsWithoutMatchOrWithBadInput) {
   ASSERT_TRUE(text.GetRangeOfMatch("cpu", start, length));
   EXPECT_EQ(start, 7u);
   EXPECT_EQ(length, 3u);
-}
-
-TEST(StringBase, RegexMatchesAnEmptyTextAtItsEnd) {
-  StringBase text("abc");
-  std::size_t start = 0, length = 1;
-  ASSERT_TRUE(text.GetRangeOfMatch("x*", start, length, 3));
-  EXPECT_EQ(start, 3u);
-  EXPECT_EQ(length, 0u);
 }
 
 TEST(StringBase, ManyDistinctPatternsStayCorrect) {

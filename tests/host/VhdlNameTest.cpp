@@ -7,7 +7,7 @@
 
 namespace {
 
-TEST(VhdlName, BasicIdentifiersFoldAndExtendedOnesDoNot) {
+TEST(VhdlName, BasicIdentifiersFoldExtendedOnesDoNotAndTheOrderAgrees) {
   EXPECT_TRUE(Host::SameVhdlName("Entity|My_Pkg", "entity|MY_PKG"));
   EXPECT_FALSE(Host::SameVhdlName("Entity|My_Pkg", "Entity|My_Pkg2"));
   EXPECT_TRUE(Host::SameVhdlName("Architecture|\\Top\\|RTL", "architecture|\\Top\\|rtl"));
@@ -16,9 +16,6 @@ TEST(VhdlName, BasicIdentifiersFoldAndExtendedOnesDoNot) {
   EXPECT_FALSE(Host::SameVhdlName("\\a\\\\b\\", "\\a\\\\B\\"));
   EXPECT_TRUE(Host::SameVhdlName("\\a\\\\b\\.X", "\\a\\\\b\\.x"));
   EXPECT_FALSE(Host::SameVhdlName("\\x\\", "x"));
-}
-
-TEST(VhdlName, OrderKeepsOneEntryPerName) {
   std::map<std::string, int, Host::VhdlNameLess> names;
   names["Sub"] = 1;
   names["SUB"] = 2;

@@ -6,47 +6,42 @@
 
 using namespace plumbing_test;
 
-TEST(EventSender, RemovingDuringSendEmptiesTheEntryAndTheWalkGoesOn) {
-  Receiver first, second, third;  // outlive the sender, which detaches them when destroyed
-  Prjrep::CEventSenderHelper sender(nullptr);
-  EXPECT_EQ(sender.AddReceiver(&first), CitI::kOk);
-  EXPECT_EQ(sender.AddReceiver(&second), CitI::kOk);
-  EXPECT_EQ(sender.AddReceiver(&third), CitI::kOk);
-  EXPECT_EQ(sender.AddReceiver(&first), CitI::kOk);  // listed once
-  EXPECT_EQ(first.attaches, 1);
-  EXPECT_EQ(sender.AddReceiver(nullptr), CitI::kFail);
-
-  first.onEvent = [&] { sender.RemoveReceiver(&second); };
-  Receiver event;
-  EXPECT_TRUE(sender.SendEvent(&event));
-  EXPECT_EQ(first.events, 1);
-  EXPECT_EQ(second.events, 0);
-  EXPECT_EQ(third.events, 1);
-  EXPECT_EQ(second.detaches, 1);
-  EXPECT_FALSE(sender.SendEvent(nullptr));
-  EXPECT_EQ(third.events, 1);
-
-  EXPECT_EQ(sender.EntryCount(), 3u);
-  sender.Compact();
-  EXPECT_EQ(sender.EntryCount(), 2u);
-  EXPECT_EQ(sender.RemoveReceiver(&second), CitI::kOk);  // not listed: still 1
-  EXPECT_EQ(second.detaches, 1);
-
-  // A new receiver reuses an empty entry.
-  sender.RemoveReceiver(&first);
-  sender.AddReceiver(&second);
-  EXPECT_EQ(sender.EntryCount(), 2u);
-}
-
-TEST(EventSender, DestructionDetachesEveryReceiver) {
-  Receiver a, b;
+TEST(EventSender, RemovingDuringSendEmptiesTheEntryAndDestructionDetachesTheRest) {
+  Receiver first, second, third;
   {
     Prjrep::CEventSenderHelper sender(nullptr);
-    sender.AddReceiver(&a);
-    sender.AddReceiver(&b);
+    EXPECT_EQ(sender.AddReceiver(&first), CitI::kOk);
+    EXPECT_EQ(sender.AddReceiver(&second), CitI::kOk);
+    EXPECT_EQ(sender.AddReceiver(&third), CitI::kOk);
+    EXPECT_EQ(sender.AddReceiver(&first), CitI::kOk);  // listed once
+    EXPECT_EQ(first.attaches, 1);
+    EXPECT_EQ(sender.AddReceiver(nullptr), CitI::kFail);
+
+    first.onEvent = [&] { sender.RemoveReceiver(&second); };
+    Receiver event;
+    EXPECT_TRUE(sender.SendEvent(&event));
+    EXPECT_EQ(first.events, 1);
+    EXPECT_EQ(second.events, 0);
+    EXPECT_EQ(third.events, 1);
+    EXPECT_EQ(second.detaches, 1);
+    EXPECT_FALSE(sender.SendEvent(nullptr));
+    EXPECT_EQ(third.events, 1);
+
+    EXPECT_EQ(sender.EntryCount(), 3u);
+    sender.Compact();
+    EXPECT_EQ(sender.EntryCount(), 2u);
+    EXPECT_EQ(sender.RemoveReceiver(&second), CitI::kOk);  // not listed: still 1
+    EXPECT_EQ(second.detaches, 1);
+
+    // A new receiver reuses an empty entry.
+    sender.RemoveReceiver(&first);
+    sender.AddReceiver(&second);
+    EXPECT_EQ(sender.EntryCount(), 2u);
   }
-  EXPECT_EQ(a.detaches, 1);
-  EXPECT_EQ(b.detaches, 1);
+  // The destroyed sender detaches the receivers it still lists, once each.
+  EXPECT_EQ(first.detaches, 1);
+  EXPECT_EQ(second.detaches, 2);
+  EXPECT_EQ(third.detaches, 1);
 }
 
 TEST(Timestamp, OrdersBySecondsThenMicroseconds) {

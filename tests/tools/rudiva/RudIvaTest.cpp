@@ -14,6 +14,7 @@
 #include "Port/StringBase.h"
 #include "ScopedEnv.h"
 #include "ScopedTempDir.h"
+#include "ScopedWorkingDirectory.h"
 #include "rudiva/RudIva.h"
 #include "rudiva/RudIva_LibraryMap.h"
 
@@ -22,18 +23,6 @@ namespace fs = std::filesystem;
 namespace {
 
 using Names = std::vector<std::string>;
-
-class ScopedWorkingDirectory {
- public:
-  explicit ScopedWorkingDirectory(const std::string& dir) {
-    EXPECT_TRUE(Port::File::getcwd(&saved_));
-    EXPECT_TRUE(Port::File::chdir(dir.c_str()));
-  }
-  ~ScopedWorkingDirectory() { Port::File::chdir(saved_.c_str()); }
-
- private:
-  Port::StringBase saved_;
-};
 
 void WriteFile(const std::string& path, const std::string& text) {
   std::error_code ignored;
@@ -197,7 +186,7 @@ TEST_F(LibraryLoader, KeepsALoadedUnitUntilItsSourcesChange) {
   EXPECT_EQ(ComponentsOf(Load("work")), Names{"FIRST"});
 }
 
-TEST(LibraryMap, ExpandsSetVariablesAndRejectsUnsetOnes) {
+TEST(LibraryMap, ExpandsSetVariablesAndFindsOnlyWholeMappingLines) {
   ScopedEnv root("QUILLON_TEST_ROOT", "/opt/q");
   ScopedEnv unset("QUILLON_TEST_UNSET", nullptr);
   using RudIva_LibraryMap::ExpandVariables;
@@ -207,9 +196,6 @@ TEST(LibraryMap, ExpandsSetVariablesAndRejectsUnsetOnes) {
   EXPECT_EQ(ExpandVariables("$QUILLON_TEST_UNSET/vhdl"), std::nullopt);
   EXPECT_EQ(ExpandVariables("${QUILLON_TEST_ROOT/vhdl"), std::nullopt);
   EXPECT_EQ(ExpandVariables("${}/vhdl"), std::nullopt);
-}
-
-TEST(LibraryMap, FindsNothingInEmptyOrUnrelatedText) {
   std::istringstream empty("");
   EXPECT_EQ(RudIva_LibraryMap::FindDirectory(empty, "basecell"), std::nullopt);
   std::istringstream unrelated("basecell\nbasecells=x\n=y\nbase cell=z");

@@ -66,7 +66,8 @@ class GeneratedText : public std::streambuf {
 
 }  // namespace
 
-TEST(PackageReader, ListsComponentsWithOrWithoutIsAndClosingName) {
+TEST(PackageReader, ListsTheComponentsOfThePackageOnly) {
+  // With or without "is" and closing name.
   EXPECT_EQ(ComponentsOf(R"(
     library ieee; use ieee.std_logic_1164.all;
     package vcomponents is
@@ -79,9 +80,7 @@ TEST(PackageReader, ListsComponentsWithOrWithoutIsAndClosingName) {
     end package vcomponents;
     component AFTER_THE_END port (x : in bit); end component;)"),
             (Components{"QL_AND2", "QL_OR2", "Ql_Dff", "\\odd cell\\", "bare"}));
-}
-
-TEST(PackageReader, IgnoresComponentsInCommentsStringsAndCharacterLiterals) {
+  // Not in comments, strings or character literals.
   EXPECT_EQ(ComponentsOf(R"(
     package vcomponents is
       -- component IN_LINE_COMMENT port (x : in bit); end component;
@@ -96,9 +95,7 @@ TEST(PackageReader, IgnoresComponentsInCommentsStringsAndCharacterLiterals) {
       end component;
     end;)"),
             (Components{"REAL_ONE"}));
-}
-
-TEST(PackageReader, FollowsNestedParenthesesTicksAndQualifiedExpressions) {
+  // Nested parentheses, ticks and qualified expressions.
   EXPECT_EQ(ComponentsOf(R"(
     package vcomponents is
       component QL_WIDE
@@ -109,9 +106,7 @@ TEST(PackageReader, FollowsNestedParenthesesTicksAndQualifiedExpressions) {
       component QL_AFTER port (Q : out bit := bit'('1')); end component;
     end package;)"),
             (Components{"QL_WIDE", "QL_AFTER"}));
-}
-
-TEST(PackageReader, SkipsOtherDeclarationsThatHoldSemicolonsOrEnds) {
+  // Other declarations holding semicolons or ends.
   EXPECT_EQ(ComponentsOf(R"(
     package vcomponents is
       type pair is record low : integer; high : integer; end record pair;
@@ -150,7 +145,7 @@ TEST(PackageReader, FindsTheDeclarationByNameIgnoringCase) {
   EXPECT_FALSE(Declares("-- package vcomponents is", "vcomponents"));
 }
 
-TEST(PackageReader, KeepsGoingAfterBrokenDeclarations) {
+TEST(PackageReader, KeepsGoingAfterBrokenDeclarationsAndBinaryJunk) {
   EXPECT_EQ(ComponentsOf(R"(
     package vcomponents is
       component NEVER_CLOSED port (x : in bit);
@@ -166,9 +161,7 @@ TEST(PackageReader, KeepsGoingAfterBrokenDeclarations) {
       << "an unterminated string runs to the end of its line";
   EXPECT_EQ(ComponentsOf("package vcomponents is component A port(x:in bit);end component; /* end;"),
             Components{"A"});
-}
-
-TEST(PackageReader, SurvivesBinaryJunk) {
+  // Binary junk.
   std::string junk;
   for (int i = 0; i < 5000; ++i) junk.push_back(static_cast<char>((i * 7919) % 256));
   junk += std::string("\0\0(\\\"'", 6);

@@ -12,16 +12,15 @@
 namespace {
 
 using Hx_Vci::VerilogMessageLog;
-using vci_test::MessageCapture;
 using vci_test::Module;
 using vci_test::NamesOf;
 using vci_test::Project;
 using Strings = std::vector<std::string>;
 namespace Text = Hx_Vci::VerilogMessageText;
 
-TEST(VerilogBadInput, FileIncludingItselfStopsAtTheDepthLimit) {
-  MessageCapture messages;
-  Project project;
+using VerilogBadInput = vci_test::CompilerTest;
+
+TEST_F(VerilogBadInput, FileIncludingItselfStopsAtTheDepthLimit) {
   const std::string path = project.Write("self.v",
                                          "module a; endmodule\n"
                                          "`include \"self.v\"\n"
@@ -36,9 +35,7 @@ TEST(VerilogBadInput, FileIncludingItselfStopsAtTheDepthLimit) {
   EXPECT_EQ(modules.back().line, 3);
 }
 
-TEST(VerilogBadInput, IncludeFanOutStopsAtTheInclusionCountWithAMessage) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogBadInput, IncludeFanOutStopsAtTheInclusionCountWithAMessage) {
   // Each header includes the next twice: 2^20 inclusions without a count.
   constexpr int kLevels = 20;
   for (int level = 0; level < kLevels; ++level) {
@@ -56,75 +53,56 @@ TEST(VerilogBadInput, IncludeFanOutStopsAtTheInclusionCountWithAMessage) {
   EXPECT_EQ(messages.records().size(), 1u) << messages.All();
 }
 
-TEST(VerilogBadInput, MutuallyRecursiveMacrosStopWithAMessage) {
-  MessageCapture messages;
-  Project project;
-  std::vector<Module> modules = project.CompileText("recursive.v",
-                                                    "`define A `B\n"
-                                                    "`define B `A x\n"
-                                                    "module m1; endmodule\n"
-                                                    "`A\n"
-                                                    "`define SELF(x) `SELF(x)\n"
-                                                    "`SELF(1)\n"
-                                                    "module m2; endmodule\n");
-  EXPECT_EQ(NamesOf(modules), (Strings{"m1", "m2"}));
-  EXPECT_EQ(modules[1].line, 7);
-  EXPECT_EQ(messages.With(VerilogMessageLog::Format(Text::kMacroTooDeep, "A", 64)).size(), 1u)
-      << messages.All();
-  EXPECT_EQ(messages.With(VerilogMessageLog::Format(Text::kMacroTooDeep, "SELF", 64)).size(), 1u)
-      << messages.All();
+TEST_F(VerilogBadInput, BrokenSourcesAreReportedAtTheirLinesAndTheModulesAroundThemKept) {
+  ExpectCompiled(R"(`define A `B
+`define B `A x
+module m1; endmodule
+`A
+`define SELF(x) `SELF(x)
+`SELF(1)
+module m2; endmodule
+)",
+                 {"m1:3()", "m2:7()"},
+                 {"4: macro `A nests deeper than 64 expansions (recursive definition?); expansion stopped",
+                  "6: macro `SELF nests deeper than 64 expansions (recursive definition?); expansion stopped"});
+  ExpectCompiled("module a; endmodule\n/* never closed\nmodule b; endmodule\n", {"a:1()"},
+                 {"2: comment not terminated; the rest of the file is ignored"});
+  ExpectCompiled(R"(module a; initial $display("oops);
+endmodule
+module b; endmodule
+module c; initial $display("at the end)",
+                 {"a:1()", "b:3()", "c:4()"},
+                 {"1: string not terminated before the end of the line",
+                  "4: string not terminated at the end of the file", "4: module c has no endmodule"});
+  ExpectCompiled(R"(`endif
+module a; endmodule
+`ifdef NOT_DEFINED
+`else
+module b; endmodule
+`else
+module c; endmodule
+)",
+                 {"a:2()", "b:5()"},
+                 {"1: `endif without `ifdef or `ifndef", "6: `else after `else",
+                  "7: `ifdef or `ifndef of line 3 is not closed by `endif in this file"});
+  // Missing endmodule and stray tokens.
+  ExpectCompiled(R"(stray tokens here;
+module a (x;
+  cell u1 (.x(x);
+module b; cell u2 (); end endmodule
+endmodule
+module c; cell u3 ()
+  cell u4 ();
+endmodule
+)",
+                 {"a:2(x) cell u1:3", "b:4() cell u2:4", "c:6() cell u3:6 cell u4:7"},
+                 {"1: syntax error near \"stray\": a module was expected", "2: port list of module a is not terminated",
+                  "3: '(' without its closing ')'", "4: ',' or ';' expected after instance u1",
+                  "4: module a has no endmodule", "4: syntax error near \"end\"", "5: endmodule without module",
+                  "7: ',' or ';' expected after instance u3"});
 }
 
-TEST(VerilogBadInput, UnterminatedCommentEndsTheFileAndKeepsWhatCameBefore) {
-  MessageCapture messages;
-  Project project;
-  std::vector<Module> modules = project.CompileText("comment.v",
-                                                    "module a; endmodule\n"
-                                                    "/* never closed\n"
-                                                    "module b; endmodule\n");
-  EXPECT_EQ(NamesOf(modules), Strings{"a"});
-  std::vector<Port_MsgRecord> found = messages.With(Text::kUnterminatedComment);
-  ASSERT_EQ(found.size(), 1u) << messages.All();
-  EXPECT_EQ(found[0].line, 2);
-}
-
-TEST(VerilogBadInput, UnterminatedStringsAreClosedAtTheirLineOrFileEnd) {
-  MessageCapture messages;
-  Project project;
-  std::vector<Module> modules = project.CompileText("string.v",
-                                                    "module a; initial $display(\"oops);\n"
-                                                    "endmodule\n"
-                                                    "module b; endmodule\n"
-                                                    "module c; initial $display(\"at the end");
-  EXPECT_EQ(NamesOf(modules), (Strings{"a", "b", "c"}));
-  ASSERT_EQ(messages.With(Text::kUnterminatedString).size(), 1u) << messages.All();
-  EXPECT_EQ(messages.With(Text::kUnterminatedString)[0].line, 1);
-  EXPECT_EQ(messages.With(Text::kUnterminatedStringAtEnd).size(), 1u) << messages.All();
-}
-
-TEST(VerilogBadInput, UnbalancedConditionalsAreReported) {
-  MessageCapture messages;
-  Project project;
-  std::vector<Module> modules = project.CompileText("ifdef.v",
-                                                    "`endif\n"
-                                                    "module a; endmodule\n"
-                                                    "`ifdef NOT_DEFINED\n"
-                                                    "`else\n"
-                                                    "module b; endmodule\n"
-                                                    "`else\n"
-                                                    "module c; endmodule\n");
-  EXPECT_EQ(NamesOf(modules), (Strings{"a", "b"}));
-  EXPECT_TRUE(messages.Has(vci_test::Format(Text::kConditionalWithoutIf, "endif"))) << messages.All();
-  EXPECT_TRUE(messages.Has(vci_test::Format(Text::kConditionalAfterElse, "else"))) << messages.All();
-  std::vector<Port_MsgRecord> open =
-      messages.With(VerilogMessageLog::Format(Text::kUnterminatedConditional, 3));
-  ASSERT_EQ(open.size(), 1u) << messages.All();
-  EXPECT_EQ(open[0].line, 7);
-}
-
-TEST(VerilogBadInput, BinaryJunkGivesACappedNumberOfMessages) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogBadInput, BinaryJunkGivesACappedNumberOfMessages) {
   std::mt19937 random(7);
   std::string junk;
   for (int i = 0; i < 300000; ++i) {
@@ -138,9 +116,7 @@ TEST(VerilogBadInput, BinaryJunkGivesACappedNumberOfMessages) {
   EXPECT_EQ(messages.records().back().text, std::string(Text::kTooManyMessages) + "\n");
 }
 
-TEST(VerilogBadInput, HugeTokensAreTakenWhole) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogBadInput, HugeTokensAreTakenWhole) {
   const std::string name(4 << 20, 'n');
   std::vector<Module> modules = project.CompileText(
       "huge.v", "module " + name + "; initial $display(\"" + std::string(4 << 20, 's') + "\"); endmodule\n");
@@ -149,31 +125,7 @@ TEST(VerilogBadInput, HugeTokensAreTakenWhole) {
   EXPECT_TRUE(messages.records().empty()) << messages.All();
 }
 
-TEST(VerilogBadInput, MissingEndmoduleAndStrayTokensDoNotLoseModules) {
-  MessageCapture messages;
-  Project project;
-  std::vector<Module> modules = project.CompileText("structure.v",
-                                                    "stray tokens here;\n"
-                                                    "module a (x;\n"
-                                                    "  cell u1 (.x(x);\n"
-                                                    "module b; cell u2 (); end endmodule\n"
-                                                    "endmodule\n"
-                                                    "module c; cell u3 ()\n"
-                                                    "  cell u4 ();\n"
-                                                    "endmodule\n");
-  ASSERT_EQ(NamesOf(modules), (Strings{"a", "b", "c"})) << messages.All();
-  EXPECT_EQ(vci_test::InstanceNamesOf(modules[1]), Strings{"cell u2"});
-  EXPECT_EQ(vci_test::InstanceNamesOf(modules[2]), (Strings{"cell u3", "cell u4"}));
-  EXPECT_TRUE(messages.Has(vci_test::Format(Text::kExpectedModule, "stray"))) << messages.All();
-  EXPECT_TRUE(messages.Has(vci_test::Format(Text::kMissingEndmodule, "a"))) << messages.All();
-  EXPECT_TRUE(messages.Has(VerilogMessageLog::Format(Text::kUnbalanced, '(', ')'))) << messages.All();
-  EXPECT_TRUE(messages.Has(Text::kEndmoduleWithoutModule)) << messages.All();
-  EXPECT_TRUE(messages.Has(vci_test::Format(Text::kInstanceSeparatorExpected, "u3"))) << messages.All();
-}
-
-TEST(VerilogBadInput, DeepNestingIsCutWithoutExhaustingTheStack) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogBadInput, DeepNestingIsCutWithoutExhaustingTheStack) {
   std::string deep = "module a;\n";
   for (int i = 0; i < 20000; ++i) deep += "begin if (x) ";
   deep += "cell u_deep ();";
@@ -189,9 +141,7 @@ TEST(VerilogBadInput, DeepNestingIsCutWithoutExhaustingTheStack) {
       << messages.All();
 }
 
-TEST(VerilogBadInput, IncludeOfADirectoryCannotBeRead) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogBadInput, IncludeOfADirectoryCannotBeRead) {
   ASSERT_EQ(::mkdir(project.Path("dir.vh").c_str(), 0700), 0);
   std::vector<Module> modules = project.CompileText("inc.v",
                                                     "`include \"dir.vh\"\n"
@@ -203,9 +153,7 @@ TEST(VerilogBadInput, IncludeOfADirectoryCannotBeRead) {
   EXPECT_TRUE(messages.Has(Text::kIncludeNeedsFile)) << messages.All();
 }
 
-TEST(VerilogBadInput, RandomlyDamagedSourcesNeverBreakTheCompiler) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogBadInput, RandomlyDamagedSourcesNeverBreakTheCompiler) {
   project.Write("defs.vh", "`define W 8\n`define ADD(a, b) ((a) + (b))\n");
   const std::string original =
       "`timescale 1ns/1ps\n`include \"defs.vh\"\n"

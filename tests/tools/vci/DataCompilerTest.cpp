@@ -10,160 +10,148 @@
 namespace {
 
 using vci_test::InstanceNamesOf;
-using vci_test::MessageCapture;
 using vci_test::Module;
 using vci_test::NamesOf;
 using vci_test::Project;
 using Strings = std::vector<std::string>;
 namespace Text = Hx_Vci::VerilogMessageText;
 
-TEST(VerilogDataCompiler, ModuleNamesBuiltByMacrosKeepTheirSourceLines) {
-  MessageCapture messages;
-  Project project;
-  std::vector<Module> modules = project.CompileText("names.v",
-                                                    "`define TOP top_mod\n"
-                                                    "`define CORE(unit) unit``_core\n"
-                                                    "`define WIDTH(w, \\\n"
-                                                    "               d) [w-1:d]\n"
-                                                    "module `TOP (input `WIDTH(8,\n"
-                                                    "                         0) a);\n"
-                                                    "endmodule\n"
-                                                    "module `CORE(alu) (b);\n"
-                                                    "endmodule\n");
-  ASSERT_EQ(NamesOf(modules), (Strings{"top_mod", "alu_core"})) << messages.All();
-  EXPECT_EQ(modules[0].line, 5);
-  EXPECT_EQ(modules[1].line, 8) << "a macro call over two lines keeps the lines after it";
-  EXPECT_EQ(modules[0].lowConnections, Strings{"a"});
-  EXPECT_TRUE(messages.records().empty()) << messages.All();
-}
+using VerilogDataCompiler = vci_test::CompilerTest;
 
-TEST(VerilogDataCompiler, ModulesInFalseConditionalRegionsAreLeftOut) {
-  Project project;
-  std::vector<Module> modules = project.CompileText("cond.v",
-                                                    "`define FPGA\n"
-                                                    "`ifdef ASIC\n"
-                                                    "module asic_only; endmodule\n"
-                                                    "`elsif FPGA\n"
-                                                    "  `ifndef FPGA\n"
-                                                    "module never; endmodule\n"
-                                                    "  `else\n"
-                                                    "module fpga_only; endmodule\n"
-                                                    "  `endif\n"
-                                                    "`else\n"
-                                                    "module fallback; endmodule\n"
-                                                    "`endif\n"
-                                                    "/* `ifdef in a comment does not count\n"
-                                                    "*/ module after; endmodule\n");
-  ASSERT_EQ(NamesOf(modules), (Strings{"fpga_only", "after"}));
-  EXPECT_EQ(modules[0].line, 8);
-  EXPECT_EQ(modules[1].line, 14);
-}
-
-TEST(VerilogDataCompiler, FindsInstancesInGenerateRegionsAndBlocks) {
-  Project project;
-  std::vector<Module> modules =
-      project.CompileText("gen.v",
-                          "module top #(parameter N = 4) (input clk);\n"
-                          "  genvar i;\n"
-                          "  generate\n"
-                          "    for (i = 0; i < N; i = i + 1) begin : lanes\n"
-                          "      lane #(.ID(i)) u_lane (.clk(clk));\n"
-                          "    end\n"
-                          "    if (N > 2) begin : wide\n"
-                          "      wide_cell u_wide ();\n"
-                          "    end else if (N > 1)\n"
-                          "      mid_cell u_mid ();\n"
-                          "    else begin\n"
-                          "      narrow_cell u_narrow ();\n"
-                          "    end\n"
-                          "    case (N)\n"
-                          "      1, 2: small_cell u_small ();\n"
-                          "      default: begin : big big_cell u_big (); end\n"
-                          "    endcase\n"
-                          "  endgenerate\n"
-                          "  begin : named\n"
-                          "    named_cell u_named ();\n"
-                          "  end\n"
-                          "  always @(posedge clk) begin\n"
-                          "    if (clk) task_call(clk);\n"
-                          "    case (clk) 1'b1: begin other_call(clk); end endcase\n"
-                          "  end\n"
-                          "  after_cell u_after ();\n"
-                          "endmodule\n");
-  ASSERT_EQ(modules.size(), 1u);
-  EXPECT_EQ(InstanceNamesOf(modules[0]),
-            (Strings{"lane u_lane", "wide_cell u_wide", "mid_cell u_mid", "narrow_cell u_narrow",
-                     "small_cell u_small", "big_cell u_big", "named_cell u_named", "after_cell u_after"}));
-  EXPECT_EQ(modules[0].instances[0].line, 5);
-  EXPECT_EQ(modules[0].instances.back().line, 26);
-}
-
-TEST(VerilogDataCompiler, ReadsSeveralInstancesPerStatementArraysAndParameterOverrides) {
-  Project project;
-  std::vector<Module> modules = project.CompileText("inst.v",
-                                                    "module top;\n"
-                                                    "  cell #(.W(8), .D(2)) u1 (.a(x), .b(y)),\n"
-                                                    "                       u2 (.a(y), .b(x));\n"
-                                                    "  cell u_arr[3:0] (bus);\n"
-                                                    "  cell #(8, 4) u3 (a, b);\n"
-                                                    "  cell #8 u4 (a);\n"
-                                                    "  cell #WIDTH u5 (a), u6[1:0][2:0] (b);\n"
-                                                    "endmodule\n");
-  ASSERT_EQ(modules.size(), 1u);
-  EXPECT_EQ(InstanceNamesOf(modules[0]),
-            (Strings{"cell u1", "cell u2", "cell u_arr", "cell u3", "cell u4", "cell u5", "cell u6"}));
-  EXPECT_EQ(modules[0].instances[0].line, 2);
-  EXPECT_EQ(modules[0].instances[1].line, 3);
-}
-
-TEST(VerilogDataCompiler, EscapedIdentifiersLoseTheirBackslashAndBlank) {
-  Project project;
-  std::vector<Module> modules = project.CompileText("esc.v",
-                                                    "module \\top.mod (\\bus[0] , b);\n"
-                                                    "  \\sub$cell \\u1[0] (.a(\\bus[0] ));\n"
-                                                    "endmodule\n");
-  ASSERT_EQ(NamesOf(modules), Strings{"top.mod"});
-  EXPECT_EQ(modules[0].lowConnections, (Strings{"bus[0]", "b"}));
-  EXPECT_EQ(InstanceNamesOf(modules[0]), Strings{"sub$cell u1[0]"});
-}
-
-TEST(VerilogDataCompiler, GatesDeclarationsProcessesAndPrimitivesAreNoInstances) {
-  MessageCapture messages;
-  Project project;
-  std::vector<Module> modules =
-      project.CompileText("skip.v",
-                          "primitive mux_udp (out, a, b, s);\n"
-                          "  output out; input a, b, s;\n"
-                          "  table 0 ? 0 : 0; endtable\n"
-                          "endprimitive\n"
-                          "module top (a, b, y);\n"
-                          "  input a, b; output y;\n"
-                          "  wire [3:0] w = 4'b0;\n"
-                          "  and g1 (y, a, b);\n"
-                          "  nand (weak0, strong1) #2 g2 (y, a, b), g3 (y, b, a);\n"
-                          "  buf (y, a);\n"
-                          "  assign y = a & b;\n"
-                          "  (* keep = \"yes; module fake; endmodule\" *) cell u_attr (.a(a));\n"
-                          "  mux_udp (strong0, strong1) u_udp (y, a, b, a);\n"
-                          "  function f; input x; begin f = x; end endfunction\n"
-                          "  task t; begin $display(\"cell u_fake (a);\"); end endtask\n"
-                          "  specify (a => y) = 1; endspecify\n"
-                          "  initial begin : init reg r; r = 0; end\n"
-                          "  always @(*) y2 = a;\n"
-                          "  always @* begin y3 = b; end\n"
-                          "  my_type var_of_user_type;\n"
-                          "  last_cell u_last (a);\n"
-                          "endmodule\n");
-  ASSERT_EQ(NamesOf(modules), Strings{"top"});
-  EXPECT_EQ(InstanceNamesOf(modules[0]), (Strings{"cell u_attr", "last_cell u_last"}));
-  EXPECT_TRUE(messages.records().empty()) << messages.All();
+TEST_F(VerilogDataCompiler, FindsModulesPortsAndInstancesWithTheirSourceLines) {
+  // Names built by macros; a macro call over two lines keeps the lines after it.
+  ExpectCompiled(R"(`define TOP top_mod
+`define CORE(unit) unit``_core
+`define WIDTH(w, \
+               d) [w-1:d]
+module `TOP (input `WIDTH(8,
+                         0) a);
+endmodule
+module `CORE(alu) (b);
+endmodule
+)",
+                 {"top_mod:5(a)", "alu_core:8(b)"});
+  // False conditional regions are left out.
+  ExpectCompiled(R"(`define FPGA
+`ifdef ASIC
+module asic_only; endmodule
+`elsif FPGA
+  `ifndef FPGA
+module never; endmodule
+  `else
+module fpga_only; endmodule
+  `endif
+`else
+module fallback; endmodule
+`endif
+/* `ifdef in a comment does not count
+*/ module after; endmodule
+)",
+                 {"fpga_only:8()", "after:14()"});
+  // Instances in generate regions and blocks; calls in processes are none.
+  ExpectCompiled(R"(module top #(parameter N = 4) (input clk);
+  genvar i;
+  generate
+    for (i = 0; i < N; i = i + 1) begin : lanes
+      lane #(.ID(i)) u_lane (.clk(clk));
+    end
+    if (N > 2) begin : wide
+      wide_cell u_wide ();
+    end else if (N > 1)
+      mid_cell u_mid ();
+    else begin
+      narrow_cell u_narrow ();
+    end
+    case (N)
+      1, 2: small_cell u_small ();
+      default: begin : big big_cell u_big (); end
+    endcase
+  endgenerate
+  begin : named
+    named_cell u_named ();
+  end
+  always @(posedge clk) begin
+    if (clk) task_call(clk);
+    case (clk) 1'b1: begin other_call(clk); end endcase
+  end
+  after_cell u_after ();
+endmodule
+)",
+                 {"top:1(clk) lane u_lane:5 wide_cell u_wide:8 mid_cell u_mid:10 narrow_cell u_narrow:12 "
+                  "small_cell u_small:15 big_cell u_big:16 named_cell u_named:20 after_cell u_after:26"});
+  // Several instances per statement, arrays and parameter overrides.
+  ExpectCompiled(R"(module top;
+  cell #(.W(8), .D(2)) u1 (.a(x), .b(y)),
+                       u2 (.a(y), .b(x));
+  cell u_arr[3:0] (bus);
+  cell #(8, 4) u3 (a, b);
+  cell #8 u4 (a);
+  cell #WIDTH u5 (a), u6[1:0][2:0] (b);
+endmodule
+)",
+                 {"top:1() cell u1:2 cell u2:3 cell u_arr:4 cell u3:5 cell u4:6 cell u5:7 cell u6:7"});
+  // Escaped identifiers lose their backslash and blank.
+  ExpectCompiled(R"(module \top.mod (\bus[0] , b);
+  \sub$cell \u1[0] (.a(\bus[0] ));
+endmodule
+)",
+                 {"top.mod:1(bus[0],b) sub$cell u1[0]:2"});
+  // Gates, declarations, processes and primitives are no instances.
+  ExpectCompiled(R"(primitive mux_udp (out, a, b, s);
+  output out; input a, b, s;
+  table 0 ? 0 : 0; endtable
+endprimitive
+module top (a, b, y);
+  input a, b; output y;
+  wire [3:0] w = 4'b0;
+  and g1 (y, a, b);
+  nand (weak0, strong1) #2 g2 (y, a, b), g3 (y, b, a);
+  buf (y, a);
+  assign y = a & b;
+  (* keep = "yes; module fake; endmodule" *) cell u_attr (.a(a));
+  mux_udp (strong0, strong1) u_udp (y, a, b, a);
+  function f; input x; begin f = x; end endfunction
+  task t; begin $display("cell u_fake (a);"); end endtask
+  specify (a => y) = 1; endspecify
+  initial begin : init reg r; r = 0; end
+  always @(*) y2 = a;
+  always @* begin y3 = b; end
+  my_type var_of_user_type;
+  last_cell u_last (a);
+endmodule
+)",
+                 {"top:5(a,b,y) cell u_attr:12 last_cell u_last:21"});
+  // The low-connection names the parser flags on.
+  ExpectCompiled(R"(module ansi (input wire [3:0] a, output reg signed [7:0] q = 0,
+             inout [W-1:0] io);
+endmodule
+module plain (a, b[3:0], c);
+endmodule
+module explicit (.x(a), .y());
+endmodule
+module concat ({a, b}, c);
+endmodule
+module empty_list ();
+endmodule
+module two_empty (,);
+endmodule
+module no_list;
+endmodule
+module with_params #(parameter P = 1) (input clk);
+endmodule
+module older_names (input config, output interface);
+  assign interface = config;
+  cell u_cell (.program(config));
+endmodule
+)",
+                 {"ansi:1(a,q,io)", "plain:4(a,b,c)", "explicit:6(x,y)", "concat:8(,c)", "empty_list:10()",
+                  "two_empty:12(,)", "no_list:14()", "with_params:16(clk)",
+                  "older_names:18(config,interface) cell u_cell:20"});
 }
 
 // A primitive is known from its declaration on, in its own file or an earlier one of the compile,
 // also when the files come from the cache.
-TEST(VerilogDataCompiler, InstancesOfPrimitivesDeclaredInTheCompileAreNoModuleInstances) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogDataCompiler, InstancesOfPrimitivesDeclaredInTheCompileAreNoModuleInstances) {
   const std::string cells = project.Write("cells.v",
                                           "primitive early_udp (o, a); output o; input a;\n"
                                           "  table 0 : 1; 1 : 0; endtable\nendprimitive\n");
@@ -193,46 +181,7 @@ TEST(VerilogDataCompiler, InstancesOfPrimitivesDeclaredInTheCompileAreNoModuleIn
   EXPECT_TRUE(messages.records().empty()) << messages.All();
 }
 
-TEST(VerilogDataCompiler, PortsGiveTheLowConnectionNamesTheParserFlagsOn) {
-  Project project;
-  std::vector<Module> modules =
-      project.CompileText("ports.v",
-                          "module ansi (input wire [3:0] a, output reg signed [7:0] q = 0,\n"
-                          "             inout [W-1:0] io);\n"
-                          "endmodule\n"
-                          "module plain (a, b[3:0], c);\n"
-                          "endmodule\n"
-                          "module explicit (.x(a), .y());\n"
-                          "endmodule\n"
-                          "module concat ({a, b}, c);\n"
-                          "endmodule\n"
-                          "module empty_list ();\n"
-                          "endmodule\n"
-                          "module two_empty (,);\n"
-                          "endmodule\n"
-                          "module no_list;\n"
-                          "endmodule\n"
-                          "module with_params #(parameter P = 1) (input clk);\n"
-                          "endmodule\n"
-                          "module older_names (input config, output interface);\n"
-                          "  assign interface = config;\n"
-                          "  cell u_cell (.program(config));\n"
-                          "endmodule\n");
-  ASSERT_EQ(modules.size(), 9u);
-  EXPECT_EQ(modules[0].lowConnections, (Strings{"a", "q", "io"}));
-  EXPECT_EQ(modules[1].lowConnections, (Strings{"a", "b", "c"}));
-  EXPECT_EQ(modules[2].lowConnections, (Strings{"x", "y"}));
-  EXPECT_EQ(modules[3].lowConnections, (Strings{"", "c"}));
-  EXPECT_EQ(modules[4].lowConnections, Strings{""});
-  EXPECT_EQ(modules[5].lowConnections, (Strings{"", ""}));
-  EXPECT_TRUE(modules[6].lowConnections.empty());
-  EXPECT_EQ(modules[7].lowConnections, Strings{"clk"});
-  EXPECT_EQ(modules[8].lowConnections, (Strings{"config", "interface"}));
-  EXPECT_EQ(InstanceNamesOf(modules[8]), Strings{"cell u_cell"});
-}
-
-TEST(VerilogDataCompiler, MacrosOfEarlierFilesReachLaterOnesAndOnlyTheLastFileIsYielded) {
-  Project project;
+TEST_F(VerilogDataCompiler, MacrosOfEarlierFilesReachLaterOnesAndOnlyTheLastFileIsYielded) {
   const std::string first = project.Write("defs.v",
                                           "`define LEAF_NAME leaf\n"
                                           "module in_first_file; endmodule\n");
@@ -248,15 +197,12 @@ TEST(VerilogDataCompiler, MacrosOfEarlierFilesReachLaterOnesAndOnlyTheLastFileIs
   EXPECT_EQ(NamesOf(project.Compile({first, second})), Strings{"leaf"});
   EXPECT_EQ(NamesOf(project.Compile({first})), Strings{"in_first_file"});
 
-  MessageCapture messages;
   EXPECT_TRUE(project.Compile({second}).empty());
   EXPECT_TRUE(messages.Has(vci_test::Format(Text::kUndefinedMacro, "LEAF_NAME")))
       << "alone, the later file does not know the macro: " << messages.All();
 }
 
-TEST(VerilogDataCompiler, UndefineAllForgetsEveryMacroUpToThatPointOnly) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogDataCompiler, UndefineAllForgetsEveryMacroUpToThatPointOnly) {
   const std::string defs = project.Write("defs.v",
                                          "`define EARLY 1\n"
                                          "`undefineall\n"
@@ -270,9 +216,7 @@ TEST(VerilogDataCompiler, UndefineAllForgetsEveryMacroUpToThatPointOnly) {
   EXPECT_TRUE(messages.records().empty()) << messages.All();
 }
 
-TEST(VerilogDataCompiler, DefineAndIncdirArgumentsAndIgnoredOptions) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogDataCompiler, DefineAndIncdirArgumentsAndIgnoredOptions) {
   ASSERT_EQ(::mkdir(project.Path("inc_a").c_str(), 0700), 0);
   ASSERT_EQ(::mkdir(project.Path("inc_b").c_str(), 0700), 0);
   ASSERT_EQ(::mkdir(project.Path("src").c_str(), 0700), 0);
@@ -300,9 +244,7 @@ TEST(VerilogDataCompiler, DefineAndIncdirArgumentsAndIgnoredOptions) {
   EXPECT_TRUE(messages.records().empty()) << messages.All();
 }
 
-TEST(VerilogDataCompiler, IncludedModulesHaveTheirOwnFileLinesAndTheIncluderKeepsItsLines) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogDataCompiler, IncludedModulesHaveTheirOwnFileLinesAndTheIncluderKeepsItsLines) {
   project.Write("sub.vh",
                 "\n"
                 "module in_header; endmodule\n"
@@ -320,9 +262,7 @@ TEST(VerilogDataCompiler, IncludedModulesHaveTheirOwnFileLinesAndTheIncluderKeep
   EXPECT_TRUE(messages.records().empty()) << messages.All();
 }
 
-TEST(VerilogDataCompiler, ProblemsAreHostMessagesWithFileAndLine) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogDataCompiler, ProblemsAreHostMessagesWithFileAndLine) {
   const std::string path = project.Write("bad.v",
                                          "module ok; endmodule\n"
                                          "`include \"missing.vh\"\n"
@@ -344,9 +284,7 @@ TEST(VerilogDataCompiler, ProblemsAreHostMessagesWithFileAndLine) {
   EXPECT_EQ(unterminated[0].line, 3);
 }
 
-TEST(VerilogDataCompiler, AnswersNothingWithoutAReadableLastFile) {
-  MessageCapture messages;
-  Project project;
+TEST_F(VerilogDataCompiler, AnswersNothingWithoutAReadableLastFile) {
   bool compiled = true;
   EXPECT_TRUE(project.Compile({"+define+A"}, &compiled).empty());
   EXPECT_FALSE(compiled);

@@ -10,6 +10,7 @@
 #include <string_view>
 #include <vector>
 
+#include "IsolatedDispatcher.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "ScopedTempDir.h"
@@ -19,27 +20,10 @@
 
 namespace vci_test {
 
-// Takes every manager out of the dispatcher and collects the messages instead; puts the managers
-// back in their order and states afterwards.
+// Collects the messages instead of the managers of the dispatcher.
 class MessageCapture {
  public:
-  MessageCapture() {
-    Port_MsgDispatcher::getAllMsgMans(saved_);
-    for (Port_MsgMan* man : saved_) {
-      wasEnabled_.push_back(man->isEnabled());
-      Port_MsgDispatcher::removeMsgMan(man);
-    }
-    Port_MsgDispatcher::addMsgMan(&collector_);
-  }
-  ~MessageCapture() {
-    Port_MsgDispatcher::removeMsgMan(&collector_);
-    for (std::size_t i = 0; i < saved_.size(); ++i) {
-      Port_MsgDispatcher::addMsgMan(saved_[i]);
-      wasEnabled_[i] ? saved_[i]->enable() : saved_[i]->disable();
-    }
-  }
-  MessageCapture(const MessageCapture&) = delete;
-  MessageCapture& operator=(const MessageCapture&) = delete;
+  MessageCapture() { Port_MsgDispatcher::addMsgMan(&collector_); }
 
   const std::vector<Port_MsgRecord>& records() const { return collector_.records(); }
   void clear() { collector_.clearRecords(); }
@@ -59,11 +43,18 @@ class MessageCapture {
     }
     return all;
   }
+  // "<line>: <text>" per message.
+  std::vector<std::string> Lines() const {
+    std::vector<std::string> lines;
+    for (const Port_MsgRecord& record : records()) {
+      lines.push_back(std::to_string(record.line) + ": " + record.text.substr(0, record.text.size() - 1));
+    }
+    return lines;
+  }
 
  private:
+  IsolatedDispatcher isolation_;
   Port_MsgCollector collector_;
-  std::vector<Port_MsgMan*> saved_;
-  std::vector<bool> wasEnabled_;
 };
 
 struct Instance {
@@ -107,6 +98,23 @@ inline std::vector<std::string> NamesOf(const std::vector<Module>& modules) {
   return names;
 }
 
+// "name:line(low connections)" and " type instance:line" per instance, for each module.
+inline std::vector<std::string> Describe(const std::vector<Module>& modules) {
+  std::vector<std::string> described;
+  for (const Module& module : modules) {
+    std::string text = module.name + ":" + std::to_string(module.line) + "(";
+    for (std::size_t i = 0; i < module.lowConnections.size(); ++i) {
+      text += (i ? "," : "") + module.lowConnections[i];
+    }
+    text += ")";
+    for (const Instance& instance : module.instances) {
+      text += " " + instance.defName + " " + instance.name + ":" + std::to_string(instance.line);
+    }
+    described.push_back(text);
+  }
+  return described;
+}
+
 inline std::vector<std::string> InstanceNamesOf(const Module& module) {
   std::vector<std::string> names;
   for (const Instance& instance : module.instances) names.push_back(instance.defName + " " + instance.name);
@@ -148,6 +156,21 @@ class Project {
  private:
   ScopedTempDir dir_;
   std::shared_ptr<Hx_Vci::VerilogFileCache> cache_;
+};
+
+// A capture of the messages and a project, for each test.
+class CompilerTest : public testing::Test {
+ protected:
+  // Compiles `source` alone and compares the modules (as Describe gives them) and the messages.
+  void ExpectCompiled(const std::string& source, const std::vector<std::string>& modules,
+                      const std::vector<std::string>& messageLines = {}) {
+    messages.clear();
+    EXPECT_EQ(Describe(project.CompileText("source.v", source)), modules) << source;
+    EXPECT_EQ(messages.Lines(), messageLines) << source;
+  }
+
+  MessageCapture messages;
+  Project project;
 };
 
 inline std::string Format(const char* format, const std::string& argument) {

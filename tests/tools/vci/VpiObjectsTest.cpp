@@ -7,14 +7,6 @@
 #include "Port/SafeCount.h"
 #include "vci/Hx_Vci.h"
 
-TEST(VerilogDataCompiler, CompileAnswersNoAccessObject) {
-  std::unique_ptr<Hx_Vci::DataCompiler> compiler = Hx_Vci::create_data_compiler();
-  ASSERT_NE(compiler, nullptr);
-  const char* argv[] = {"commandname", "/src/top.v", "+dora+dataparser+CR172701", "+define+A=1+B"};
-  EXPECT_EQ(compiler->compile(4, argv), nullptr);
-  EXPECT_EQ(compiler->compile(0, nullptr), nullptr);
-}
-
 TEST(VpiHandles, CopiesMovesAndResetsCountReferences) {
   const long liveBefore = Port::LiveObjectCount();
   Hx_VpiHandlePtr first = Hx_VpiHandlePtr::Make(vpiModule);
