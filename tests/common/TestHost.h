@@ -34,6 +34,7 @@
 #include "Prjrep/Casts.h"
 #include "RavA/Factory.h"
 #include "ScopedEnv.h"
+#include "ScopedWorkingDirectory.h"
 
 extern "C" void InstFactoryEntry();
 
@@ -88,19 +89,6 @@ inline std::string CurrentDirectory() {
   EXPECT_TRUE(Port::File::getcwd(&dir));
   return dir.str();
 }
-
-class ScopedWorkingDirectory {
- public:
-  explicit ScopedWorkingDirectory(const std::string& dir) : saved_(CurrentDirectory()) {
-    EXPECT_TRUE(Port::File::chdir(dir.c_str()));
-  }
-  ScopedWorkingDirectory(const ScopedWorkingDirectory&) = delete;
-  ScopedWorkingDirectory& operator=(const ScopedWorkingDirectory&) = delete;
-  ~ScopedWorkingDirectory() { Port::File::chdir(saved_.c_str()); }
-
- private:
-  std::string saved_;
-};
 
 class PipelineTest : public testing::Test {
  protected:
@@ -273,7 +261,9 @@ class MessageLog {
   std::vector<std::string> Lines(const char* category = nullptr) const {
     std::vector<std::string> lines;
     for (const Port_MsgRecord& record : Records()) {
-      if (category) EXPECT_EQ(record.category, category) << record.text;
+      if (category) {
+        EXPECT_EQ(record.category, category) << record.text;
+      }
       lines.push_back(std::string(Port_MsgMan::typeName(record.type)) + ": " + record.text);
     }
     return lines;
