@@ -28,6 +28,8 @@ class CommandRunner {
   int ListFactories();
   // The external libraries and the Verilog settings of the sources.
   void TakeSettings(const ProjectSources& sources);
+  // The log of one run; `check` takes the syntax errors out of its messages.
+  void UseLog(MessageLog* log);
   int RunOnProject();
   int RunCommand(Vad::IHdlProject* project, std::size_t fileCount, std::ostream& out);
   int ParseAndRun(Vad::IHdlProject* project, std::size_t fileCount, Progress& progress, std::ostream& out);
@@ -71,6 +73,7 @@ class CommandRunner {
   MessageLog* log_ = nullptr;
   // From the command line and the project file.
   std::vector<std::string> externalLibraries_;
+  std::vector<Diagnostic> notHdl_;  // of the sources, found once they are known
   VerilogSettings verilog_;
   ShownPaths shownPaths_;
 };
