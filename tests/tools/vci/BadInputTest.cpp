@@ -171,6 +171,49 @@ TEST(VerilogBadInput, MissingEndmoduleAndStrayTokensDoNotLoseModules) {
   EXPECT_TRUE(messages.Has(vci_test::Format(Text::kInstanceSeparatorExpected, "u3"))) << messages.All();
 }
 
+TEST(VerilogBadInput, DeclarationWithoutSemicolonIsReportedAtItsNameAndTheNextItemStillCounts) {
+  MessageCapture messages;
+  Project project;
+  std::vector<Module> modules = project.CompileText("decl.v",
+                                                    "module a;\n"
+                                                    "  wire w\n"
+                                                    "  cell u1 (.x(w));\n"
+                                                    "  integer i\n"
+                                                    "  initial i = 0;\n"
+                                                    "  parameter P = 4\n"
+                                                    "  localparam Q = 5;\n"
+                                                    "  reg r\n"
+                                                    "endmodule\n");
+  ASSERT_EQ(NamesOf(modules), Strings{"a"}) << messages.All();
+  EXPECT_EQ(vci_test::InstanceNamesOf(modules[0]), Strings{"cell u1"});
+  std::vector<int> lines;
+  for (const Port_MsgRecord& record : messages.records()) lines.push_back(record.line);
+  EXPECT_EQ(lines, (std::vector<int>{2, 4, 6, 8})) << messages.All();
+  EXPECT_TRUE(messages.Has(vci_test::Format(Text::kDeclarationWithoutSemicolon, "w"))) << messages.All();
+  EXPECT_TRUE(messages.Has(vci_test::Format(Text::kDeclarationWithoutSemicolon, "4"))) << messages.All();
+}
+
+TEST(VerilogBadInput, CompleteDeclarationsOfEveryFormAreQuiet) {
+  MessageCapture messages;
+  Project project;
+  std::vector<Module> modules =
+      project.CompileText("decls.v",
+                          "module a (input wire clk, output reg [3:0] q);\n"
+                          "  wire (strong0, weak1) #(1, 2) w = f(clk), v;\n"
+                          "  reg [7:0] mem [0:3];\n"
+                          "  logic signed [3:0] s = int'(clk);\n"
+                          "  input my_t port_a;\n"
+                          "  parameter integer P = 4, Q = P + 1;\n"
+                          "  localparam [3:0] A = {2'b01, 2'b10};\n"
+                          "  genvar g;\n"
+                          "  and g1 (w, clk, v);\n"
+                          "  cell u1 (.x(w));\n"
+                          "endmodule\n");
+  ASSERT_EQ(NamesOf(modules), Strings{"a"});
+  EXPECT_EQ(vci_test::InstanceNamesOf(modules[0]), Strings{"cell u1"});
+  EXPECT_TRUE(messages.records().empty()) << messages.All();
+}
+
 TEST(VerilogBadInput, DeepNestingIsCutWithoutExhaustingTheStack) {
   MessageCapture messages;
   Project project;
