@@ -235,9 +235,9 @@ TEST(Export, NeedsAFormatAndWarnsAboutSourcesNoToolCompiles) {
   EXPECT_EQ(RunQuillon({"order", "--to", "make", "-P", DataPath("mixed/project.json")}).status, 2);
   EXPECT_EQ(RunQuillon({"export", "--to", "cmake", "-P", DataPath("mixed/project.json")}).status, 2);
 
-  ScopedTextFile netlist("MODULE block 1\n", "block.hrf");
+  ScopedTextFile netlist("MODULE blk 1\n", "block.hrf");
   ScopedTextFile vhdl(
-      "entity user is end entity;\narchitecture rtl of user is\nbegin\n  b : entity work.block;\nend "
+      "entity user is end entity;\narchitecture rtl of user is\nbegin\n  b : entity work.blk;\nend "
       "architecture;\n",
       "user.vhd");
   CliResult result = RunQuillon({"export", "--to", "tcl", netlist.path(), vhdl.path()});
