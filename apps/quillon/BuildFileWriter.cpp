@@ -53,14 +53,31 @@ bool NinjaPath(const std::string& path, std::string& written, std::string& error
   return true;
 }
 
-// Depfiles are read by make and ninja alike: blanks and '#' take a backslash.
-std::string DepfilePath(const std::string& path) {
-  std::string written;
-  for (char c : path) {
-    if (c == ' ' || c == '\t' || c == '#') written += '\\';
-    written += c == '$' ? std::string("$$") : std::string(1, c);
+bool EndsDepfileName(char c) { return c == ' ' || c == '\t' || c == '#' || c == ':'; }
+
+// Depfiles are read by make and ninja alike: blanks, '#' and ':' take a backslash, '$' is doubled,
+// and backslashes before any of those (or at the end, before the separating blank) are doubled so
+// that they stay backslashes. A line break cannot be written.
+bool DepfilePath(const std::string& path, std::string& written, std::string& error) {
+  if (path.find_first_of("\n\r") != std::string::npos) {
+    error = "cannot write " + path + " into a depfile: a path cannot hold a line break there";
+    return false;
   }
-  return written;
+  written.clear();
+  std::size_t backslashes = 0;
+  for (std::size_t at = 0; at <= path.size(); ++at) {
+    if (at < path.size() && path[at] == '\\') {
+      ++backslashes;
+      continue;
+    }
+    const bool escaped = at == path.size() || EndsDepfileName(path[at]);
+    written.append(escaped ? 2 * backslashes : backslashes, '\\');
+    backslashes = 0;
+    if (at == path.size()) break;
+    if (EndsDepfileName(path[at])) written += '\\';
+    written += path[at] == '$' ? std::string("$$") : std::string(1, path[at]);
+  }
+  return true;
 }
 
 }  // namespace
@@ -123,13 +140,20 @@ bool BuildFileWriter::Ninja(const ExportPlan& plan, std::ostream& out, std::stri
   return true;
 }
 
-bool BuildFileWriter::Depfile(const ExportPlan& plan, std::ostream& out, std::string&) {
-  const std::vector<std::string> stamps = StampNames(plan);
-  for (std::size_t index = 0; index < plan.sources.size(); ++index) {
-    out << kBuildDir << '/' << stamps[index] << ": " << DepfilePath(plan.sources[index].path);
-    for (std::size_t need : plan.sources[index].needs) out << ' ' << kBuildDir << '/' << stamps[need];
-    out << '\n';
+bool BuildFileWriter::Depfile(const ExportPlan& plan, std::ostream& out, std::string& error) {
+  std::vector<std::string> stamps = StampNames(plan);
+  for (std::string& stamp : stamps) {
+    if (!DepfilePath(std::string(kBuildDir) + '/' + stamp, stamp, error)) return false;
   }
+  std::string text;
+  for (std::size_t index = 0; index < plan.sources.size(); ++index) {
+    std::string path;
+    if (!DepfilePath(plan.sources[index].path, path, error)) return false;
+    text += stamps[index] + ": " + path;
+    for (std::size_t need : plan.sources[index].needs) text += ' ' + stamps[need];
+    text += '\n';
+  }
+  out << text;
   return true;
 }
 

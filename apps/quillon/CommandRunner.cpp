@@ -16,6 +16,7 @@
 #include "DeveloperTextCapture.h"
 #include "DiagnosticFinder.h"
 #include "DiagnosticReport.h"
+#include "SourceFileCheck.h"
 #include "DotOutput.h"
 #include "ExitStatus.h"
 #include "ExportPlanner.h"
@@ -113,9 +114,9 @@ int CommandRunner::Run() {
   if (options_.command == Command::kFactories) return ListFactories();
   if (options_.command == Command::kWatch) return Watcher(options_).Run();
   MessageLog log(options_.quiet, options_.verbose, ColorOnStandardError());
-  log_ = &log;
+  UseLog(&log);
   int status = RunOnProject();
-  log_ = nullptr;
+  UseLog(nullptr);
   return status;
 }
 
@@ -154,7 +155,13 @@ int CommandRunner::ListFactories() {
   return kExitDone;
 }
 
+void CommandRunner::UseLog(MessageLog* log) {
+  log_ = log;
+  if (log_ && options_.command == Command::kCheck) log_->DivertSyntaxErrors();
+}
+
 void CommandRunner::TakeSettings(const ProjectSources& sources) {
+  notHdl_ = SourceFileCheck::NotHdl(sources.files, options_.strict);
   externalLibraries_ = sources.externalLibraries;
   externalLibraries_.insert(externalLibraries_.end(), options_.externalLibraries.begin(),
                             options_.externalLibraries.end());
@@ -163,11 +170,11 @@ void CommandRunner::TakeSettings(const ProjectSources& sources) {
 
 int CommandRunner::RunOn(Vad::IHdlProject* project, const ProjectSources& sources, std::ostream& out) {
   MessageLog log(options_.quiet, options_.verbose, ColorOnStandardError());
-  log_ = &log;
+  UseLog(&log);
   TakeSettings(sources);
   shownPaths_ = ShownPaths(sources, options_.absolutePaths);
   int status = RunCommand(project, sources.files.size(), out);
-  log_ = nullptr;
+  UseLog(nullptr);
   return status;
 }
 
@@ -473,8 +480,10 @@ int CommandRunner::Check(ProjectReader& reader, Vad::IHdlProject* project, std::
   int status = result == CitI::kOk ? Finished() : Failed("the compile order is not available", result);
   std::vector<FileInfo> files = reader.Files(kUnitsWithoutLinks);
   TreeInfo tree;
-  std::vector<Diagnostic> diagnostics =
-      Diagnose(files, ReadLinks(project, tree), result == CitI::kOk ? &order : nullptr);
+  std::vector<Diagnostic> diagnostics = SourceFileCheck::SyntaxErrors(log_->received());
+  diagnostics.insert(diagnostics.end(), notHdl_.begin(), notHdl_.end());
+  for (Diagnostic& found : Diagnose(files, ReadLinks(project, tree), result == CitI::kOk ? &order : nullptr))
+    diagnostics.push_back(std::move(found));
   if (result == CitI::kOk) {
     for (Diagnostic& ambiguous : ArchitectureCheck::Find(files, order))
       diagnostics.push_back(std::move(ambiguous));

@@ -30,6 +30,8 @@ class CommandRunner {
   int ListFactories();
   // The external libraries and the Verilog settings of the sources.
   void TakeSettings(const ProjectSources& sources);
+  // The log of one run; `check` takes the syntax errors out of its messages.
+  void UseLog(MessageLog* log);
   int RunOnProject();
   // Gathers the sources and runs the command on them.
   int LoadAndRun();
@@ -80,6 +82,7 @@ class CommandRunner {
   MessageLog* log_ = nullptr;
   // From the command line and the project file.
   std::vector<std::string> externalLibraries_;
+  std::vector<Diagnostic> notHdl_;  // of the sources, found once they are known
   VerilogSettings verilog_;
   ShownPaths shownPaths_;
 };

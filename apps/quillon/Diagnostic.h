@@ -32,6 +32,7 @@ inline constexpr const char* kSyntaxError = "syntax-error";
 inline constexpr const char* kEmptySource = "empty-source";
 inline constexpr const char* kBlackBox = "black-box";
 inline constexpr const char* kAmbiguousArchitecture = "ambiguous-architecture";
+inline constexpr const char* kNotHdl = "not-hdl";
 }  // namespace DiagnosticCode
 
 }  // namespace quillon

@@ -67,6 +67,10 @@ std::string IdentityOf(const std::string& path) {
   return (failure ? std::filesystem::path(path) : absolute).lexically_normal().string();
 }
 
+// An option where a value is due means the value is missing ("-l" at the end of its line): no
+// library, list or path is spelled "-sv" or "+incdir+...". A lone "-" is standard input.
+bool IsOption(const std::string& token) { return token.size() > 1 && (token[0] == '-' || token[0] == '+'); }
+
 }  // namespace
 
 struct FileList::Frame {
@@ -232,7 +236,7 @@ bool FileList::TakeToken(std::vector<Frame>& stack, std::set<std::string>& open,
   const std::string& text = token.text;
   const std::string where = frame.Where(token.line);
   if (text == "-f" || text == "-F" || text == "-y" || text == "-v" || text == "-l") {
-    if (frame.next == frame.tokens.size()) {
+    if (frame.next == frame.tokens.size() || IsOption(frame.tokens[frame.next].text)) {
       error = where + text + " needs a value";
       return false;
     }

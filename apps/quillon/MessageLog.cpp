@@ -8,6 +8,7 @@
 #include <string>
 
 #include "Port/MsgDispatcher.h"
+#include "SourceFileCheck.h"
 #include "TerminalColor.h"
 
 namespace quillon {
@@ -78,6 +79,7 @@ bool MessageLog::HasErrors() const {
 
 void MessageLog::deliverMsg(const Port_MsgRecord& record) {
   received_.push_back(record);
+  if (divertSyntaxErrors_ && SourceFileCheck::IsSyntaxError(record)) return;
   std::vector<Port_MsgRecord> ready;
   cycles_.Take(record, ready);
   for (const Port_MsgRecord& each : ready) Port_MsgManDefault::deliverMsg(each);

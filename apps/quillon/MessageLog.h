@@ -34,6 +34,9 @@ class MessageLog : public Port_MsgManDefault {
   const std::vector<Port_MsgRecord>& received() const { return received_; }
   // True once an error (or worse) arrived.
   bool HasErrors() const;
+  // From now on the syntax errors of source files (SourceFileCheck::IsSyntaxError) are only kept
+  // in received(): neither written, counted nor listed, for `check` reports them as diagnostics.
+  void DivertSyntaxErrors() { divertSyntaxErrors_ = true; }
 
   // True once the module cut file dependency cycles to give an order that is not valid.
   bool OrderWasCut() const { return cycles_.OrderWasCut(); }
@@ -51,6 +54,7 @@ class MessageLog : public Port_MsgManDefault {
   Progress* progress_ = nullptr;
   bool defaultWasRegistered_ = false;
   bool sinkInstalled_ = false;
+  bool divertSyntaxErrors_ = false;
   Port_MsgManData::DebugSink previousSink_;
   std::vector<MessageInfo> messages_;
   std::vector<Port_MsgRecord> received_;

@@ -248,9 +248,10 @@ bool ProjectLoader::AddSource(const std::string& given, std::string library, std
     return true;
   }
   if (library.empty()) library = kDefaultLibrary;
-  if (plugin.empty()) plugin = PluginTable::PluginForPath(fullPath);
-  sources_.files.push_back(
-      {std::move(fullPath), FileList::Resolved(given, ""), std::move(library), std::move(plugin)});
+  const bool byExtension = plugin.empty();
+  if (byExtension) plugin = PluginTable::PluginForPath(fullPath);
+  sources_.files.push_back({std::move(fullPath), FileList::Resolved(given, ""), std::move(library),
+                            std::move(plugin), byExtension});
   return true;
 }
 

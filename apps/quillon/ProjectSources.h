@@ -12,6 +12,7 @@ struct SourceFile {
   std::string givenPath;  // as the user gave it, normalised; relative stays relative
   std::string library;
   std::string plugin;
+  bool pluginByExtension = false;  // no plug-in was given: `plugin` follows the extension
 };
 
 struct ProjectSources {

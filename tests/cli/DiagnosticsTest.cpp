@@ -41,6 +41,7 @@ struct Checked {
   int status = -1;
   Json diagnostics;
   std::string err;
+  Json messages = {};
 };
 
 Checked RunJson(const std::string& command, const Project& project, std::vector<std::string> options = {}) {
@@ -50,7 +51,8 @@ Checked RunJson(const std::string& command, const Project& project, std::vector<
   CliResult result = RunQuillon(args);
   Json answer = Json::parse(result.out, nullptr, false);
   EXPECT_FALSE(answer.is_discarded()) << result.out << result.err;
-  return {result.status, answer.is_discarded() ? Json() : answer.value("diagnostics", Json()), result.err};
+  if (answer.is_discarded()) return {result.status, Json(), result.err};
+  return {result.status, answer.value("diagnostics", Json()), result.err, answer.value("messages", Json())};
 }
 
 std::vector<std::string> CodesOf(const Json& diagnostics) {
@@ -197,6 +199,63 @@ TEST(Diagnostics, SourceInWhichNothingWasFoundIsAnError) {
   Project twin;
   twin.Add("notes.vhd", "-- notes\nentity noted is end;\n");
   EXPECT_EQ(RunJson("check", twin).status, 0);
+}
+
+TEST(Diagnostics, SyntaxErrorsOfVhdlAndVerilogAreErrorsWithFileAndLineInsteadOfMessages) {
+  Project broken;
+  std::string vhdl = broken.Add("e.vhd", "entity e is port (a : in bit;\nend;\n");
+  std::string verilog = broken.Add("m.v", "module m;\n  wire w\n  e u1 ();\nendmodule\n");
+  Checked checked = RunJson("check", broken);
+  EXPECT_EQ(checked.status, 1);
+  ASSERT_EQ(CodesOf(checked.diagnostics), (std::vector<std::string>{"syntax-error", "syntax-error"}))
+      << checked.diagnostics.dump(2);
+  EXPECT_EQ(checked.diagnostics[0]["file"], vhdl);
+  EXPECT_EQ(checked.diagnostics[0]["line"], 2);
+  EXPECT_EQ(checked.diagnostics[0]["text"], "'(' of line 1 is not closed by ')'");
+  EXPECT_EQ(checked.diagnostics[1]["file"], verilog);
+  EXPECT_EQ(checked.diagnostics[1]["line"], 2);
+  EXPECT_EQ(checked.diagnostics[1]["text"], "';' expected after \"w\"");
+  EXPECT_TRUE(checked.messages.empty()) << checked.messages.dump(2);
+
+  std::vector<std::string> args{"check"};
+  args.insert(args.end(), broken.paths().begin(), broken.paths().end());
+  CliResult text = RunQuillon(args);
+  EXPECT_EQ(text.status, 1);
+  EXPECT_NE(text.err.find(verilog + ":2: error: ';' expected after \"w\" [syntax-error]\n"), std::string::npos)
+      << text.err;
+  EXPECT_EQ(text.err.find("ERROR:"), std::string::npos) << "reported once, as a diagnostic: " << text.err;
+  EXPECT_EQ(text.out, "2 files, 2 design units: 2 errors, 0 warnings\n");
+
+  // Other commands still give their answer, with the parsers' messages.
+  Checked units = RunJson("units", broken);
+  EXPECT_EQ(units.status, 1);
+  EXPECT_EQ(units.messages.size(), 2u) << units.messages.dump(2);
+
+  Project twin;
+  twin.Add("e.vhd", "entity e is port (a : in bit);\nend;\n");
+  twin.Add("m.v", "module m;\n  wire w;\n  e u1 ();\nendmodule\n");
+  Checked corrected = RunJson("check", twin);
+  EXPECT_EQ(corrected.status, 0) << corrected.diagnostics.dump(2);
+  EXPECT_TRUE(corrected.diagnostics.empty());
+}
+
+TEST(Diagnostics, SourceOfAnExtensionThatNamesNoPluginIsNotHdlAndAnErrorWhenStrict) {
+  Project broken;
+  broken.Add("top.vhd", "entity top is end;\n");
+  std::string notes = broken.Add("notes.txt", "remember the clock\n");
+  Checked checked = RunJson("check", broken);
+  EXPECT_EQ(checked.status, 0);
+  ASSERT_EQ(CodesOf(checked.diagnostics), std::vector<std::string>{"not-hdl"});
+  EXPECT_EQ(checked.diagnostics[0]["severity"], "warning");
+  EXPECT_EQ(checked.diagnostics[0]["file"], notes);
+  EXPECT_EQ(RunJson("check", broken, {"--strict"}).status, 1);
+
+  // The general plug-in chosen on purpose is no mistake.
+  std::vector<std::string> args{"-q", "--format", "json", "check", broken.paths()[0], "--plugin",
+                                "PLUGIN_General", notes};
+  CliResult chosen = RunQuillon(args);
+  EXPECT_EQ(chosen.status, 0) << chosen.out << chosen.err;
+  EXPECT_TRUE(Json::parse(chosen.out, nullptr, false).value("diagnostics", Json()).empty()) << chosen.out;
 }
 
 TEST(Diagnostics, ComponentWithoutAnEntityIsABlackBoxWarningAndAnErrorWhenStrict) {

@@ -152,6 +152,16 @@ TEST(Export, PathsMakeCannotNameAreRefusedWhileScriptsQuoteThem) {
             std::string::npos);
 }
 
+TEST(Export, DepfileEscapesWhatMakeAndNinjaWouldSplitOrExpand) {
+  ScopedTextFile source("entity odd is\nend entity odd;\n", "a:b #1 $x\\ y.vhd");
+  CliResult depfile = RunQuillon({"export", "--to", "depfile", source.path()});
+  ASSERT_EQ(depfile.status, 0) << depfile.err;
+  const std::string directory = source.path().substr(0, source.path().rfind('/') + 1);
+  const std::string escaped = directory + "a\\:b\\ \\#1\\ $$x\\\\\\ y.vhd\n";
+  EXPECT_TRUE(depfile.out.starts_with(".quillon-build/")) << depfile.out;
+  EXPECT_TRUE(depfile.out.ends_with(".stamp: " + escaped)) << depfile.out;
+}
+
 TEST(Export, SourcesNoToolCompilesAreLeftOutWithAWarning) {
   ScopedTextFile netlist("MODULE block 1\n", "block.hrf");
   CliResult result = RunQuillon({"export", "--to", "tcl", netlist.path(), DataPath("mixed/lane.vhd")});

@@ -112,6 +112,9 @@ TEST_F(FileListTest, ErrorsNameTheListAndTheLine) {
   EXPECT_EQ(ErrorOf("a.v\n\"open.v\n"), "bad.f:2: a \" quote is not closed on its line");
   EXPECT_EQ(ErrorOf("a.v /* open\n\n"), "bad.f:1: a /* comment is not closed");
   EXPECT_EQ(ErrorOf("a.v\n-f\n"), "bad.f:2: -f needs a value");
+  EXPECT_EQ(ErrorOf("a.v\n-l\n-sv\nb.v\n"), "bad.f:2: -l needs a value");
+  EXPECT_EQ(ErrorOf("-l\n+incdir+inc\n"), "bad.f:1: -l needs a value");
+  EXPECT_EQ(ErrorOf("-y\n-v lib.v\n"), "bad.f:1: -y needs a value");
   EXPECT_EQ(ErrorOf("+define+=1\n"), "bad.f:1: +define+ needs NAME[=VALUE], not '=1'");
   EXPECT_EQ(ErrorOf("-f absent.f\n"), "bad.f:1: cannot read file list absent.f");
 

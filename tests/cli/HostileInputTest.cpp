@@ -114,12 +114,18 @@ TEST(HostileInput, ListsSkipAByteOrderMarkAndReadARepeatedSourceOnce) {
 TEST(HostileInput, VerilogCompilerErrorsReachTheUserOnceWithFileAndLine) {
   ScopedTextFile broken("module a;\n`include \"absent.vh\"\nendmodule\n", "broken.v");
   ScopedTextFile clean("module b;\nendmodule\n", "clean.v");
-  CliResult result = RunQuillon({"check", broken.path(), clean.path()});
-  EXPECT_EQ(result.status, 1) << result.err;
-  const std::string expected = "ERROR: " + broken.path() + ":2: include file \"absent.vh\" not found";
-  std::size_t first = result.err.find(expected);
-  EXPECT_NE(first, std::string::npos) << result.err;
-  EXPECT_EQ(result.err.find(expected, first + 1), std::string::npos) << "reported once: " << result.err;
+  for (const char* command : {"units", "check"}) {
+    CliResult result = RunQuillon({command, broken.path(), clean.path()});
+    EXPECT_EQ(result.status, 1) << result.err;
+    // check shows it as a diagnostic, the other commands as a message.
+    const std::string expected =
+        std::string(command) == "check"
+            ? broken.path() + ":2: error: include file \"absent.vh\" not found [syntax-error]"
+            : "ERROR: " + broken.path() + ":2: include file \"absent.vh\" not found";
+    std::size_t first = result.err.find(expected);
+    EXPECT_NE(first, std::string::npos) << result.err;
+    EXPECT_EQ(result.err.find(expected, first + 1), std::string::npos) << "reported once: " << result.err;
+  }
 }
 
 }  // namespace

@@ -56,6 +56,7 @@ inline constexpr char kInstanceNameExpected[] = "instance name expected after mo
 inline constexpr char kInstanceConnectionsExpected[] = "port connections expected for instance %s";
 inline constexpr char kInstanceSeparatorExpected[] = "',' or ';' expected after instance %s";
 inline constexpr char kNestingTooDeep[] = "blocks nest deeper than %d levels; the innermost ones are skipped";
+inline constexpr char kDeclarationWithoutSemicolon[] = "';' expected after \"%s\"";
 inline constexpr char kUnterminatedAttribute[] = "attribute \"(*\" not terminated by \"*)\"";
 
 }  // namespace Hx_Vci::VerilogMessageText

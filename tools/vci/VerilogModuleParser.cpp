@@ -1,6 +1,7 @@
 #include "vci/VerilogModuleParser.h"
 
 #include <cstdarg>
+#include <optional>
 #include <string_view>
 #include <utility>
 
@@ -38,6 +39,44 @@ bool ClosesGroup(const VerilogToken& token) {
 }
 
 std::string Quoted(const VerilogToken& token) { return VerilogMessageLog::Quote(token.text); }
+
+// The keywords of net, variable, port and parameter declarations: a list of names with ranges and
+// initial values, ended by ';'.
+bool DeclaresNames(K keyword) {
+  switch (keyword) {
+    case K::kInput: case K::kOutput: case K::kInout: case K::kWire: case K::kReg: case K::kTri:
+    case K::kTri0: case K::kTri1: case K::kTriand: case K::kTrior: case K::kTrireg: case K::kWand:
+    case K::kWor: case K::kUwire: case K::kSupply0: case K::kSupply1: case K::kInteger: case K::kReal:
+    case K::kRealtime: case K::kTime: case K::kEvent: case K::kParameter: case K::kLocalparam:
+    case K::kGenvar: case K::kLogic: case K::kBit: case K::kByte: case K::kInt: case K::kShortint:
+    case K::kLongint: case K::kShortreal: case K::kString: case K::kWreal:
+      return true;
+    default:
+      return false;
+  }
+}
+
+// Data types, which a cast in an initial value names: int'(x).
+bool NamesDataType(K keyword) {
+  switch (keyword) {
+    case K::kReg: case K::kInteger: case K::kReal: case K::kRealtime: case K::kTime: case K::kLogic:
+    case K::kBit: case K::kByte: case K::kInt: case K::kShortint: case K::kLongint: case K::kShortreal:
+    case K::kString: case K::kSigned: case K::kUnsigned: case K::kConst:
+      return true;
+    default:
+      return false;
+  }
+}
+
+// Keywords that no declaration holds after a declared name or in an initial value: the start of
+// the next module item.
+bool BeginsModuleItem(K keyword, bool inInitialValue) {
+  if (keyword == K::kGenerate || keyword == K::kAssign ||
+      VerilogKeywords::Has(keyword, Role::kProcess | Role::kRegion))
+    return true;
+  if (inInitialValue) return DeclaresNames(keyword) && !NamesDataType(keyword);
+  return VerilogKeywords::Has(keyword, Role::kDeclaration);
+}
 
 // Besides identifiers, words reserved only by later language versions ("config", "interface")
 // may name a port in older code; the words of a port declaration itself never do.
@@ -205,6 +244,8 @@ bool VerilogModuleParser::ParseModuleItem(VerilogModuleInfo& module, int depth) 
     SkipStatement(depth + 1);
   } else if (VerilogKeywords::Has(keyword, Role::kRegion)) {
     SkipRegion();
+  } else if (DeclaresNames(keyword)) {
+    SkipDeclaration();
   } else if (VerilogKeywords::Has(keyword, Role::kDeclaration)) {
     SkipToSemicolon();
   } else if (token_.IsName()) {
@@ -489,6 +530,62 @@ void VerilogModuleParser::SkipGroup(char open, char close) {
     Advance();
   }
   Error(start, Text::kUnbalanced, open, close);
+}
+
+// Up to and including the ';' of a declaration. Where the ';' is missing ("wire w" and the next
+// item on the next line), the next item shows it: a name followed by '(' or by a keyword that
+// begins an item, or the end of the module, while the declaration still lists names. The error
+// names the declared name, and parsing goes on from the name after it.
+void VerilogModuleParser::SkipDeclaration() {
+  VerilogToken last = token_;
+  Advance();
+  long depth = 0;
+  bool inInitialValue = false;  // after '=' up to the next ',' at the top
+  bool afterName = false;
+  VerilogToken declared;
+  std::optional<std::pair<VerilogLexer::Position, VerilogToken>> nextItem;
+  for (;;) {
+    const bool top = depth == 0;
+    if (AtBoundary() || (top && VerilogKeywords::Has(token_.keyword, Role::kCloser))) {
+      Error(last, Text::kDeclarationWithoutSemicolon, Quoted(last).c_str());
+      return;
+    }
+    if (top && token_.IsPunct(';')) {
+      Advance();
+      return;
+    }
+    if (top && inInitialValue && BeginsModuleItem(token_.keyword, true)) {
+      Error(last, Text::kDeclarationWithoutSemicolon, Quoted(last).c_str());
+      return;
+    }
+    if (top && afterName && (token_.IsPunct('(') || BeginsModuleItem(token_.keyword, false))) {
+      Error(declared, Text::kDeclarationWithoutSemicolon, Quoted(declared).c_str());
+      if (token_.IsPunct('(') && nextItem) {
+        lexer_.Reset(nextItem->first);
+        token_ = nextItem->second;
+      }
+      return;
+    }
+    const bool name = top && !inInitialValue && token_.IsName();
+    if (name && !afterName) {
+      declared = token_;
+      nextItem.reset();
+    } else if (name && !nextItem) {
+      nextItem.emplace(lexer_.Mark(), token_);
+    }
+    afterName = name;
+    if (OpensGroup(token_)) {
+      ++depth;
+    } else if (ClosesGroup(token_)) {
+      depth = depth > 0 ? depth - 1 : 0;
+    } else if (top && token_.IsPunct('=')) {
+      inInitialValue = true;
+    } else if (top && token_.IsPunct(',')) {
+      inInitialValue = false;
+    }
+    last = token_;
+    Advance();
+  }
 }
 
 // Up to and including the next ';' outside brackets and blocks. Stops before a unit boundary, and

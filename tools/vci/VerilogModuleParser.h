@@ -52,6 +52,7 @@ class VerilogModuleParser {
   void SkipKeywordBlock();
   void SkipRegion();
   void SkipGroup(char open, char close);
+  void SkipDeclaration();
   void SkipToSemicolon();
   // One statement or block, without nesting into it.
   void SkipFlat();

@@ -10,6 +10,7 @@
 #include <string_view>
 
 #include "Port/StringBase.h"
+#include "VhdlStructure.h"
 
 namespace Port {
 class Stream;
@@ -137,6 +138,8 @@ struct VhdlParseContext {
   // The line of the "for" of the configuration item being read: a block configuration is reduced
   // only after the token that follows it.
   std::uint32_t forLine = 1;
+  // The nesting of the file, for the first syntax error that recovery would pass over.
+  VhdlStructure structure;
 };
 
 // Records the selected name of a generic map's actual as a use of the unit being declared when

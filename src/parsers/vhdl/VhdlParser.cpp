@@ -7,6 +7,7 @@
 #include "HdlSets.h"
 #include "IHdlElaborationData.h"
 #include "IHdlProject.h"
+#include "Port/MsgManData.h"
 #include "Port/StringBase.h"
 #include "PortExtraction.h"
 #include "Prjrep/AutoPtr.h"
@@ -23,6 +24,11 @@ void ReportFileNotFound(const Port::StringBase& path, const std::string& reason)
     std::printf(VhdlParser::kFileNotFoundBecause, path.c_str(), reason.c_str());
   }
   std::fflush(stdout);
+}
+
+void ReportSyntaxError(const Port::StringBase& path, const VhdlStructure::Fault& fault) {
+  Port_MsgManData::createObject(VhdlParser::kMessageCategory, path.c_str(), static_cast<int>(fault.line), "")
+      ->issueError(VhdlParser::kSyntaxError, path.c_str(), fault.line, fault.text.c_str());
 }
 
 bool IsSynthesisTarget(const CParserConfigHolder& holder) {
@@ -75,6 +81,7 @@ int VhdlParser::Parse(CParserConfigHolder& holder) {
   // Running out of memory ends this file's parse early; what was recorded stays, as it does
   // after any other stop.
   driver.Run(holder, IsSynthesisTarget(holder));
+  if (driver.SyntaxError()) ReportSyntaxError(path, *driver.SyntaxError());
   return 0;
 }
 

@@ -28,13 +28,18 @@ class VhdlParser : public Parser {
   static constexpr const char* kFileNotFoundBecause =
       "ERROR: Quillon.dll: VhdlParser: %s file not found: |%s|\n";
   static constexpr const char* kFileNotFound = "ERROR: Quillon.dll: VhdlParser: %s file not found\n";
+  // The first syntax error of a file, as a host error message of this category with the file and
+  // line as its source; the text is "FILE:LINE: syntax error: " and what is wrong.
+  static constexpr const char* kMessageCategory = "VhdlParser";
+  static constexpr const char* kSyntaxError = "%s:%u: syntax error: %s\n";
   // The property that names the parse target, and the target under which translate pragmas
   // switch code off.
   static constexpr const char* kParseTargetProperty = "PROP_Parse_Target";
   static constexpr const char* kSynthesisTarget = "synthesis";
 
   // Reads the holder's file to its end and records what it finds. A file that cannot be opened
-  // gives the message above and no units. Always 0.
+  // gives the message above and no units. The first place where the file cannot be legal VHDL
+  // gives one error message; what was recognised stays recorded. Always 0.
   int Parse(CParserConfigHolder& holder) override;
 
   // The ports of an entity, or of an architecture's entity: the port extractor reads the VHDL and

@@ -21,7 +21,9 @@ jpParser::~jpParser() { Port::File::close(input_); }
 bool jpParser::Run(CParserConfigHolder& holder, bool synthesisTarget) {
   if (!input_) return true;
   VhdlParseContext context(holder, *input_, synthesisTarget);
-  return RunVhdlGrammar(context);
+  const bool completed = RunVhdlGrammar(context);
+  syntaxError_ = context.structure.FirstFault();
+  return completed;
 }
 
 }  // namespace Vad

@@ -2,9 +2,11 @@
 #pragma once
 
 #include <memory>
+#include <optional>
 #include <string>
 
 #include "Port/Stream.h"
+#include "VhdlStructure.h"
 
 namespace Port {
 class StringBase;
@@ -30,10 +32,13 @@ class jpParser {
   // Runs the grammar over the whole file, recording into `holder`. Does nothing when the file is
   // not open. False when the scanner ran out of memory and the parse stopped early.
   bool Run(CParserConfigHolder& holder, bool synthesisTarget);
+  // The first syntax error that the last Run met, if any.
+  const std::optional<VhdlStructure::Fault>& SyntaxError() const { return syntaxError_; }
 
  private:
   std::unique_ptr<Port::Stream> input_;
   std::string openFailureReason_;
+  std::optional<VhdlStructure::Fault> syntaxError_;
 };
 
 }  // namespace Vad

@@ -125,6 +125,36 @@ TEST_F(VerilogBadInput, HugeTokensAreTakenWhole) {
   EXPECT_TRUE(messages.records().empty()) << messages.All();
 }
 
+TEST_F(VerilogBadInput, DeclarationWithoutSemicolonIsReportedAtItsNameAndTheNextItemStillCounts) {
+  ExpectCompiled(R"(module a;
+  wire w
+  cell u1 (.x(w));
+  integer i
+  initial i = 0;
+  parameter P = 4
+  localparam Q = 5;
+  reg r
+endmodule
+)",
+                 {"a:1() cell u1:3"},
+                 {"2: ';' expected after \"w\"", "4: ';' expected after \"i\"", "6: ';' expected after \"4\"",
+                  "8: ';' expected after \"r\""});
+  // Complete declarations of every form are quiet.
+  ExpectCompiled(R"(module a (input wire clk, output reg [3:0] q);
+  wire (strong0, weak1) #(1, 2) w = f(clk), v;
+  reg [7:0] mem [0:3];
+  logic signed [3:0] s = int'(clk);
+  input my_t port_a;
+  parameter integer P = 4, Q = P + 1;
+  localparam [3:0] A = {2'b01, 2'b10};
+  genvar g;
+  and g1 (w, clk, v);
+  cell u1 (.x(w));
+endmodule
+)",
+                 {"a:1(clk,q) cell u1:10"});
+}
+
 TEST_F(VerilogBadInput, DeepNestingIsCutWithoutExhaustingTheStack) {
   std::string deep = "module a;\n";
   for (int i = 0; i < 20000; ++i) deep += "begin if (x) ";
