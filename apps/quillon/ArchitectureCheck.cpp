@@ -24,14 +24,14 @@ bool AnalysedAfter(const Candidate& a, const Candidate& b) {
 
 // The candidates in the order they are analysed, so the one bound by default comes last; the
 // diagnostic stands at that one.
-Diagnostic Describe(const std::string& entity, const std::string& library,
-                    std::vector<Candidate> candidates) {
+Diagnostic Describe(const std::string& entity, const std::string& library, std::vector<Candidate> candidates,
+                    const ShownPaths* shown) {
   std::stable_sort(candidates.begin(), candidates.end(),
                    [](const Candidate& a, const Candidate& b) { return AnalysedAfter(b, a); });
   std::string text = "entity " + entity + " (library " + library + ") has " +
                      std::to_string(candidates.size()) + " architectures:";
   for (const Candidate& candidate : candidates) {
-    text += (&candidate == &candidates.front() ? " " : ", ") + candidate.name + " (" + candidate.path + ":" +
+    text += (&candidate == &candidates.front() ? " " : ", ") + candidate.name + " (" + (shown ? shown->Of(candidate.path) : candidate.path) + ":" +
             std::to_string(candidate.line) + ")";
   }
   const Candidate& chosen = candidates.back();
@@ -43,7 +43,7 @@ Diagnostic Describe(const std::string& entity, const std::string& library,
 }  // namespace
 
 std::vector<Diagnostic> ArchitectureCheck::Find(const std::vector<FileInfo>& files,
-                                                const std::vector<OrderEntry>& order) {
+                                                const std::vector<OrderEntry>& order, const ShownPaths* shown) {
   std::map<std::string, std::size_t> position;
   for (std::size_t i = 0; i < order.size(); ++i) position.emplace(order[i].path, i);
 
@@ -66,7 +66,7 @@ std::vector<Diagnostic> ArchitectureCheck::Find(const std::vector<FileInfo>& fil
   std::vector<Diagnostic> diagnostics;
   for (const auto& [key, entity] : entities) {
     if (entity.candidates.size() > 1)
-      diagnostics.push_back(Describe(entity.name, entity.library, entity.candidates));
+      diagnostics.push_back(Describe(entity.name, entity.library, entity.candidates, shown));
   }
   return diagnostics;
 }

@@ -485,7 +485,7 @@ int CommandRunner::Check(ProjectReader& reader, Vad::IHdlProject* project, std::
   for (Diagnostic& found : Diagnose(files, ReadLinks(project, tree), result == CitI::kOk ? &order : nullptr))
     diagnostics.push_back(std::move(found));
   if (result == CitI::kOk) {
-    for (Diagnostic& ambiguous : ArchitectureCheck::Find(files, order))
+    for (Diagnostic& ambiguous : ArchitectureCheck::Find(files, order, &shownPaths_))
       diagnostics.push_back(std::move(ambiguous));
     if (log_->OrderWasCut() && !HasCode(diagnostics, DiagnosticCode::kNoValidOrder))
       diagnostics.push_back({Diagnostic::Severity::kError, DiagnosticCode::kNoValidOrder, kCutOrder, "", 0});
