@@ -31,8 +31,8 @@ Diagnostic Describe(const std::string& entity, const std::string& library, std::
   std::string text = "entity " + entity + " (library " + library + ") has " +
                      std::to_string(candidates.size()) + " architectures:";
   for (const Candidate& candidate : candidates) {
-    text += (&candidate == &candidates.front() ? " " : ", ") + candidate.name + " (" + (shown ? shown->Of(candidate.path) : candidate.path) + ":" +
-            std::to_string(candidate.line) + ")";
+    text += (&candidate == &candidates.front() ? " " : ", ") + candidate.name + " (" +
+            (shown ? shown->Of(candidate.path) : candidate.path) + ":" + std::to_string(candidate.line) + ")";
   }
   const Candidate& chosen = candidates.back();
   text += "; an instance that names none is bound to " + chosen.name + ", the one analysed last";
@@ -43,7 +43,8 @@ Diagnostic Describe(const std::string& entity, const std::string& library, std::
 }  // namespace
 
 std::vector<Diagnostic> ArchitectureCheck::Find(const std::vector<FileInfo>& files,
-                                                const std::vector<OrderEntry>& order, const ShownPaths* shown) {
+                                                const std::vector<OrderEntry>& order,
+                                                const ShownPaths* shown) {
   std::map<std::string, std::size_t> position;
   for (std::size_t i = 0; i < order.size(); ++i) position.emplace(order[i].path, i);
 

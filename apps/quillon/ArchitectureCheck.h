@@ -16,7 +16,8 @@ class ArchitectureCheck {
   // One warning per entity (by library) with more than one architecture, naming each with its file
   // and line and the one bound by default: its file comes last in `order`, within one file the
   // one further down. The text names the files as `shown` gives them (full paths without it).
-  static std::vector<Diagnostic> Find(const std::vector<FileInfo>& files, const std::vector<OrderEntry>& order,
+  static std::vector<Diagnostic> Find(const std::vector<FileInfo>& files,
+                                      const std::vector<OrderEntry>& order,
                                       const ShownPaths* shown = nullptr);
 };
 

@@ -16,7 +16,6 @@
 #include "DeveloperTextCapture.h"
 #include "DiagnosticFinder.h"
 #include "DiagnosticReport.h"
-#include "SourceFileCheck.h"
 #include "DotOutput.h"
 #include "ExitStatus.h"
 #include "ExportPlanner.h"
@@ -41,6 +40,7 @@
 #include "ProjectLoader.h"
 #include "RavA/Factory.h"
 #include "ResultCache.h"
+#include "SourceFileCheck.h"
 #include "TerminalColor.h"
 #include "TextOutput.h"
 #include "TreeReader.h"
@@ -184,7 +184,8 @@ int CommandRunner::RunOnProject() {
   std::string directory = CacheDirectory();
   if (directory.empty() || !ResultCache::Applies(options_)) return LoadAndRun();
   ResultCache results(directory, options_);
-  if (std::optional<ResultCache::Answer> stored = results.Lookup()) return Emit(stored->output, stored->status);
+  if (std::optional<ResultCache::Answer> stored = results.Lookup())
+    return Emit(stored->output, stored->status);
 
   std::int64_t start = InputStamp::Now();
   OutputCapture capture;

@@ -25,8 +25,8 @@ class RecordingArchive final : public Prjrep::IArchive {
     Prjrep::IPersist* object;
   };
   // Strings are kept as std::string so that a reader can move them out.
-  using Value = std::variant<std::int32_t, std::int64_t, bool, std::string, Port::XUID, OwnedObject,
-                             ObjectReference>;
+  using Value =
+      std::variant<std::int32_t, std::int64_t, bool, std::string, Port::XUID, OwnedObject, ObjectReference>;
 
   // Archives of this version and later carry every field of a design-unit record.
   static constexpr std::int32_t kVersion = 9;

@@ -72,7 +72,8 @@ class NodeReader {
     info.kind = TextOf(internal, &Vad::IHdlNetListNodeInternal::GetKind);
     info.architecture = TextOf(node, &Vad::IHdlNetListNode::GetArchitectureName);
     info.instance = TextOf(node, &Vad::IHdlNetListNode::GetInstanceName);
-    if (detail_ == TreeReader::Detail::kLabelsAndPaths) info.path = TextOf(tcl, &UtilI::ITclCollectable::GetName);
+    if (detail_ == TreeReader::Detail::kLabelsAndPaths)
+      info.path = TextOf(tcl, &UtilI::ITclCollectable::GetName);
     info.type = TextOf(tcl, &UtilI::ITclCollectable::GetType);
     info.partition =
         TextOf(Prjrep::QueryAs<Vad::IHdlPartitionData>(node), &Vad::IHdlPartitionData::GetPartition);

@@ -207,7 +207,8 @@ const std::optional<std::string>& UnitRecordReader::ParentKeyOf(Prjrep::IPersist
   auto [entry, added] = parentKeys_.try_emplace(parent);
   if (added) {
     RecordFields fields;
-    if (ReadFields(parent, archive_, fields) || !fields.storeKey.empty()) entry->second = std::move(fields.storeKey);
+    if (ReadFields(parent, archive_, fields) || !fields.storeKey.empty())
+      entry->second = std::move(fields.storeKey);
   }
   return entry->second;
 }

@@ -553,7 +553,8 @@ TEST_F(FileArchiveTest, TruncatedOrFlippedArchivesFailCleanlyOrLoadWithoutLeaks)
   Graph original;
   const std::string bytes = Written(original.Root());
   for (std::size_t length = 0; length < bytes.size(); ++length) {
-    ASSERT_EQ(Load(bytes.substr(0, length)), length < Port::kArchiveHeaderSize ? "unopened" : "unread") << length;
+    ASSERT_EQ(Load(bytes.substr(0, length)), length < Port::kArchiveHeaderSize ? "unopened" : "unread")
+        << length;
   }
   EXPECT_EQ(Load(bytes), "loaded");
 
@@ -563,7 +564,9 @@ TEST_F(FileArchiveTest, TruncatedOrFlippedArchivesFailCleanlyOrLoadWithoutLeaks)
       std::string flipped = bytes;
       flipped[position] = static_cast<char>(flipped[position] ^ (1 << bit));
       const std::string outcome = Load(flipped);
-      if (outcome == "unopened") EXPECT_LT(position, Port::kArchiveHeaderSize);
+      if (outcome == "unopened") {
+        EXPECT_LT(position, Port::kArchiveHeaderSize);
+      }
       if (outcome != "loaded") ++failures;
     }
   }

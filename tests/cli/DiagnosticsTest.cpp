@@ -221,7 +221,8 @@ TEST(Diagnostics, SyntaxErrorsOfVhdlAndVerilogAreErrorsWithFileAndLineInsteadOfM
   args.insert(args.end(), broken.paths().begin(), broken.paths().end());
   CliResult text = RunQuillon(args);
   EXPECT_EQ(text.status, 1);
-  EXPECT_NE(text.err.find(verilog + ":2: error: ';' expected after \"w\" [syntax-error]\n"), std::string::npos)
+  EXPECT_NE(text.err.find(verilog + ":2: error: ';' expected after \"w\" [syntax-error]\n"),
+            std::string::npos)
       << text.err;
   EXPECT_EQ(text.err.find("ERROR:"), std::string::npos) << "reported once, as a diagnostic: " << text.err;
   EXPECT_EQ(text.out, "2 files, 2 design units: 2 errors, 0 warnings\n");
@@ -251,8 +252,8 @@ TEST(Diagnostics, SourceOfAnExtensionThatNamesNoPluginIsNotHdlAndAnErrorWhenStri
   EXPECT_EQ(RunJson("check", broken, {"--strict"}).status, 1);
 
   // The general plug-in chosen on purpose is no mistake.
-  std::vector<std::string> args{"-q", "--format", "json", "check", broken.paths()[0], "--plugin",
-                                "PLUGIN_General", notes};
+  std::vector<std::string> args{"-q",       "--format",       "json", "check", broken.paths()[0],
+                                "--plugin", "PLUGIN_General", notes};
   CliResult chosen = RunQuillon(args);
   EXPECT_EQ(chosen.status, 0) << chosen.out << chosen.err;
   EXPECT_TRUE(Json::parse(chosen.out, nullptr, false).value("diagnostics", Json()).empty()) << chosen.out;

@@ -75,7 +75,8 @@ TEST_F(FileListTest, EveryTokenKindOnAnyLine) {
   EXPECT_EQ(Paths(contents.sources),
             (std::vector<std::string>{"a.v", "with blank.v", "c.sv", "d.vhd", "common:e.vhd",
                                       "common:f.txt " + std::string(FileList::kVerilogPlugin),
-                                      "common:dir/g.v " + std::string(FileList::kVerilogPlugin), "common:h.v " + std::string(FileList::kVerilogPlugin)}));
+                                      "common:dir/g.v " + std::string(FileList::kVerilogPlugin),
+                                      "common:h.v " + std::string(FileList::kVerilogPlugin)}));
   EXPECT_EQ(contents.includeDirs, (std::vector<std::string>{"inc", "../shared"}));
   EXPECT_EQ(contents.defines, (std::vector<std::string>{"WIDTH=8", "FAST"}));
   EXPECT_EQ(contents.libraryExtensions, (std::vector<std::string>{".v", ".sv"}));

@@ -90,10 +90,11 @@ TEST(DefaultArchitecture, TheOneAnalysedLastIsBoundAndOrderedLast) {
 
   CliResult check = RunQuillon(CliRun{With({"check"}, zetaLast), dir, {}});
   EXPECT_EQ(check.status, 0) << check.err;
-  EXPECT_EQ(check.err,
-            "a_zeta.vhd:1: warning: entity leaf (library work) has 2 architectures: alpha (z_alpha.vhd:1), zeta "
-            "(a_zeta.vhd:1); an instance that names none is bound to zeta, the one analysed last "
-            "[ambiguous-architecture]\n");
+  EXPECT_EQ(
+      check.err,
+      "a_zeta.vhd:1: warning: entity leaf (library work) has 2 architectures: alpha (z_alpha.vhd:1), zeta "
+      "(a_zeta.vhd:1); an instance that names none is bound to zeta, the one analysed last "
+      "[ambiguous-architecture]\n");
 }
 
 std::size_t Count(const std::string& text, const std::string& what) {

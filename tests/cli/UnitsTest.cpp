@@ -38,10 +38,12 @@ TEST(Units, TextListingNamesWhatTheJsonListingHolds) {
   CliResult json = RunQuillon({"--format", "json", "units", "-P", project});
   ASSERT_EQ(text.status, 0) << text.err;
   ASSERT_EQ(json.status, 0) << json.err;
+  const nlohmann::json listing = nlohmann::json::parse(json.out);
   std::string expected;
-  for (const auto& file : nlohmann::json::parse(json.out)["files"]) {
+  for (const auto& file : listing["files"]) {
     std::vector<nlohmann::json> units(file["units"].begin(), file["units"].end());
-    std::stable_sort(units.begin(), units.end(), [](const auto& a, const auto& b) { return a["line"] < b["line"]; });
+    std::stable_sort(units.begin(), units.end(),
+                     [](const auto& a, const auto& b) { return a["line"] < b["line"]; });
     for (const auto& unit : units) {
       const std::string key = unit["key"];
       const std::string shown = key.find('|') == std::string::npos ? unit["name"].get<std::string>() : key;

@@ -244,7 +244,9 @@ class MessageLog {
 
   // Keeps the terminal's manager out until the log goes (parses re-register the managers they
   // found, so it must stay out for the whole scope).
-  void SilenceTerminal() { silenced_ = Port_MsgDispatcher::removeMsgMan(Port_MsgDispatcher::getDefaultMsgMan()); }
+  void SilenceTerminal() {
+    silenced_ = Port_MsgDispatcher::removeMsgMan(Port_MsgDispatcher::getDefaultMsgMan());
+  }
 
   const Port_MsgCollector& Collector() const { return collector_; }
   const std::vector<Port_MsgRecord>& Records() const { return collector_.records(); }
@@ -302,7 +304,8 @@ inline Prjrep::AutoPtr<Vad::IHdlDesignUnit> UnitWithKey(Vad::IHdlDesignUnitSet* 
   if (set && set->CreateIterator(unit.Out()) == CitI::kOk) {
     for (; !unit->IsDone(); unit->Next()) {
       Port::StringBase unitKey;
-      if (auto* object = Prjrep::ImplementationCast<Vad::DbObject>(unit->Current())) object->GetDesignUnitKey(unitKey);
+      if (auto* object = Prjrep::ImplementationCast<Vad::DbObject>(unit->Current()))
+        object->GetDesignUnitKey(unitKey);
       if (unitKey.view() == key) return Prjrep::AutoPtr<Vad::IHdlDesignUnit>(unit->Current());
     }
   }
@@ -323,7 +326,9 @@ class ParseTest : public PipelineTest {
   void SetUp() override { project_ = NewProject(); }
 
   // A file of the test's directory holding exactly `bytes`; its full path.
-  std::string Write(std::string_view name, std::string_view bytes) const { return WriteBytes(dir_.Path(name), bytes); }
+  std::string Write(std::string_view name, std::string_view bytes) const {
+    return WriteBytes(dir_.Path(name), bytes);
+  }
 
   // Adds the file to the project and parses it, as a host does; the units of the parse.
   Vad::IHdlDesignUnitSet* ParseAs(const std::string& path, std::string_view plugin) {

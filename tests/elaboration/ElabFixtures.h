@@ -40,14 +40,16 @@ class ElabTest : public test_host::PipelineTest {
 
   // A file of the project in `library`, as a host makes one; AddFile adds it to the project.
   Prjrep::AutoPtr<Vad::IHdlFile> MakeFile(std::string_view path, std::string_view library = "work",
-                                          std::string_view plugin = "PLUGIN_Vhdl", std::uint64_t orderKey = 0) {
+                                          std::string_view plugin = "PLUGIN_Vhdl",
+                                          std::uint64_t orderKey = 0) {
     auto file = NewFile(project_.Get(), path, plugin);
     file->setOrderKey(orderKey);
     SetLibrary(file.Get(), library);
     return file;
   }
   Prjrep::AutoPtr<Vad::IHdlFile> AddFile(std::string_view path, std::string_view library = "work",
-                                         std::string_view plugin = "PLUGIN_Vhdl", std::uint64_t orderKey = 0) {
+                                         std::string_view plugin = "PLUGIN_Vhdl",
+                                         std::uint64_t orderKey = 0) {
     auto file = MakeFile(path, library, plugin, orderKey);
     EXPECT_EQ(FileSetOf(project_.Get())->Add(file.Get()), CitI::kOk);
     return file;
@@ -55,7 +57,8 @@ class ElabTest : public test_host::PipelineTest {
 
   Prjrep::AutoPtr<Vad::IHdlNetListNode> HierarchyRoot() {
     Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
-    EXPECT_EQ(Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get())->getHierarchyRoot(root.Out()), CitI::kOk);
+    EXPECT_EQ(Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get())->getHierarchyRoot(root.Out()),
+              CitI::kOk);
     return root;
   }
   Vad::CHdlProject* ProjectObject() const { return Prjrep::ObjectCast<Vad::CHdlProject>(project_.Get()); }
@@ -70,8 +73,10 @@ class ElabTest : public test_host::PipelineTest {
     return units_.back().Get();
   }
   // An instance under `parent`, which keeps it.
-  static Vad::CompInst* Component(CitI::IInterface* parent, std::string_view label, std::string_view component) {
-    Prjrep::AutoRelease<CitI::IInterface> made(new Vad::CompInst(label, component, RecordOf<Vad::DbObject>(parent)));
+  static Vad::CompInst* Component(CitI::IInterface* parent, std::string_view label,
+                                  std::string_view component) {
+    Prjrep::AutoRelease<CitI::IInterface> made(
+        new Vad::CompInst(label, component, RecordOf<Vad::DbObject>(parent)));
     return RecordOf<Vad::CompInst>(made.Get());
   }
   // A use clause in effect for the VHDL unit, in the unit's file.
@@ -86,14 +91,17 @@ class ElabTest : public test_host::PipelineTest {
     vhdlUnit->SetUses(uses);
   }
 
-  static Vad::IHdlElement* ElementOf(CitI::IInterface* unit) { return Prjrep::QueryAs<Vad::IHdlElement>(unit); }
+  static Vad::IHdlElement* ElementOf(CitI::IInterface* unit) {
+    return Prjrep::QueryAs<Vad::IHdlElement>(unit);
+  }
   template <class Record>
   static Record* RecordOf(CitI::IInterface* unit) {
     return dynamic_cast<Record*>(Prjrep::ImplementationCast<Vad::DbObject>(unit));
   }
 
   // An iterator over units, as the project hands them to the elaborator.
-  static Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> IterateUnits(const std::vector<CitI::IInterface*>& units) {
+  static Prjrep::AutoRelease<Vad::IHdlDesignUnitIterator> IterateUnits(
+      const std::vector<CitI::IInterface*>& units) {
     std::vector<Vad::IHdlDesignUnit*> designUnits;
     for (CitI::IInterface* unit : units) designUnits.push_back(Prjrep::QueryAs<Vad::IHdlDesignUnit>(unit));
     return Prjrep::TInterfaceListIter<Vad::IHdlDesignUnitIterator>::New(designUnits);
@@ -131,7 +139,8 @@ class ElabTest : public test_host::PipelineTest {
       if (distinct) distinct->insert(node);
       if (depth >= 0) text += std::string(static_cast<std::size_t>(2 * depth), ' ') + Line(node) + "\n";
       std::vector<Vad::IHdlNetListNode*> children = ChildrenOf(node);
-      for (auto child = children.rbegin(); child != children.rend(); ++child) pending.emplace_back(*child, depth + 1);
+      for (auto child = children.rbegin(); child != children.rend(); ++child)
+        pending.emplace_back(*child, depth + 1);
     }
     return text;
   }

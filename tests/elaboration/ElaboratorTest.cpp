@@ -32,7 +32,8 @@ class Elaborator : public ElabTest {
   CitI::IInterface* Entity(std::string_view name, Vad::IHdlFile* file = nullptr) {
     return Unit<Vad::EntityDecl>(file ? file : work_.Get(), name, nullptr);
   }
-  CitI::IInterface* Architecture(std::string_view entity, std::string_view name, Vad::IHdlFile* file = nullptr) {
+  CitI::IInterface* Architecture(std::string_view entity, std::string_view name,
+                                 Vad::IHdlFile* file = nullptr) {
     return Unit<Vad::Arch>(file ? file : work_.Get(), entity, name, nullptr);
   }
   CitI::IInterface* Package(std::string_view name, Vad::IHdlFile* file = nullptr) {
@@ -311,10 +312,10 @@ TEST_F(Elaborator, DumpShowsTheTablesEntries) {
   testing::internal::CaptureStdout();
   elaborator_.DumpTables(tables_);
   std::string dump = testing::internal::GetCapturedStdout();
-  for (const char* entry : {"  Entity|e -- work\n   work:Entity|e\n", "  work:Entity|e\n   \n",
-                            "work:Architecture|e|rtl|work:Architecture|sub|u1, Prop: P1, Ptr: ",
-                            "  work:Entity|e -- 1\n", "    work:Architecture|sub\n    work:Entity|e\n",
-                            "  work - Entity|e Ptr: "})
+  for (const char* entry :
+       {"  Entity|e -- work\n   work:Entity|e\n", "  work:Entity|e\n   \n",
+        "work:Architecture|e|rtl|work:Architecture|sub|u1, Prop: P1, Ptr: ", "  work:Entity|e -- 1\n",
+        "    work:Architecture|sub\n    work:Entity|e\n", "  work - Entity|e Ptr: "})
     EXPECT_NE(dump.find(entry), std::string::npos) << entry;
 }
 

@@ -15,7 +15,8 @@ class Hierarchy : public ElabTest {};
 
 TEST_F(Hierarchy, ThreeLevelProjectWithPackagesInTwoLibraries) {
   AddFile(DataPath("three_level/util_pkg.vhd"), "util");
-  for (const char* name : {"types_pkg.vhd", "leaf.vhd", "mid.vhd", "top.vhd"}) AddFile(DataPath("three_level/") + name);
+  for (const char* name : {"types_pkg.vhd", "leaf.vhd", "mid.vhd", "top.vhd"})
+    AddFile(DataPath("three_level/") + name);
   AddFile(DataPath("three_level/empty.vhd"), "work", "PLUGIN_Vhdl", 7);
   AddFile(DataPath("three_level/context_only.vhd"), "work", "PLUGIN_Vhdl", 3);
   MessageLog messages;

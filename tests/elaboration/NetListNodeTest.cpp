@@ -33,7 +33,9 @@ class NetListNode : public ElabTest {
   static Vad::IHdlNetListNodeInternal* Internal(Vad::IHdlNetListNode* node) {
     return Prjrep::QueryAs<Vad::IHdlNetListNodeInternal>(node);
   }
-  static Vad::CNetListNode* Object(Vad::IHdlNetListNode* node) { return Vad::CNetListNode::FromInterface(node); }
+  static Vad::CNetListNode* Object(Vad::IHdlNetListNode* node) {
+    return Vad::CNetListNode::FromInterface(node);
+  }
 
   Prjrep::AutoPtr<Vad::IHdlNetListNode> Elaborate(const std::vector<CitI::IInterface*>& units) {
     Prjrep::AutoPtr<Vad::IHdlNetListNode> root;

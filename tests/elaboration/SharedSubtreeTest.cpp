@@ -165,8 +165,7 @@ TEST_F(SharedSubtrees, SharedAndExpandedBuildsLookTheSameOnRandomProjects) {
     SCOPED_TRACE("seed " + std::to_string(seed));
     project_ = NewProject();
     ScopedTempDir dir;
-    for (const std::string& path : RandomProject(seed, seed % 2 == 0).Write(dir))
-      AddFile(path);
+    for (const std::string& path : RandomProject(seed, seed % 2 == 0).Write(dir)) AddFile(path);
     Outcome expanded = RunOnProject(false);
     Outcome shared = RunOnProject(true);
     ASSERT_FALSE(expanded.tree.empty());
@@ -195,7 +194,8 @@ class DeepHierarchy : public SharedSubtrees {
   Prjrep::AutoPtr<Vad::IHdlNetListNode> Elaborate(Vad::CElaborator& elaborator) {
     std::vector<CitI::IInterface*> designUnits;
     for (const auto& unit : units_)
-      if (RecordOf<Vad::DbObject>(unit.Get())->GetType() != Vad::DbType::kUse) designUnits.push_back(unit.Get());
+      if (RecordOf<Vad::DbObject>(unit.Get())->GetType() != Vad::DbType::kUse)
+        designUnits.push_back(unit.Get());
     Prjrep::AutoPtr<Vad::IHdlNetListNode> root;
     EXPECT_EQ(elaborator.Elaborate(References(), IterateUnits(designUnits).Get(), root.Out()), CitI::kOk);
     return root;
@@ -267,7 +267,8 @@ TEST_F(DeepHierarchy, PackageUsedByManyUnitsIsOneNodeWithEveryParent) {
   Uses(Unit<Vad::PackageDecl>(file, "common", nullptr), "work.base.all");
   Unit<Vad::PackageDecl>(file, "base", nullptr);
   constexpr int kUsers = 3;
-  for (int i = 0; i < kUsers; ++i) Uses(Unit<Vad::PackageDecl>(file, "user" + std::to_string(i), nullptr), "work.common.all");
+  for (int i = 0; i < kUsers; ++i)
+    Uses(Unit<Vad::PackageDecl>(file, "user" + std::to_string(i), nullptr), "work.common.all");
   Vad::CElaborator elaborator;
   auto root = Elaborate(elaborator);
   ASSERT_TRUE(root);

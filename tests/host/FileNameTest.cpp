@@ -51,8 +51,8 @@ TEST(FileName, PartsOfAPath) {
       {"..", "|..|..|"},
       {"", "|||"}};
   for (const auto& [path, expected] : cases) {
-    EXPECT_EQ(FileName::GetHead(path) + "|" + FileName::GetTail(path).view() + "|" + FileName::GetBase(path).view() +
-                  "|" + FileName::GetExtension(path).view(),
+    EXPECT_EQ(FileName::GetHead(path) + "|" + FileName::GetTail(path).view() + "|" +
+                  FileName::GetBase(path).view() + "|" + FileName::GetExtension(path).view(),
               expected)
         << path;
   }

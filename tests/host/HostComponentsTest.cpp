@@ -98,7 +98,8 @@ TEST_F(HostComponents, FileNameHelperTakesTheFullPathApart) {
     helper->SetFilePath(path, "", "/cwd");
     PathParts parts = PartsOf(helper.Get());
     EXPECT_EQ(parts.full, path);
-    EXPECT_EQ(parts.directory + "|" + parts.fileName.view() + "|" + parts.base.view() + "|" + parts.extension.view(),
+    EXPECT_EQ(parts.directory + "|" + parts.fileName.view() + "|" + parts.base.view() + "|" +
+                  parts.extension.view(),
               expected);
   }
 }

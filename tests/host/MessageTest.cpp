@@ -6,10 +6,10 @@
 #include <utility>
 #include <vector>
 
+#include "IsolatedDispatcher.h"
 #include "Port/MsgCollector.h"
 #include "Port/MsgDispatcher.h"
 #include "Port/MsgManData.h"
-#include "IsolatedDispatcher.h"
 #include "Port/MsgManDefault.h"
 
 namespace {

@@ -79,7 +79,8 @@ TEST_F(CompileOrderByUnit, EachUnitGetsTheOrderOfItsTreeByItselfOrWithItsDepende
       {"Entity|side", false, kMidWithItsFileMates},
       {"Architecture|top|rtl", false, {"util.vhd", "leaf_ent.vhd", "leaf_rtl.vhd", "mid.vhd", "top.vhd"}},
       {"Architecture|other|rtl", false, {"other.vhd"}}};
-  for (const Case& c : cases) EXPECT_EQ(OrderOf(c.key, c.byUnit), c.order) << c.key << " by unit " << c.byUnit;
+  for (const Case& c : cases)
+    EXPECT_EQ(OrderOf(c.key, c.byUnit), c.order) << c.key << " by unit " << c.byUnit;
   EXPECT_EQ(Messages(), Strings{});
   // By itself, an architecture without an entity in the project is in no tree, and a package is
   // not ordered.

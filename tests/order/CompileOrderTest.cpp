@@ -20,9 +20,10 @@ TEST_F(CompileOrder, UsedFilesComeFirstThenEqualLevelsInDescendingNameOrderWithL
     Strings order;
   };
   // loner uses nothing and nobody uses it: level 0 like user, and after it by name.
-  const Case cases[] = {{"single", {"alu.vhd"}, {"alu.vhd"}},
-                        {"package", {"loner.vhd", "shared.vhd", "user.vhd"}, {"shared.vhd", "user.vhd", "loner.vhd"}},
-                        {"names", {"alpha.vhd", "Beta.vhd", "gamma.vhd"}, {"gamma.vhd", "Beta.vhd", "alpha.vhd"}}};
+  const Case cases[] = {
+      {"single", {"alu.vhd"}, {"alu.vhd"}},
+      {"package", {"loner.vhd", "shared.vhd", "user.vhd"}, {"shared.vhd", "user.vhd", "loner.vhd"}},
+      {"names", {"alpha.vhd", "Beta.vhd", "gamma.vhd"}, {"gamma.vhd", "Beta.vhd", "alpha.vhd"}}};
   for (const Case& c : cases) {
     SCOPED_TRACE(c.folder);
     project_ = NewProject();
@@ -42,8 +43,10 @@ TEST_F(CompileOrder, MutualInstancesAreOrderedByTheRelaxedRuleWithTheCycleListed
   };
   const Case cases[] = {
       // Both entity files before both architecture files: a valid order.
-      {"split", {"a_ent.vhd", "a_rtl.vhd", "b_ent.vhd", "b_rtl.vhd"},
-       {"b_ent.vhd", "a_ent.vhd", "b_rtl.vhd", "a_rtl.vhd"}, {"b_rtl.vhd", "a_rtl.vhd"}},
+      {"split",
+       {"a_ent.vhd", "a_rtl.vhd", "b_ent.vhd", "b_rtl.vhd"},
+       {"b_ent.vhd", "a_ent.vhd", "b_rtl.vhd", "a_rtl.vhd"},
+       {"b_rtl.vhd", "a_rtl.vhd"}},
       // Instances lead to architecture nodes and each entity shares its architecture's file, so the
       // relaxed rule keeps no edge at all.
       {"joined", {"a.vhd", "b.vhd"}, {"b.vhd", "a.vhd"}, {"b.vhd", "a.vhd"}},

@@ -42,7 +42,9 @@ class OrderTest : public test_host::PipelineTest {
     for (std::string_view name : names) AddFile(folder, name);
   }
 
-  Vad::IHdlElaborationData* Elaboration() const { return Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get()); }
+  Vad::IHdlElaborationData* Elaboration() const {
+    return Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get());
+  }
 
   // Elaborates now, so that the elaboration's own messages are not taken for the compile
   // order's, and forgets the messages so far.
@@ -82,7 +84,8 @@ class OrderTest : public test_host::PipelineTest {
 
   Prjrep::AutoPtr<Vad::CElaborator> Elaborator() const {
     Prjrep::AutoPtr<Vad::CElaborator> elaborator;
-    EXPECT_EQ(Prjrep::ObjectCast<Vad::CHdlProject>(project_.Get())->getElaborator(elaborator.Out()), CitI::kOk);
+    EXPECT_EQ(Prjrep::ObjectCast<Vad::CHdlProject>(project_.Get())->getElaborator(elaborator.Out()),
+              CitI::kOk);
     return elaborator;
   }
   Vad::CLibRefs* References() const {

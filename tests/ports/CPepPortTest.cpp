@@ -41,9 +41,9 @@ std::string NameOf(Vad::IHdlPort* port) {
 }
 
 TEST(PepPortIter, ListsThePortsInRecordOrderNumberedFromOneWithDirectionsBeyondInAndOutAsThirteen) {
-  const std::vector<PepPort> records{Record("clk", PepPort::kDirectionIn, 0, 0, false),
-                                     Record("data", PepPort::kDirectionOut, 7, 0),
-                                     Record("bus", PepPort::kDirectionInOut, 0, 0, false), Record("odd", 42, 0, 0)};
+  const std::vector<PepPort> records{
+      Record("clk", PepPort::kDirectionIn, 0, 0, false), Record("data", PepPort::kDirectionOut, 7, 0),
+      Record("bus", PepPort::kDirectionInOut, 0, 0, false), Record("odd", 42, 0, 0)};
   auto iterator = IteratorOver(records);
   std::vector<Vad::IHdlPort*> ports = PortsOf(iterator.Get());
   ASSERT_EQ(ports.size(), 4u);
@@ -106,7 +106,8 @@ TEST(PepPortIter, AnswersItsInterfacesAndThePortsTheirsWithoutACountOfTheirOwn) 
   Vad::IHdlPort* port = iterator->Current();
   for (const Port::XUID& id : {Vad::IHdlPortIterator::Iid(), CitI::IInterface::Iid()})
     EXPECT_EQ(iterator->QueryInterface(id), iterator.Get());
-  for (const Port::XUID& id : {Vad::IHdlPort::Iid(), CitI::IInterface::Iid()}) EXPECT_EQ(port->QueryInterface(id), port);
+  for (const Port::XUID& id : {Vad::IHdlPort::Iid(), CitI::IInterface::Iid()})
+    EXPECT_EQ(port->QueryInterface(id), port);
   EXPECT_NE(iterator->QueryInterface(Prjrep::IRefCount::Iid()), nullptr);
   EXPECT_EQ(iterator->QueryInterface(Vad::IHdlPort::Iid()), nullptr);
   // The ports live by the iterator's count, not by one of their own.

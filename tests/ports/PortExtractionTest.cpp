@@ -16,10 +16,10 @@
 
 #include "IHdlElaborationData.h"
 #include "IHdlPort.h"
-#include "TestHost.h"
 #include "Port/MsgManData.h"
 #include "PortExtraction.h"
 #include "ScopedTempDir.h"
+#include "TestHost.h"
 #include "VerilogParser.h"
 #include "VhdlParser.h"
 
@@ -84,7 +84,9 @@ class PortExtraction : public test_host::PipelineTest {
     return Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get());
   }
 
-  Vad::IHdlDesignUnit* Unit(std::string_view key) const { return test_host::UnitWithKey(units_.Get(), key).Get(); }
+  Vad::IHdlDesignUnit* Unit(std::string_view key) const {
+    return test_host::UnitWithKey(units_.Get(), key).Get();
+  }
 
   // The ports the project hands out for the unit; the query itself always answers 1.
   Strings PortsOf(std::string_view key) {

@@ -44,12 +44,39 @@ std::string Quoted(const VerilogToken& token) { return VerilogMessageLog::Quote(
 // initial values, ended by ';'.
 bool DeclaresNames(K keyword) {
   switch (keyword) {
-    case K::kInput: case K::kOutput: case K::kInout: case K::kWire: case K::kReg: case K::kTri:
-    case K::kTri0: case K::kTri1: case K::kTriand: case K::kTrior: case K::kTrireg: case K::kWand:
-    case K::kWor: case K::kUwire: case K::kSupply0: case K::kSupply1: case K::kInteger: case K::kReal:
-    case K::kRealtime: case K::kTime: case K::kEvent: case K::kParameter: case K::kLocalparam:
-    case K::kGenvar: case K::kLogic: case K::kBit: case K::kByte: case K::kInt: case K::kShortint:
-    case K::kLongint: case K::kShortreal: case K::kString: case K::kWreal:
+    case K::kInput:
+    case K::kOutput:
+    case K::kInout:
+    case K::kWire:
+    case K::kReg:
+    case K::kTri:
+    case K::kTri0:
+    case K::kTri1:
+    case K::kTriand:
+    case K::kTrior:
+    case K::kTrireg:
+    case K::kWand:
+    case K::kWor:
+    case K::kUwire:
+    case K::kSupply0:
+    case K::kSupply1:
+    case K::kInteger:
+    case K::kReal:
+    case K::kRealtime:
+    case K::kTime:
+    case K::kEvent:
+    case K::kParameter:
+    case K::kLocalparam:
+    case K::kGenvar:
+    case K::kLogic:
+    case K::kBit:
+    case K::kByte:
+    case K::kInt:
+    case K::kShortint:
+    case K::kLongint:
+    case K::kShortreal:
+    case K::kString:
+    case K::kWreal:
       return true;
     default:
       return false;
@@ -59,9 +86,22 @@ bool DeclaresNames(K keyword) {
 // Data types, which a cast in an initial value names: int'(x).
 bool NamesDataType(K keyword) {
   switch (keyword) {
-    case K::kReg: case K::kInteger: case K::kReal: case K::kRealtime: case K::kTime: case K::kLogic:
-    case K::kBit: case K::kByte: case K::kInt: case K::kShortint: case K::kLongint: case K::kShortreal:
-    case K::kString: case K::kSigned: case K::kUnsigned: case K::kConst:
+    case K::kReg:
+    case K::kInteger:
+    case K::kReal:
+    case K::kRealtime:
+    case K::kTime:
+    case K::kLogic:
+    case K::kBit:
+    case K::kByte:
+    case K::kInt:
+    case K::kShortint:
+    case K::kLongint:
+    case K::kShortreal:
+    case K::kString:
+    case K::kSigned:
+    case K::kUnsigned:
+    case K::kConst:
       return true;
     default:
       return false;

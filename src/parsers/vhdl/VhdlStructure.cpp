@@ -49,11 +49,10 @@ std::span<const std::pair<std::string_view, VhdlStructure::Word>> VhdlStructure:
 VhdlStructure::Word VhdlStructure::Classify(std::string_view text) {
   // The other reserved words of VHDL-2008 that can stand before a character literal.
   static constexpr std::string_view kReserved[] = {
-      "abs",     "after",    "all",    "and",       "assert", "downto", "in",      "inertial",
-      "mod",     "nand",     "nor",    "not",       "null",   "of",     "on",      "or",
-      "others",  "range",    "rem",    "report",    "return", "rol",    "ror",     "select",
-      "severity", "sla",     "sll",    "sra",       "srl",    "to",     "transport", "until",
-      "wait",    "when",     "while",  "with",      "xnor",   "xor",    "force",   "reject",
+      "abs",       "after", "all",  "and",    "assert",   "downto", "in",     "inertial", "mod",   "nand",
+      "nor",       "not",   "null", "of",     "on",       "or",     "others", "range",    "rem",   "report",
+      "return",    "rol",   "ror",  "select", "severity", "sla",    "sll",    "sra",      "srl",   "to",
+      "transport", "until", "wait", "when",   "while",    "with",   "xnor",   "xor",      "force", "reject",
   };
   if (text.empty() || text.size() > kLongestKnownWord || text[0] == '\\') return Word::kName;
   std::array<char, kLongestKnownWord> buffer{};
@@ -312,9 +311,9 @@ void VhdlStructure::NoteEndTail(Token token, Word word, std::uint32_t line) {
     return;
   }
   // "end package body p", "end postponed process p", "end function "+"".
-  const bool mayFollow = token == Token::kLiteral ||
-                         (token == Token::kWord &&
-                          (word == Word::kName || word == Word::kBody || word == Word::kProcess));
+  const bool mayFollow =
+      token == Token::kLiteral ||
+      (token == Token::kWord && (word == Word::kName || word == Word::kBody || word == Word::kProcess));
   if (!mayFollow) Report(line, "';' expected after the 'end' of line " + std::to_string(endLine_));
 }
 

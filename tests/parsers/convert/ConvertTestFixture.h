@@ -16,11 +16,11 @@
 
 #include "CHdlElement.h"
 #include "CParserConfigHolder.h"
-#include "TestHost.h"
 #include "Port/File.h"
 #include "Port/MsgManData.h"
 #include "ScopedEnv.h"
 #include "ScopedTempDir.h"
+#include "TestHost.h"
 
 namespace convert_test {
 

@@ -107,9 +107,9 @@ TEST_F(EdifRead, DesignNamingAnUnknownCellOrLibraryIsAnError) {
     EXPECT_THAT(Read<Vad::EdifParser>(unknownLibrary), IsEmpty());
     EXPECT_THAT(Read<Vad::EdifParser>(known), ElementsAre("|Module||known_cell top"));
     EXPECT_THAT(log.Lines("ProjectMgmt"), ElementsAre("error: ERROR: cell/library \"other_cell|lib_x\", "
-                                         "referenced in design...cellref clause, not found\n",
-                                         "error: ERROR: cell/library \"known_cell|lib_y\", "
-                                         "referenced in design...cellref clause, not found\n"));
+                                                      "referenced in design...cellref clause, not found\n",
+                                                      "error: ERROR: cell/library \"known_cell|lib_y\", "
+                                                      "referenced in design...cellref clause, not found\n"));
   }
   ScopedEnv always(kAlways, "1");
   MessageLog log;
@@ -145,7 +145,8 @@ TEST_F(EdifRead, LongestCellNameKeepsItsLibraryInTheDesignReference) {
   ScopedEnv always(kAlways, "1");
   MessageLog log;
   EXPECT_THAT(Read<Vad::EdifParserEx>(netlist), ElementsAre("|Module||" + cell + " top"));
-  for (const std::string& line : log.Lines("ProjectMgmt")) EXPECT_THAT(line, testing::Not(HasSubstr("not found")));
+  for (const std::string& line : log.Lines("ProjectMgmt"))
+    EXPECT_THAT(line, testing::Not(HasSubstr("not found")));
 }
 
 TEST_F(EdifRead, SiblingHierarchyFileInTheCurrentDirectoryIsReadInstead) {
@@ -170,8 +171,8 @@ TEST_F(EdifRead, OverlongTokenIsCutWithAWarningAndReadingGoesOn) {
                               "(design d (cellRef top (libraryRef lib_x)))\n";
   MessageLog log;
   EXPECT_THAT(Read<Vad::EdifParser>(netlist), ElementsAre("|Module||top top"));
-  EXPECT_THAT(log.Lines("ProjectMgmt"), ElementsAre("warning: EDIF parser truncated token to " +
-                                       longName.substr(0, 1023) + ".\n"));
+  EXPECT_THAT(log.Lines("ProjectMgmt"),
+              ElementsAre("warning: EDIF parser truncated token to " + longName.substr(0, 1023) + ".\n"));
 }
 
 TEST_F(EdifRead, KeywordsAreFoundInLinesLongerThanTheLineBuffer) {
@@ -192,8 +193,8 @@ TEST_F(EdifRead, UnopenableFileRecordsNothingAndOnlyTheHierarchyReaderSaysSo) {
   EXPECT_THAT(log.Lines("ProjectMgmt"), IsEmpty());
   ScopedEnv always(kAlways, "1");
   EXPECT_THAT(ReadPath<Vad::EdifParserEx>(missing), IsEmpty());
-  EXPECT_THAT(log.Lines("ProjectMgmt"), ElementsAre("error: ERROR: Quillon.dll: EdifParserEx: " + missing +
-                                       " file not found\n"));
+  EXPECT_THAT(log.Lines("ProjectMgmt"),
+              ElementsAre("error: ERROR: Quillon.dll: EdifParserEx: " + missing + " file not found\n"));
 }
 
 TEST_F(EdifRead, MalformedInputEndsTheParseWithoutHarm) {

@@ -28,7 +28,9 @@ class HierarchyRead : public test_host::ParseTest {
 
   // Reads `text` as a hierarchy file of the project (plug-in "PLUGIN_Hrf").
   std::vector<std::string> ReadProjectFile(std::string_view text) { return ReadProjectPath(Write(text)); }
-  std::vector<std::string> ReadProjectPath(const std::string& path) { return Describe(ParseAs(path, "PLUGIN_Hrf")); }
+  std::vector<std::string> ReadProjectPath(const std::string& path) {
+    return Describe(ParseAs(path, "PLUGIN_Hrf"));
+  }
 
   // Reads `text` with the grammar, as the converter parsers do, into a file's holder with its
   // default type slots. `result` gets qhParser's result.

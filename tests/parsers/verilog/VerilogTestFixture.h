@@ -13,9 +13,9 @@
 #include <vector>
 
 #include "CHdlElement.h"
-#include "TestHost.h"
 #include "Port/Env.h"
 #include "ScopedEnv.h"
+#include "TestHost.h"
 #include "VerilogArguments.h"
 #include "VerilogParser.h"
 

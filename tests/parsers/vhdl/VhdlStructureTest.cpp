@@ -105,7 +105,8 @@ TEST_F(VhdlSyntax, EndsThatCloseNothingOrLackTheirSemicolonAreReported) {
 TEST_F(VhdlSyntax, StringsAndExtendedIdentifiersMustCloseOnTheirLine) {
   EXPECT_THAT(ErrorsOf("architecture a of e is begin\n x <= \"ab;\nend;\n"),
               ElementsAre("2: the string is not closed on its line"));
-  EXPECT_THAT(ErrorsOf("entity \\e is end;\n"), ElementsAre("1: the extended identifier is not closed on its line"));
+  EXPECT_THAT(ErrorsOf("entity \\e is end;\n"),
+              ElementsAre("1: the extended identifier is not closed on its line"));
   EXPECT_THAT(ErrorsOf("entity \\e e\\ is end;\narchitecture a of \\e e\\ is begin\n"
                        " x <= '\"' & '\\' & \"\\\" & ')';\nend;\n"),
               IsEmpty());

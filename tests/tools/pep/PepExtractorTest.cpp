@@ -26,7 +26,8 @@ Ports Described(const std::vector<PepPort>& ports) {
     std::string text = port.name + " " + port.typeName + " ";
     text += port.direction >= 0 && port.direction < 3 ? kDirections[port.direction] : "?";
     if (port.hasRange || port.left || port.right) {
-      text += (port.hasRange ? " [" : " ?[") + std::to_string(port.left) + ":" + std::to_string(port.right) + "]";
+      text +=
+          (port.hasRange ? " [" : " ?[") + std::to_string(port.left) + ":" + std::to_string(port.right) + "]";
     }
     described.push_back(text);
   }
@@ -52,12 +53,14 @@ class PortExtractorTest : public testing::Test {
   }
   // The ports of the unit `name` (of the top with "topmodule").
   Ports PortsOf(const char* name) {
-    const int search = std::string(name) == "topmodule" ? PepExtractor::kSearchTop : PepExtractor::kSearchExactName;
+    const int search =
+        std::string(name) == "topmodule" ? PepExtractor::kSearchTop : PepExtractor::kSearchExactName;
     EXPECT_EQ(extractor_->findDesignUnit("work", name, search), PepExtractor::kUnitFound) << name;
     return Described(extractor_->getPorts());
   }
   // A fresh extractor on `text` alone: the ports of its top, and whether all generics are defined.
-  Ports TopPortsOf(const std::string& fileName, const std::string& text, int language, bool allDefined = true) {
+  Ports TopPortsOf(const std::string& fileName, const std::string& text, int language,
+                   bool allDefined = true) {
     extractor_ = std::make_unique<PepExtractor>();
     Add(fileName, text, language);
     extractor_->Parse(PepExtractor::kVerilog);
@@ -113,9 +116,9 @@ architecture rtl of shifter is begin end;
 )",
                        PepExtractor::kVhdl),
             (Ports{"Clk std_logic in", "rst std_logic in", "data_a std_logic_vector in [7:0]",
-                   "data_b std_logic_vector in [7:0]", "q unsigned out [0:15]", "flag bit out", "link bit inout",
-                   "bus_io std_logic_vector inout [15:4]", "count integer out [0:15]", "level natural in [8:1]",
-                   "plain bit_vector in [7:0]"}));
+                   "data_b std_logic_vector in [7:0]", "q unsigned out [0:15]", "flag bit out",
+                   "link bit inout", "bus_io std_logic_vector inout [15:4]", "count integer out [0:15]",
+                   "level natural in [8:1]", "plain bit_vector in [7:0]"}));
   // ANSI ports carry direction, type and range on to the next name.
   EXPECT_EQ(TopPortsOf("ansi.v", R"(
 `timescale 1ns/1ps
@@ -196,7 +199,8 @@ endmodule
 )",
                        PepExtractor::kVerilog),
             (Ports{"by_macro wire in", "by_zero wire in", "too_big wire in", "unknown wire in",
-                   "conditional wire in [3:0]", "unknown_branch wire in", "widest wire in [2147483647:-2147483648]"}));
+                   "conditional wire in [3:0]", "unknown_branch wire in",
+                   "widest wire in [2147483647:-2147483648]"}));
 }
 
 TEST_F(PortExtractorTest, TopIsTheLastUnitThatNoOtherUnitInstantiates) {
@@ -343,7 +347,7 @@ TEST_F(PortExtractorTest, BadInputNeverCrashesAndReadsWhatItCan) {
             PepExtractor::kUnitNotFound);
   EXPECT_EQ(PortsOf("tail"), (Ports{"a wire in", "b wire out"}));
   EXPECT_EQ(extractor_->findDesignUnit("work", std::string(PepToken::kMaxTextLength, 'n').c_str(),
-                                      PepExtractor::kSearchExactName),
+                                       PepExtractor::kSearchExactName),
             PepExtractor::kUnitFound)
       << "over-long names are cut";
 }

@@ -54,7 +54,8 @@ TEST_F(VerilogBadInput, IncludeFanOutStopsAtTheInclusionCountWithAMessage) {
 }
 
 TEST_F(VerilogBadInput, BrokenSourcesAreReportedAtTheirLinesAndTheModulesAroundThemKept) {
-  ExpectCompiled(R"(`define A `B
+  ExpectCompiled(
+      R"(`define A `B
 `define B `A x
 module m1; endmodule
 `A
@@ -62,9 +63,9 @@ module m1; endmodule
 `SELF(1)
 module m2; endmodule
 )",
-                 {"m1:3()", "m2:7()"},
-                 {"4: macro `A nests deeper than 64 expansions (recursive definition?); expansion stopped",
-                  "6: macro `SELF nests deeper than 64 expansions (recursive definition?); expansion stopped"});
+      {"m1:3()", "m2:7()"},
+      {"4: macro `A nests deeper than 64 expansions (recursive definition?); expansion stopped",
+       "6: macro `SELF nests deeper than 64 expansions (recursive definition?); expansion stopped"});
   ExpectCompiled("module a; endmodule\n/* never closed\nmodule b; endmodule\n", {"a:1()"},
                  {"2: comment not terminated; the rest of the file is ignored"});
   ExpectCompiled(R"(module a; initial $display("oops);
@@ -86,7 +87,8 @@ module c; endmodule
                  {"1: `endif without `ifdef or `ifndef", "6: `else after `else",
                   "7: `ifdef or `ifndef of line 3 is not closed by `endif in this file"});
   // Missing endmodule and stray tokens.
-  ExpectCompiled(R"(stray tokens here;
+  ExpectCompiled(
+      R"(stray tokens here;
 module a (x;
   cell u1 (.x(x);
 module b; cell u2 (); end endmodule
@@ -95,11 +97,11 @@ module c; cell u3 ()
   cell u4 ();
 endmodule
 )",
-                 {"a:2(x) cell u1:3", "b:4() cell u2:4", "c:6() cell u3:6 cell u4:7"},
-                 {"1: syntax error near \"stray\": a module was expected", "2: port list of module a is not terminated",
-                  "3: '(' without its closing ')'", "4: ',' or ';' expected after instance u1",
-                  "4: module a has no endmodule", "4: syntax error near \"end\"", "5: endmodule without module",
-                  "7: ',' or ';' expected after instance u3"});
+      {"a:2(x) cell u1:3", "b:4() cell u2:4", "c:6() cell u3:6 cell u4:7"},
+      {"1: syntax error near \"stray\": a module was expected", "2: port list of module a is not terminated",
+       "3: '(' without its closing ')'", "4: ',' or ';' expected after instance u1",
+       "4: module a has no endmodule", "4: syntax error near \"end\"", "5: endmodule without module",
+       "7: ',' or ';' expected after instance u3"});
 }
 
 TEST_F(VerilogBadInput, BinaryJunkGivesACappedNumberOfMessages) {
