@@ -26,9 +26,7 @@ TEST_F(CompileOrder, UsedFilesComeFirstThenEqualLevelsInDescendingNameOrderWithL
       {"names", {"alpha.vhd", "Beta.vhd", "gamma.vhd"}, {"gamma.vhd", "Beta.vhd", "alpha.vhd"}}};
   for (const Case& c : cases) {
     SCOPED_TRACE(c.folder);
-    project_ = NewProject();
-    AddFiles(c.folder, c.files);
-    Root();
+    LoadProject(c.folder, c.files);
     EXPECT_EQ(ProjectOrder(), c.order);
     EXPECT_EQ(Messages(), Strings{});
   }
@@ -54,9 +52,7 @@ TEST_F(CompileOrder, MutualInstancesAreOrderedByTheRelaxedRuleWithTheCycleListed
       {"ring", {"p.vhd", "q.vhd", "r.vhd"}, {"r.vhd", "q.vhd", "p.vhd"}, {"r.vhd", "q.vhd", "p.vhd"}}};
   for (const Case& c : cases) {
     SCOPED_TRACE(c.folder);
-    project_ = NewProject();
-    AddFiles(c.folder, c.files);
-    Root();
+    LoadProject(c.folder, c.files);
     EXPECT_EQ(ProjectOrder(), c.order);
     Strings expected{Warning(Text::kStrictCycle), Warning(Text::kCycleHeader)};
     for (const std::string& file : c.cycle) expected.push_back(CycleLine(c.folder, file));

@@ -41,6 +41,12 @@ class OrderTest : public test_host::PipelineTest {
   void AddFiles(std::string_view folder, std::initializer_list<std::string_view> names) {
     for (std::string_view name : names) AddFile(folder, name);
   }
+  // A fresh project of the files, elaborated, its messages so far forgotten.
+  void LoadProject(std::string_view folder, std::initializer_list<std::string_view> names) {
+    project_ = NewProject();
+    AddFiles(folder, names);
+    Root();
+  }
 
   Vad::IHdlElaborationData* Elaboration() const {
     return Prjrep::QueryAs<Vad::IHdlElaborationData>(project_.Get());
