@@ -55,6 +55,13 @@ Checked RunJson(const std::string& command, const Project& project, std::vector<
   return {result.status, answer.value("diagnostics", Json()), result.err, answer.value("messages", Json())};
 }
 
+// The corrected twin of a broken project: check passes without a single diagnostic.
+void ExpectCleanCheck(const Project& project) {
+  Checked checked = RunJson("check", project);
+  EXPECT_EQ(checked.status, 0) << checked.diagnostics.dump(2);
+  EXPECT_TRUE(checked.diagnostics.empty());
+}
+
 std::vector<std::string> CodesOf(const Json& diagnostics) {
   std::vector<std::string> codes;
   for (const Json& diagnostic : diagnostics) codes.push_back(diagnostic["code"]);
@@ -84,9 +91,7 @@ TEST(Diagnostics, EntityInstanceMissingFromItsLibraryIsAnErrorWithFileAndLine) {
   EXPECT_EQ(tree.diagnostics[0]["severity"], "warning");
 
   broken.Add("sub.vhd", kSub);
-  Checked twin = RunJson("check", broken);
-  EXPECT_EQ(twin.status, 0) << twin.diagnostics.dump(2);
-  EXPECT_TRUE(twin.diagnostics.empty());
+  ExpectCleanCheck(broken);
 }
 
 TEST(Diagnostics, UseClauseOfAPackageMissingFromTheLibraryIsAnError) {
@@ -98,9 +103,7 @@ TEST(Diagnostics, UseClauseOfAPackageMissingFromTheLibraryIsAnError) {
   EXPECT_EQ(checked.diagnostics[0]["line"], 1);
 
   broken.Add("types.vhd", "package types_pkg is end;\n");
-  Checked twin = RunJson("check", broken);
-  EXPECT_EQ(twin.status, 0) << twin.diagnostics.dump(2);
-  EXPECT_TRUE(twin.diagnostics.empty());
+  ExpectCleanCheck(broken);
 }
 
 TEST(Diagnostics, LibraryTheProjectDoesNotHaveIsAnErrorUnlessExternal) {
@@ -235,9 +238,7 @@ TEST(Diagnostics, SyntaxErrorsOfVhdlAndVerilogAreErrorsWithFileAndLineInsteadOfM
   Project twin;
   twin.Add("e.vhd", "entity e is port (a : in bit);\nend;\n");
   twin.Add("m.v", "module m;\n  wire w;\n  e u1 ();\nendmodule\n");
-  Checked corrected = RunJson("check", twin);
-  EXPECT_EQ(corrected.status, 0) << corrected.diagnostics.dump(2);
-  EXPECT_TRUE(corrected.diagnostics.empty());
+  ExpectCleanCheck(twin);
 }
 
 TEST(Diagnostics, SourceOfAnExtensionThatNamesNoPluginIsNotHdlAndAnErrorWhenStrict) {

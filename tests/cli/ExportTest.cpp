@@ -129,7 +129,9 @@ TEST(Export, ToolFilesHoldTheOrderAndTheToolsAcceptThem) {
     EXPECT_EQ(ran.status, 0) << ran.output;
     for (const std::string& evidence : each.evidence) {
       const std::string file = evidence.substr(0, evidence.find('#'));
-      if (!file.empty()) EXPECT_TRUE(fs::exists(dir.Path(file))) << file;
+      if (!file.empty()) {
+        EXPECT_TRUE(fs::exists(dir.Path(file))) << file;
+      }
       EXPECT_NE((file.empty() ? ran.output : ReadText(dir.Path(file))).find(evidence.substr(file.size() + 1)),
                 std::string::npos)
           << evidence << "\n"
